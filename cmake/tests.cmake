@@ -1,0 +1,12 @@
+# tallowfen_add_test(NAME name LABEL label [TIMEOUT seconds] COMMAND ...): one CTest entry with the environment that
+# every test gets.
+function(tallowfen_add_test)
+    cmake_parse_arguments(T "" "NAME;TIMEOUT" "LABEL;COMMAND" ${ARGN})
+    add_test(NAME ${T_NAME} COMMAND ${T_COMMAND})
+    if(NOT T_TIMEOUT)
+        set(T_TIMEOUT 300)
+    endif()
+    set_tests_properties(${T_NAME} PROPERTIES
+        LABELS "${T_LABEL}" TIMEOUT ${T_TIMEOUT}
+        ENVIRONMENT "TALLOWFEN_HIVES=${TALLOWFEN_HIVES};QT_QPA_PLATFORM=offscreen;TSAN_OPTIONS=ignore_noninstrumented_modules=1 halt_on_error=1;ASAN_OPTIONS=detect_leaks=1")
+endfunction()
