@@ -1,2 +1,205 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
+#include "allocator.h"
+
+#include <cstring>
+
+namespace engine {
+
+namespace {
+
+constexpr int32_t append_growth = 32;
+constexpr int seek_end = 2;
+
+bool write_size(Store& store, int64_t position, int32_t size) {
+    Le32 word;
+    word = static_cast<uint32_t>(size);
+    return write_at(store, sig_none, position, &word, sizeof word) == sizeof word;
+}
+
+// The bin whose largest free cell is the smallest that will do, the earliest of equals.
+const Bin* choose_bin(const Store& store, uint32_t size) {
+    const Bin* best = nullptr;
+    for (int32_t i = 0; i < store.bin_count; i++) {
+        const Bin& bin = store.bins[i];
+        if (bin.largest_free >= size && (best == nullptr || bin.largest_free < best->largest_free))
+            best = &bin;
+    }
+    return best;
+}
+
+CellOffset find_free(Store& store, uint32_t size, uint32_t& found_size) {
+    const Bin* bin = choose_bin(store, size);
+    if (bin == nullptr)
+        return CellOffset::none;
+    const int64_t start = int64_t{base_block_size} + bin->offset;
+    BinHeader header;
+    if (read_at(store, sig_bin, start, &header, sizeof header) != sizeof header)
+        return CellOffset::none;
+    uint32_t best = 0;
+    uint32_t walked = bin_header_size;
+    while (walked < bin->size) {
+        int32_t cell;
+        uint32_t absolute;
+        if (!read_size(store, start + walked, cell) || !is_cell_size(cell, bin->size - walked, absolute))
+            return CellOffset::none;
+        if (cell > 0 && absolute >= size && (best == 0 || absolute < found_size)) {
+            best = walked;
+            found_size = absolute;
+        }
+        walked += absolute;
+    }
+    return best == 0 ? CellOffset::none : cell_offset(bin->offset + best);
+}
+
+void set_checksum(BaseBlock& base) {
+    uint8_t bytes[sizeof base];
+    memcpy(bytes, &base, sizeof base);
+    uint32_t sum = 0;
+    for (size_t i = 0; i < offsetof(BaseBlock, checksum); i += sizeof(Le32)) {
+        Le32 word;
+        memcpy(&word, bytes + i, sizeof word);
+        sum ^= word;
+    }
+    // Windows never stores these two.
+    if (sum == 0xFFFFFFFF)
+        sum = 0xFFFFFFFE;
+    else if (sum == 0)
+        sum = 1;
+    base.checksum = sum;
+}
+
+// Makes the file reach to end, by zeros behind what it has now.
+bool lengthen_file(Store& store, int64_t end) {
+    constexpr uint32_t block_size = 512;
+    const uint8_t zeros[block_size] = {};
+    const int32_t length = store.io.seek(store.io.device, 0, seek_end);
+    if (length < 0)
+        return false;
+    store.window.valid = false;
+    for (int64_t reached = length; reached < end; reached += block_size) {
+        if (store.io.write(store.io.device, zeros, block_size) != static_cast<int32_t>(block_size))
+            return false;
+    }
+    return true;
+}
+
+bool lay_bin(Store& store, const Bin& bin) {
+    const int64_t start = int64_t{base_block_size} + bin.offset;
+    BinHeader header;
+    header.signature = sig_bin;
+    header.offset = bin.offset;
+    header.size = bin.size;
+    memset(header.reserved, 'x', sizeof header.reserved);
+    header.spare = bin.size;
+    return write_at(store, sig_bin, start, &header, sizeof header) == sizeof header &&
+           write_size(store, start + bin_header_size, static_cast<int32_t>(bin.size - bin_header_size));
+}
+
+// Counts the bins' new size in the base block. True when the file says so afterwards, however the write ended.
+bool count_in_base_block(Store& store, uint32_t bins_size) {
+    BaseBlock base;
+    if (read_at(store, sig_base, 0, &base, sizeof base) != sizeof base)
+        return false;
+    base.bins_size = bins_size;
+    set_checksum(base);
+    if (write_at(store, sig_base, 0, &base, sizeof base) == sizeof base)
+        return true;
+    return read_at(store, sig_base, 0, &base, sizeof base) == sizeof base && base.bins_size == bins_size;
+}
+
+bool note_in_first_bin(Store& store, uint32_t bins_size) {
+    BinHeader first;
+    if (read_at(store, sig_bin, base_block_size, &first, sizeof first) != sizeof first)
+        return false;
+    first.spare = bins_size;
+    return write_at(store, sig_bin, base_block_size, &first, sizeof first) == sizeof first;
+}
+
+// Appends a bin with one free cell of at least size bytes. The bin lies behind the last one, over whatever the file
+// holds there. In turn, and what a stop after each leaves:
+//   zeros behind the file's end, the bin's header, its free cell: bytes after the last bin, which mean nothing;
+//   the base block: a hive with one more, empty bin;
+//   the first bin's note of the size: the same, complete.
+bool append_bin(Store& store, uint32_t size) {
+    if (size > highest_end - 2 * bin_alignment)
+        return false;
+    const uint32_t bin_size = (size + bin_header_size + cell_head_size + bin_alignment - 1) & ~(bin_alignment - 1);
+    const Bin bin = {static_cast<uint32_t>(store.bins_size), bin_size, bin_size - bin_header_size};
+    const int64_t end = int64_t{base_block_size} + bin.offset + bin.size;
+    // Room in the table comes first: a bin that counts in the file but not in the table could be laid over.
+    if (end > highest_end || !reserve_bin(store, append_growth) || !lengthen_file(store, end) || !lay_bin(store, bin))
+        return false;
+    const uint32_t bins_size = bin.offset + bin.size;
+    if (!count_in_base_block(store, bins_size))
+        return false;
+    const bool noted = note_in_first_bin(store, bins_size);
+    // The bin counts in the file now, so it must be in the table whatever became of the note.
+    Bin scanned = {};
+    if (scan_bin(store, bin.offset, scanned) < 0)
+        scanned = {bin.offset, bin.size, 0};
+    store.bins[store.bin_count++] = scanned;
+    store.bins_size = static_cast<int32_t>(bins_size);
+    return noted && scanned.largest_free != 0;
+}
+
+}  // namespace
+
+// Marks a free cell as used. In turn: the size word of what is split off (inside the free cell, unseen so far), then
+// the cell's own. A stop between the two changes nothing that counts.
+CellOffset allocate(Store& store, uint32_t n) {
+    if (n > highest_end)
+        return CellOffset::none;
+    const uint32_t size = cell_size_for(n);
+    uint32_t free_size = 0;
+    CellOffset offset = find_free(store, size, free_size);
+    if (offset == CellOffset::none) {
+        if (!append_bin(store, size))
+            return CellOffset::none;
+        offset = find_free(store, size, free_size);
+        if (offset == CellOffset::none)
+            return CellOffset::none;
+    }
+    const uint32_t rest = free_size - size;
+    if (rest > 4 && !write_size(store, cell_position(offset) + size, static_cast<int32_t>(rest)))
+        return CellOffset::none;
+    const uint32_t taken = rest > 4 ? size : free_size;
+    if (!write_size(store, cell_position(offset), -static_cast<int32_t>(taken)))
+        return CellOffset::none;
+    return offset;
+}
+
+// In turn: the cell's size word turned positive, then one word for every free cell that a run's first one takes in.
+// The cells tile the bin after each.
+bool free_cell(Store& store, CellOffset offset) {
+    Cell cell;
+    if (!is_own_cell(store, offset) || !find_used_cell(store, offset, cell))
+        return false;
+    const Bin bin = *bin_of(store, offset);
+    if (!write_size(store, cell_position(offset), static_cast<int32_t>(cell.size)))
+        return false;
+    const int64_t start = int64_t{base_block_size} + bin.offset;
+    uint32_t run = 0;  // where the present run of free cells began, 0 outside one
+    uint32_t run_size = 0;
+    uint32_t walked = bin_header_size;
+    while (walked < bin.size) {
+        int32_t size;
+        uint32_t absolute;
+        if (!read_size(store, start + walked, size) || !is_cell_size(size, bin.size - walked, absolute))
+            return false;
+        if (size < 0) {
+            run = 0;
+        } else if (run == 0) {
+            run = walked;
+            run_size = absolute;
+        } else {
+            run_size += absolute;
+            if (!write_size(store, start + run, static_cast<int32_t>(run_size)))
+                return false;
+        }
+        walked += absolute;
+    }
+    return true;
+}
+
+}  // namespace engine

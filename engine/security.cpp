@@ -1,2 +1,76 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
+#include "security.h"
+
+#include "allocator.h"
+
+namespace engine {
+
+namespace {
+
+bool read_security(Store& store, CellOffset offset, SecurityRecord& record) {
+    return read_record(store, sig_security, offset, &record, sizeof record) == sizeof record;
+}
+
+bool write_security(Store& store, CellOffset offset, const SecurityRecord& record) {
+    return write_at(store, sig_security, record_position(offset), &record, sizeof record) == sizeof record;
+}
+
+// Takes the record out of its ring. In turn: the next one's way back, the previous one's way forward. A stop between
+// the two leaves the record reachable from one side; no key refers to it any more.
+bool unlink(Store& store, CellOffset self, const SecurityRecord& record) {
+    const CellOffset next = cell_offset(record.next);
+    const CellOffset previous = cell_offset(record.previous);
+    if (next == self || previous == self)
+        return false;
+    const auto is_there = [&](CellOffset offset, SecurityRecord& neighbour) {
+        return read_security(store, offset, neighbour) && is_own_cell(store, offset);
+    };
+    SecurityRecord after;
+    SecurityRecord before;
+    const bool has_next = static_cast<int32_t>(next) > 0;
+    const bool has_previous = static_cast<int32_t>(previous) > 0;
+    if ((has_next && (!is_there(next, after) || cell_offset(after.previous) != self)) ||
+        (has_previous && (!is_there(previous, before) || cell_offset(before.next) != self)))
+        return false;
+    if (has_next) {
+        after.previous = record.previous;
+        if (!write_security(store, next, after))
+            return false;
+    }
+    if (has_previous) {
+        if (!read_security(store, previous, before))  // the same record as the next one in a ring of two
+            return false;
+        before.next = record.next;
+        if (!write_security(store, previous, before))
+            return false;
+    }
+    return true;
+}
+
+}  // namespace
+
+bool add_security_reference(Store& store, CellOffset security) {
+    if (static_cast<int32_t>(security) < 0)
+        return true;
+    SecurityRecord record;
+    if (!read_security(store, security, record) || record.references == UINT32_MAX || !is_own_cell(store, security))
+        return false;
+    record.references = record.references + 1;
+    return write_security(store, security, record);
+}
+
+void drop_security_reference(Store& store, CellOffset security) {
+    SecurityRecord record;
+    if (static_cast<int32_t>(security) < 0 || !read_security(store, security, record) || record.references < 1 ||
+        !is_own_cell(store, security))
+        return;
+    if (record.references == 1 && unlink(store, security, record)) {
+        free_cell(store, security);
+        return;
+    }
+    record.references = record.references - 1;
+    write_security(store, security, record);
+}
+
+}  // namespace engine

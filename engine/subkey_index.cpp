@@ -1,2 +1,206 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
+#include "subkey_index.h"
+
+#include <cstdlib>
+
+namespace engine {
+
+namespace {
+
+bool is_leaf(uint32_t signature) {
+    return signature == sig_fast_leaf || signature == sig_hash_leaf || signature == sig_index_leaf;
+}
+
+// The smallest cell that a key record can lie in bounds how many keys a hive can list.
+uint32_t most_keys(const Store& store) {
+    return static_cast<uint32_t>(store.bins_size) / (sizeof(KeyRecord) + cell_head_size);
+}
+
+// Reads one leaf's head into leaf; false when it is no leaf. whole goes false when its count is more than fits.
+bool read_leaf(Store& store, CellOffset offset, Leaf& leaf, bool& whole) {
+    IndexHead head;
+    if (!find_used_cell(store, offset, leaf.cell) || !read_part(store, leaf.cell, 0, &head, sizeof head) ||
+        !is_leaf(head.signature))
+        return false;
+    leaf.signature = head.signature;
+    leaf.count = head.count;
+    const uint32_t capacity = (leaf.cell.room() - static_cast<uint32_t>(sizeof head)) / leaf.entry_size();
+    if (leaf.count > capacity) {
+        leaf.count = capacity;
+        whole = false;
+    }
+    return true;
+}
+
+// Adds a leaf's entries to the index; false when that would be more than the hive can hold.
+bool count_leaf(const Store& store, SubkeyIndex& index, Leaf& leaf) {
+    const uint32_t most = most_keys(store);
+    if (leaf.count > most - index.total)
+        return false;
+    leaf.first = index.total;
+    index.total += leaf.count;
+    index.leaf_count++;
+    return true;
+}
+
+bool load_root(Store& store, uint32_t claimed, SubkeyIndex& index) {
+    const uint32_t capacity = (index.cell.room() - static_cast<uint32_t>(sizeof(IndexHead))) / sizeof(Le32);
+    const uint32_t count = claimed < capacity ? claimed : capacity;
+    index.is_root = true;
+    index.whole = count == claimed && count > 0;
+    if (count == 0)
+        return true;
+    index.leaves = static_cast<Leaf*>(malloc(count * sizeof(Leaf)));
+    if (index.leaves == nullptr)
+        return false;
+    for (uint32_t i = 0; i < count; i++) {
+        Le32 entry;
+        Leaf& leaf = index.leaves[i];
+        if (!read_part(store, index.cell, static_cast<uint32_t>(sizeof(IndexHead) + i * sizeof entry), &entry,
+                       sizeof entry) ||
+            !read_leaf(store, cell_offset(entry), leaf, index.whole) || !count_leaf(store, index, leaf)) {
+            index.whole = false;
+            return true;
+        }
+    }
+    return true;
+}
+
+// Searches by halves in one order; true when the name is met on the way.
+bool search_by(Store& store, const SubkeyIndex& index, const Name& name, NameOrder order, uint32_t& position,
+               KeyView& key) {
+    int64_t low = 0;
+    int64_t high = int64_t{index.total} - 1;
+    while (low <= high) {
+        const int64_t middle = (low + high) / 2;
+        position = static_cast<uint32_t>(middle);
+        if (!read_key(store, subkey_at(store, index, position), key))
+            return false;
+        const Name stored = key.searchable();
+        if (same_name(name, stored))
+            return true;
+        if (order(name, stored) > 0)
+            low = middle + 1;
+        else
+            high = middle - 1;
+    }
+    return false;
+}
+
+// Looks at every entry. When the list turns out to be in upper-cased order throughout, that is noted in the store.
+bool search_each(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, uint32_t& position,
+                 KeyView& key) {
+    KeyView other;
+    KeyView* current = &key;
+    KeyView* previous = &other;
+    bool sorted = index.whole;
+    for (uint32_t i = 0; i < index.total; i++) {
+        if (!read_key(store, subkey_at(store, index, i), *current)) {
+            sorted = false;
+            continue;
+        }
+        if (same_name(name, current->searchable())) {
+            position = i;
+            if (current != &key)
+                key = *current;
+            return true;
+        }
+        // While sorted, previous is the entry before this one.
+        sorted = sorted && (i == 0 || compare_upper(previous->searchable(), current->searchable()) < 0);
+        KeyView* next = previous;
+        previous = current;
+        current = next;
+    }
+    if (sorted)
+        store.sorted_key = parent;
+    return false;
+}
+
+}  // namespace
+
+bool load_index(Store& store, CellOffset offset, SubkeyIndex& index) {
+    index = {};
+    index.generation = store.generation;
+    IndexHead head;
+    if (!find_used_cell(store, offset, index.cell) || !read_part(store, index.cell, 0, &head, sizeof head))
+        return true;
+    if (head.signature == sig_index_root) {
+        if (load_root(store, head.count, index))
+            return true;
+        index.generation--;  // never taken for current
+        return false;
+    }
+    index.whole = true;
+    if (!read_leaf(store, offset, index.only, index.whole) || !count_leaf(store, index, index.only))
+        index.whole = false;
+    return true;
+}
+
+void free_index(SubkeyIndex& index) {
+    free(index.leaves);
+    index.leaves = nullptr;
+}
+
+bool load_key_index(Store& store, const KeyRecord& key, SubkeyIndex& index) {
+    if (key.subkey_count != 0)
+        return load_index(store, cell_offset(key.subkey_index), index);
+    index = {};
+    index.generation = store.generation;
+    index.whole = true;
+    return true;
+}
+
+uint32_t leaf_holding(const SubkeyIndex& index, uint32_t position) {
+    uint32_t low = 0;
+    uint32_t high = index.leaf_count - 1;
+    while (low < high) {  // the last leaf that begins at or before the position
+        const uint32_t middle = low + (high - low + 1) / 2;
+        if (index.leaf(middle).first <= position)
+            low = middle;
+        else
+            high = middle - 1;
+    }
+    return low;
+}
+
+CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position) {
+    if (position >= index.total)
+        return CellOffset::none;
+    const Leaf& leaf = index.leaf(leaf_holding(index, position));
+    if (leaf.signature != sig_index_leaf && leaf.signature != leaf_signature(store))
+        return CellOffset::none;
+    Le32 key;
+    const uint32_t skip = static_cast<uint32_t>(sizeof(IndexHead)) + (position - leaf.first) * leaf.entry_size();
+    if (position - leaf.first >= leaf.count || !read_part(store, leaf.cell, skip, &key, sizeof key))
+        return CellOffset::none;
+    return cell_offset(key);
+}
+
+bool find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
+                 uint32_t& position, KeyView& key) {
+    if (store.sorted_key == parent && parent != CellOffset::none)
+        return search_by(store, index, name, compare_upper, position, key);
+    return search_by(store, index, name, order, position, key) ||
+           search_by(store, index, name, compare_upper, position, key) ||
+           search_each(store, index, parent, name, position, key);
+}
+
+bool place_for_name(Store& store, const SubkeyIndex& index, const Name& name, uint32_t& position) {
+    KeyView key;
+    uint32_t low = 0;
+    uint32_t high = index.total;
+    while (low < high) {  // the first entry that is not before the name
+        const uint32_t middle = low + (high - low) / 2;
+        if (!read_key(store, subkey_at(store, index, middle), key))
+            return false;
+        if (compare_upper(key.searchable(), name) < 0)
+            low = middle + 1;
+        else
+            high = middle;
+    }
+    position = low;
+    return true;
+}
+
+}  // namespace engine

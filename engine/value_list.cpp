@@ -1,2 +1,300 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
+#include "value_list.h"
+
+#include "allocator.h"
+
+#include <cstring>
+
+namespace engine {
+
+namespace {
+
+constexpr uint32_t slot_size = sizeof(Le32);
+// A list up to this many slots grows by one spare slot at a time; a longer one by an eighth of itself, or the time to
+// add a value would grow with the number of those there.
+constexpr uint32_t single_growth_limit = 1024;
+
+int64_t slot_position(const ValueList& list, uint32_t i) {
+    return record_position(list.cell.offset) + int64_t{i} * slot_size;
+}
+
+bool write_data(Store& store, CellOffset cell, const NewValue& value) {
+    return write_at(store, sig_none, record_position(cell), value.data, value.size) == value.size;
+}
+
+// A new cell that holds the value's data; none on failure, nothing then being left allocated.
+CellOffset place_data(Store& store, const NewValue& value) {
+    const CellOffset cell = allocate(store, value.size);
+    if (cell == CellOffset::none || write_data(store, cell, value))
+        return cell;
+    free_cell(store, cell);
+    return CellOffset::none;
+}
+
+void put_inline(ValueRecord& record, const NewValue& value) {
+    uint8_t bytes[inline_limit] = {};
+    if (value.size > 0)
+        memcpy(bytes, value.data, value.size);
+    memcpy(record.data.bytes, bytes, sizeof bytes);
+    record.size = value.size | data_inline;
+}
+
+// New data in a new cell, to which the record then leads; moved is the record as it stands afterwards. The old data
+// cell is left as it is.
+bool move_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value, ValueRecord& moved) {
+    const CellOffset cell = place_data(store, value);
+    if (cell == CellOffset::none)
+        return false;
+    moved = record;
+    moved.data = raw(cell);
+    const Outcome outcome = rewrite_value(store, old, moved);
+    if (outcome == Outcome::unchanged)
+        free_cell(store, cell);
+    return outcome == Outcome::written;
+}
+
+// New data in the data cell that the value has and keeps. While the cell is being written, the value stands in a
+// spare one. In turn, and what the value reads as after a stop there:
+//   spare cell taken and written: as before; the record leads to the spare cell: as after;
+//   the own cell written: as after; the record leads back to it: as after; the spare cell freed.
+// Where size and type stay, one write of the data does it.
+bool rewrite_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value) {
+    const CellOffset own = cell_offset(old.record.data);
+    if (old.size() == value.size && old.record.type == value.type)
+        return write_data(store, own, value);
+    ValueView spared = old;
+    if (!move_data(store, old, record, value, spared.record) || !write_data(store, own, value))
+        return false;
+    ValueRecord back = spared.record;
+    back.data = raw(own);
+    if (rewrite_value(store, spared, back) != Outcome::written)
+        return false;
+    free_cell(store, cell_offset(spared.record.data));
+    return true;
+}
+
+bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
+    if (!is_own_cell(store, old.cell.offset))
+        return false;
+    ValueRecord record = old.record;
+    record.type = value.type;
+    if (value.size <= inline_limit) {
+        // A data cell that the value had stays allocated: storing a value never frees one that fits.
+        put_inline(record, value);
+        return rewrite_value(store, old, record) == Outcome::written;
+    }
+    record.size = value.size;
+    const CellOffset data = cell_offset(old.record.data);
+    Cell cell;
+    ValueRecord moved;
+    // An offset that leads to no cell of its own is replaced; what lies there is left alone.
+    if (old.is_inline() || old.size() == 0 || !find_used_cell(store, data, cell) || !is_own_cell(store, data))
+        return move_data(store, old, record, value, moved);
+    if (cell.room() >= value.size)
+        return rewrite_data(store, old, record, value);
+    if (!move_data(store, old, record, value, moved))
+        return false;
+    free_cell(store, data);
+    return true;
+}
+
+// A new value's record, not yet in any list; none on failure, nothing then being left allocated.
+CellOffset place_value(Store& store, const NewValue& value) {
+    const uint32_t length = static_cast<uint32_t>(sizeof(ValueRecord)) + value.name.length;
+    const Block bytes(length);
+    if (bytes.bytes == nullptr)
+        return CellOffset::none;
+    ValueRecord record = {};
+    record.signature = static_cast<uint16_t>(sig_value);
+    record.name_length = static_cast<uint16_t>(value.name.length);
+    record.type = value.type;
+    record.flags = value.name.length > 0 ? value_name_8bit : uint16_t{0};
+    CellOffset data = CellOffset::none;
+    if (value.size <= inline_limit) {
+        put_inline(record, value);
+    } else {
+        data = place_data(store, value);
+        if (data == CellOffset::none)
+            return CellOffset::none;
+        record.size = value.size;
+        record.data = raw(data);
+    }
+    memcpy(bytes.bytes, &record, sizeof record);
+    memcpy(bytes.bytes + sizeof record, value.name.bytes, value.name.length);
+    const CellOffset offset = allocate(store, length);
+    if (offset != CellOffset::none &&
+        write_at(store, sig_value, record_position(offset), bytes.bytes, length) == length)
+        return offset;
+    if (offset != CellOffset::none)
+        free_cell(store, offset);
+    if (data != CellOffset::none)
+        free_cell(store, data);
+    return CellOffset::none;
+}
+
+// A cell with the list and room for one more slot at least; the old cell stays as it is.
+CellOffset grow_list(Store& store, const ValueList& list) {
+    const uint32_t spare = list.count < single_growth_limit ? 2 : 1 + list.count / 8;
+    const CellOffset cell = allocate(store, (list.count + spare) * slot_size);
+    if (cell == CellOffset::none)
+        return cell;
+    const uint32_t length = list.count * slot_size;
+    const Block slots(length);
+    if (slots.bytes != nullptr && read_part(store, list.cell, 0, slots.bytes, length) &&
+        (length == 0 ||
+         write_at(store, sig_none, record_position(cell), slots.bytes, length) == length))
+        return cell;
+    free_cell(store, cell);
+    return CellOffset::none;
+}
+
+// Puts the record into the list's next slot and the list into the key.
+Outcome link_value(Store& store, CellOffset key_offset, KeyRecord& key, ValueList list, CellOffset offset) {
+    CellOffset grown = CellOffset::none;
+    if (list.count == 0)
+        grown = allocate(store, slot_size);
+    else if (list.cell.room() < (list.count + 1) * slot_size)
+        grown = grow_list(store, list);
+    const bool moves = list.count == 0 || list.cell.room() < (list.count + 1) * slot_size;
+    if (moves && grown == CellOffset::none)
+        return Outcome::unchanged;
+    const CellOffset old = list.cell.offset;
+    if (moves)
+        list.cell.offset = grown;
+    Le32 slot;
+    slot = raw(offset);
+    KeyRecord changed = key;
+    changed.value_count = list.count + 1;
+    changed.value_list = raw(list.cell.offset);
+    Outcome outcome = Outcome::unchanged;
+    if (write_at(store, sig_none, slot_position(list, list.count), &slot, sizeof slot) == sizeof slot)
+        outcome = rewrite_key(store, key_offset, key, changed);
+    if (moves && outcome == Outcome::unchanged)
+        free_cell(store, grown);
+    if (moves && outcome == Outcome::written && list.count > 0)
+        free_cell(store, old);
+    return outcome;
+}
+
+// Raises the key's longest value name and largest data. Written ahead of the value: they are upper bounds, so a stop
+// behind them says nothing untrue.
+bool raise_maxima(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t name_bytes, uint32_t data_size) {
+    KeyRecord raised = key;
+    if (name_bytes > raised.longest_value)
+        raised.longest_value = name_bytes;
+    if (data_size > raised.largest_data)
+        raised.largest_data = data_size;
+    return rewrite_key(store, key_offset, key, raised) == Outcome::written;
+}
+
+}  // namespace
+
+ValueList find_value_list(Store& store, const KeyRecord& key) {
+    ValueList list = {};
+    const uint32_t claimed = key.value_count;
+    if (claimed == 0) {
+        list.whole = true;
+        return list;
+    }
+    if (!find_used_cell(store, cell_offset(key.value_list), list.cell))
+        return list;
+    const uint32_t capacity = list.cell.room() / slot_size;
+    list.count = claimed < capacity ? claimed : capacity;
+    list.whole = claimed <= capacity;
+    return list;
+}
+
+CellOffset value_at(Store& store, const ValueList& list, uint32_t i) {
+    Le32 slot;
+    if (i >= list.count || read_at(store, sig_none, slot_position(list, i), &slot, sizeof slot) != sizeof slot)
+        return CellOffset::none;
+    return cell_offset(slot);
+}
+
+int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value) {
+    for (uint32_t i = 0; i < list.count; i++) {
+        const CellOffset offset = value_at(store, list, i);
+        if (read_value(store, offset, value) && value_is_named(store, value, name))
+            return static_cast<int32_t>(i);
+    }
+    return -1;
+}
+
+// A new value, in turn: its data cell, its record, its slot in the list (in a longer copy of the list, where that has no
+// room), the key's record with count and list, then the old list is freed. Until the key's record is written the value
+// is not there.
+Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const NewValue& value) {
+    const ValueList list = find_value_list(store, key);
+    if (!list.whole || !is_own_cell(store, key_offset) ||
+        (list.count > 0 && !is_own_cell(store, list.cell.offset)))
+        return Stored::failed;
+    ValueView old;
+    if (find_value(store, list, value.name, old) >= 0) {
+        return raise_maxima(store, key_offset, key, 0, value.size) && replace_value(store, old, value)
+                   ? Stored::replaced
+                   : Stored::failed;
+    }
+    if (!raise_maxima(store, key_offset, key, 2 * value.name.length, value.size))
+        return Stored::failed;
+    const CellOffset offset = place_value(store, value);
+    if (offset == CellOffset::none)
+        return Stored::failed;
+    const Outcome outcome = link_value(store, key_offset, key, list, offset);
+    if (outcome == Outcome::written)
+        return Stored::added;
+    // Where it is surely not in the list, record and data go back.
+    ValueView placed;
+    if (outcome == Outcome::unchanged && read_value(store, offset, placed)) {
+        if (!placed.is_inline())
+            free_cell(store, cell_offset(placed.record.data));
+        free_cell(store, offset);
+    }
+    return Stored::failed;
+}
+
+// In turn, and what a stop after each leaves:
+//   the list with the value moved behind the others: every value still there;
+//   the key's record with a count one lower: the value gone;
+//   the last slot, now spare, as a shift of the list leaves it; the value's record freed. Its data stays allocated.
+int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t position) {
+    const ValueList list = find_value_list(store, key);
+    if (!list.whole || position >= list.count || !is_own_cell(store, key_offset) ||
+        !is_own_cell(store, list.cell.offset))
+        return R_FAILED;
+    const uint32_t behind = (list.count - position) * slot_size;  // the value's own slot and those after it
+    const Block slots(behind);
+    const Block before(behind);
+    if (slots.bytes == nullptr || before.bytes == nullptr)
+        return R_NOT_ENOUGH_MEMORY;
+    if (!read_part(store, list.cell, position * slot_size, slots.bytes, behind))
+        return R_FAILED;
+    memcpy(before.bytes, slots.bytes, behind);
+    uint8_t removed[slot_size];
+    memcpy(removed, slots.bytes, slot_size);
+    const bool was_last = behind == slot_size;
+    uint8_t last[slot_size];
+    memcpy(last, slots.bytes + behind - slot_size, slot_size);
+    if (!was_last) {
+        memmove(slots.bytes, slots.bytes + slot_size, behind - slot_size);
+        memcpy(slots.bytes + behind - slot_size, removed, slot_size);
+        if (rewrite_at(store, slot_position(list, position), slots.bytes, before.bytes, behind) != Outcome::written)
+            return R_CAN_NOT_COMPLETE;
+    }
+    KeyRecord changed = key;
+    changed.value_count = list.count - 1;
+    if (list.count == 1)
+        changed.value_list = raw(CellOffset::none);  // the list's cell stays allocated
+    if (rewrite_key(store, key_offset, key, changed) != Outcome::written)
+        return R_CAN_NOT_COMPLETE;
+    if (!was_last)
+        write_at(store, sig_none, slot_position(list, list.count - 1), last, sizeof last);
+    Le32 offset;
+    memcpy(&offset, removed, sizeof offset);
+    ValueView value;
+    if (read_value(store, cell_offset(offset), value))
+        free_cell(store, cell_offset(offset));
+    return R_SUCCESS;
+}
+
+}  // namespace engine

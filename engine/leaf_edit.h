@@ -1,0 +1,34 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// Entries of a subkey index put in, taken out and moved, in an order of writes that a stop anywhere does no harm to.
+#pragma once
+
+#include "subkey_index.h"
+
+namespace engine {
+
+// A key is seen when both its parent's count and the leaf's count reach it. So a count that rises is written to the
+// parent first, and one that falls to the leaf first: no other key is ever out of sight.
+
+// Whether the leaf that a new entry at this position would go to has room in its count.
+bool can_grow(const SubkeyIndex& index, uint32_t position);
+
+// Puts in an entry for a key that is complete; parent follows what the file holds. In turn:
+//   the leaf has room: the parent's count, the leaf;
+//   it has none, below a root: a longer copy of the leaf, the parent's count, the root's entry, the old leaf freed;
+//   it has none otherwise: a longer copy of the leaf, the parent's record with count and index, the old leaf freed.
+Outcome add_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
+                  uint32_t position, CellOffset key, const Name& name);
+
+// Takes an entry out of an index that is a single leaf. In turn: the leaf, the parent's count.
+Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
+                     uint32_t position);
+
+// Replaces the entry at a position by one for another record of the same key, at the place that its name wants (counted
+// with the old entry still in). Within one leaf this is a single write. Between two leaves of a root, in turn: the
+// parent's count one up, the new entry, the old one out, the parent's count back; in between the key has both names.
+Outcome move_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
+                   uint32_t position, uint32_t place, CellOffset key, const Name& name);
+
+}  // namespace engine

@@ -1,0 +1,27 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// Changes to the list of a key's subkeys: a new one, one that goes, one that gets another name.
+#pragma once
+
+#include "subkey_index.h"
+
+namespace engine {
+
+// Longest name, in bytes, that a look-up by path can tell apart; longer ones are not stored.
+constexpr uint32_t longest_key_name = 259;
+
+enum class Inserted { failed, exists, created };
+
+// Makes the subkey of that name under the parent, or finds the one that is there. key receives its offset.
+// new_reference: the parent's security record gets one more reference, for the new key.
+Inserted insert_subkey(Store& store, CellOffset parent, const Name& name, bool new_reference, CellOffset& key);
+
+// Takes the entry at a position out of the parent's index, which must be a single leaf, and lowers the parent's count.
+bool remove_subkey(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
+                   uint32_t position);
+
+// Gives the subkey at a position another name: a new record takes the old one's place. Status as RRenameKey's.
+int32_t rename_subkey(Store& store, CellOffset parent, uint32_t position, const Name& name);
+
+}  // namespace engine

@@ -1,0 +1,38 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// The values of one key: its list of value records, finding, storing and removing them.
+#pragma once
+
+#include "records.h"
+
+namespace engine {
+
+struct ValueList {
+    Cell cell;          // the list's; undefined when there is no list
+    uint32_t count;     // as many as the cell can hold, at most the record's own count
+    bool whole;         // count is the record's own: the list may be changed
+};
+
+// Reads where the key's list lies and what it can hold.
+ValueList find_value_list(Store& store, const KeyRecord& key);
+// The i-th value record's offset; none when it cannot be read.
+CellOffset value_at(Store& store, const ValueList& list, uint32_t i);
+// Position of the value of that name, -1 when there is none.
+int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value);
+
+struct NewValue {
+    Name name;
+    uint32_t type;
+    const void* data;
+    uint32_t size;  // bytes
+};
+
+enum class Stored { failed, replaced, added };
+
+// Stores a value in the key and brings key, its record, up to what the file holds.
+Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const NewValue& value);
+// Removes the value at a position of the key's list; brings key up to what the file holds.
+int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t position);
+
+}  // namespace engine
