@@ -63,13 +63,13 @@ int32_t give_name(Store& store, const KeyView& key, char* name, uint32_t* name_s
 }
 
 // Finds the index-th value's record. 259 past the end, -1 when it cannot be read.
-int32_t find_enumerated(RegistryKey* key, uint32_t index, ValueView& value) {
+int32_t find_enumerated(RegistryKey* key, uint32_t index, const ValueView*& value) {
     if (!is_key(key))
         return R_FAILED;
     if (index >= key->info->value_count)
         return R_NO_MORE_ITEMS;
-    const CellOffset offset = value_at(*key->store, current_values(*key), index);
-    return read_value(*key->store, offset, value) ? R_SUCCESS : R_FAILED;
+    value = listed_value(*key, index);
+    return value != nullptr ? R_SUCCESS : R_FAILED;
 }
 
 int32_t give_value_name_8bit(Store& store, const ValueView& value, char* name, uint32_t* name_size) {
@@ -172,7 +172,7 @@ int32_t REnumKeyInfoA(RegistryKey* key, uint32_t index, char* name, uint32_t* na
     if (!current_index(*key))
         return R_NOT_ENOUGH_MEMORY;
     KeyView subkey;
-    if (!read_key(*key->store, subkey_at(*key->store, key->index, index), subkey))
+    if (!read_key(*key->store, listed_subkey(*key, index), subkey))
         return R_FAILED;
     if (out_subkeys != nullptr)
         *out_subkeys = subkey.record.subkey_count;
@@ -192,28 +192,28 @@ int32_t REnumKeyExA(RegistryKey* key, uint32_t index, char* name, uint32_t* name
 
 int32_t REnumValueA(RegistryKey* key, uint32_t index, char* name, uint32_t* name_size, uint32_t* out_type,
                     void* data, uint32_t* data_size) {
-    ValueView value;
+    const ValueView* value = nullptr;
     int32_t status = find_enumerated(key, index, value);
     if (status == R_SUCCESS)
-        status = give_value_name_8bit(*key->store, value, name, name_size);
+        status = give_value_name_8bit(*key->store, *value, name, name_size);
     if (status != R_SUCCESS)
         return status;
     if (out_type != nullptr)
-        *out_type = value.record.type;
-    return give_data_8bit(*key->store, value, data, data_size);
+        *out_type = value->record.type;
+    return give_data_8bit(*key->store, *value, data, data_size);
 }
 
 int32_t REnumValueW(RegistryKey* key, uint32_t index, uint16_t* name, uint32_t* name_size, uint32_t* out_type,
                     void* data, uint32_t* data_size) {
-    ValueView value;
+    const ValueView* value = nullptr;
     int32_t status = find_enumerated(key, index, value);
     if (status == R_SUCCESS)
-        status = give_value_name_wide(*key->store, value, name, name_size);
+        status = give_value_name_wide(*key->store, *value, name, name_size);
     if (status != R_SUCCESS)
         return status;
     if (out_type != nullptr)
-        *out_type = value.record.type;
-    return give_data(*key->store, value, data, data_size);
+        *out_type = value->record.type;
+    return give_data(*key->store, *value, data, data_size);
 }
 
 int32_t RFindValueA(RegistryKey* key, const char* name) {

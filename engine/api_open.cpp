@@ -16,7 +16,7 @@ int32_t ROpenSubKey(RegistryKey* key, uint32_t index, RegistryKey** out) {
         return R_NO_MORE_ITEMS;
     if (!current_index(*key))
         return R_NOT_ENOUGH_MEMORY;
-    const CellOffset subkey = subkey_at(*key->store, key->index, index);
+    const CellOffset subkey = listed_subkey(*key, index);
     if (subkey == CellOffset::none)
         return R_NO_MORE_ITEMS;
     return open_handle(*key->store, subkey, key->depth + 1, out);

@@ -53,6 +53,26 @@ KeyInfo* copy_key(Store& store, const KeyView& key, bool& damaged) {
     return info;
 }
 
+// Reads what the key's record says of its values. The first offsets come along, while the window is there.
+void take_values(RegistryKey& handle, Store& store, const KeyRecord& record) {
+    handle.values = find_value_list(store, record);
+    handle.values_generation = store.generation;
+    handle.recent_position = UINT32_MAX;
+    handle.value_offsets.first = 0;
+    handle.value_offsets.count =
+        values_at(store, handle.values, 0, handle.value_offsets.offsets, OffsetBatch::most);
+}
+
+// The same of its subkeys. false when memory ran out.
+bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record) {
+    handle.subkeys.count = 0;
+    if (!load_key_index(store, record, handle.index))
+        return false;
+    handle.subkeys.first = 0;
+    handle.subkeys.count = subkeys_at(store, handle.index, 0, handle.subkeys.offsets, OffsetBatch::most);
+    return true;
+}
+
 }  // namespace
 
 uint32_t handle_flags(const KeyInfo& info) {
@@ -72,7 +92,7 @@ int32_t fill_handle(RegistryKey& handle, Store& store, CellOffset offset, uint32
     handle.info = copy_key(store, key, damaged);
     if (handle.info == nullptr)
         return damaged ? R_FAILED : R_NOT_ENOUGH_MEMORY;
-    if (!load_key_index(store, key.record, handle.index)) {
+    if (!take_index(handle, store, key.record)) {
         free(handle.info);
         handle.info = nullptr;
         handle.index = {};
@@ -80,8 +100,7 @@ int32_t fill_handle(RegistryKey& handle, Store& store, CellOffset offset, uint32
     }
     handle.store = &store;
     handle.depth = depth;
-    handle.values = find_value_list(store, key.record);
-    handle.values_generation = store.generation;
+    take_values(handle, store, key.record);
     take_counts(handle, key.record);
     return R_SUCCESS;
 }
@@ -114,7 +133,7 @@ bool current_index(RegistryKey& handle) {
     KeyRecord record = {};
     record.subkey_count = handle.info->subkey_count;
     record.subkey_index = raw(handle.info->subkey_index);
-    return load_key_index(*handle.store, record, handle.index);
+    return take_index(handle, *handle.store, record);
 }
 
 ValueList& current_values(RegistryKey& handle) {
@@ -122,10 +141,38 @@ ValueList& current_values(RegistryKey& handle) {
         KeyRecord record = {};
         record.value_count = handle.info->value_count;
         record.value_list = raw(handle.info->value_list);
-        handle.values = find_value_list(*handle.store, record);
-        handle.values_generation = handle.store->generation;
+        take_values(handle, *handle.store, record);
     }
     return handle.values;
+}
+
+CellOffset listed_subkey(RegistryKey& handle, uint32_t position) {
+    OffsetBatch& batch = handle.subkeys;
+    if (!batch.holds(position)) {
+        batch.first = position;
+        batch.count = subkeys_at(*handle.store, handle.index, position, batch.offsets, OffsetBatch::most);
+        if (batch.count == 0)
+            return CellOffset::none;
+    }
+    return batch.offsets[position - batch.first];
+}
+
+const ValueView* listed_value(RegistryKey& handle, uint32_t position) {
+    const ValueList& list = current_values(handle);
+    if (position == handle.recent_position)
+        return &handle.recent_value;
+    OffsetBatch& batch = handle.value_offsets;
+    if (!batch.holds(position)) {
+        batch.first = position;
+        batch.count = values_at(*handle.store, list, position, batch.offsets, OffsetBatch::most);
+        if (batch.count == 0)
+            return nullptr;
+    }
+    handle.recent_position = UINT32_MAX;
+    if (!read_value(*handle.store, batch.offsets[position - batch.first], handle.recent_value))
+        return nullptr;
+    handle.recent_position = position;
+    return &handle.recent_value;
 }
 
 void take_counts(RegistryKey& handle, const KeyRecord& record) {
@@ -145,10 +192,9 @@ bool reread_counts(RegistryKey& handle) {
     if (!read_key(*handle.store, handle.info->own, key))
         return false;
     free_index(handle.index);
-    if (!load_key_index(*handle.store, key.record, handle.index))
+    if (!take_index(handle, *handle.store, key.record))
         return false;
-    handle.values = find_value_list(*handle.store, key.record);
-    handle.values_generation = handle.store->generation;
+    take_values(handle, *handle.store, key.record);
     take_counts(handle, key.record);
     return true;
 }

@@ -33,6 +33,18 @@ struct KeyInfo {
     bool wide() const { return (flags & key_name_8bit) == 0; }
 };
 
+// Offsets that lie side by side in an index or a list, read together: a caller that goes from one item to the next then
+// reads the items' records without coming back to the list for each, which the one window would have to follow.
+struct OffsetBatch {
+    static constexpr uint32_t most = 32;
+
+    uint32_t first;  // position of the first one
+    uint32_t count;
+    CellOffset offsets[most];
+
+    bool holds(uint32_t position) const { return position >= first && position - first < count; }
+};
+
 }  // namespace engine
 
 struct RegistryKey {
@@ -40,9 +52,14 @@ struct RegistryKey {
     engine::Store* store;
     engine::KeyInfo* info;
 
-    uint32_t depth;             // levels below the root
-    engine::SubkeyIndex index;  // read anew once the hive has been written to
-    engine::ValueList values;   // the same
+    uint32_t depth;                // levels below the root
+    // What was read of the key's lists; read anew once the hive has been written to.
+    engine::SubkeyIndex index;
+    engine::OffsetBatch subkeys;
+    engine::ValueList values;
+    engine::OffsetBatch value_offsets;
+    engine::ValueView recent_value;  // the value asked for last: its name and its data are asked for in turn
+    uint32_t recent_position;        // UINT32_MAX when there is none
     uint32_t values_generation;
 };
 
@@ -62,6 +79,10 @@ void free_handle(RegistryKey* handle);
 // The handle's index and list, read anew when anything was written since. false when memory ran out.
 bool current_index(RegistryKey& handle);
 ValueList& current_values(RegistryKey& handle);
+// The offset of the subkey at a position, after current_index; none when it cannot be read.
+CellOffset listed_subkey(RegistryKey& handle, uint32_t position);
+// The value at a position of the list, null when its record cannot be read. Valid until the next call on the handle.
+const ValueView* listed_value(RegistryKey& handle, uint32_t position);
 // Brings counts, offsets and maxima of a handle up to its key's record.
 void take_counts(RegistryKey& handle, const KeyRecord& record);
 // The same, reading the record.

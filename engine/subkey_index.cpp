@@ -3,6 +3,7 @@
 #include "subkey_index.h"
 
 #include <cstdlib>
+#include <cstring>
 
 namespace engine {
 
@@ -164,17 +165,35 @@ uint32_t leaf_holding(const SubkeyIndex& index, uint32_t position) {
     return low;
 }
 
-CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position) {
+uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, CellOffset* offsets, uint32_t most) {
     if (position >= index.total)
-        return CellOffset::none;
+        return 0;
     const Leaf& leaf = index.leaf(leaf_holding(index, position));
     if (leaf.signature != sig_index_leaf && leaf.signature != leaf_signature(store))
-        return CellOffset::none;
-    Le32 key;
-    const uint32_t skip = static_cast<uint32_t>(sizeof(IndexHead)) + (position - leaf.first) * leaf.entry_size();
-    if (position - leaf.first >= leaf.count || !read_part(store, leaf.cell, skip, &key, sizeof key))
-        return CellOffset::none;
-    return cell_offset(key);
+        return 0;
+    const uint32_t size = leaf.entry_size();
+    uint32_t entry = position - leaf.first;
+    uint32_t read = 0;
+    while (read < most && entry < leaf.count) {
+        uint8_t bytes[32 * sizeof(LeafEntry)];
+        const uint32_t fits = static_cast<uint32_t>(sizeof bytes) / size;
+        const uint32_t rest = leaf.count - entry < most - read ? leaf.count - entry : most - read;
+        const uint32_t count = rest < fits ? rest : fits;
+        if (!read_part(store, leaf.cell, static_cast<uint32_t>(sizeof(IndexHead)) + entry * size, bytes, count * size))
+            break;
+        for (uint32_t i = 0; i < count; i++) {
+            Le32 key;
+            memcpy(&key, bytes + i * size, sizeof key);
+            offsets[read++] = cell_offset(key);
+        }
+        entry += count;
+    }
+    return read;
+}
+
+CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position) {
+    CellOffset offset;
+    return subkeys_at(store, index, position, &offset, 1) == 1 ? offset : CellOffset::none;
 }
 
 bool find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,

@@ -41,6 +41,8 @@ bool load_key_index(Store& store, const KeyRecord& key, SubkeyIndex& index);
 
 // Which leaf holds a position; the last one for a position at the end. The index must have a leaf.
 uint32_t leaf_holding(const SubkeyIndex& index, uint32_t position);
+// The key offsets of up to most entries from a position on, as far as its leaf goes; returns how many were read.
+uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, CellOffset* offsets, uint32_t most);
 // The key offset at a position; none when it cannot be read or its leaf is neither "li" nor of the hive's kind.
 CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position);
 

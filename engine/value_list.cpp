@@ -205,18 +205,40 @@ ValueList find_value_list(Store& store, const KeyRecord& key) {
     return list;
 }
 
+uint32_t values_at(Store& store, const ValueList& list, uint32_t i, CellOffset* offsets, uint32_t most) {
+    uint32_t read = 0;
+    while (read < most && i < list.count) {
+        Le32 slots[64];
+        constexpr uint32_t fits = sizeof slots / slot_size;
+        const uint32_t rest = list.count - i < most - read ? list.count - i : most - read;
+        const uint32_t count = rest < fits ? rest : fits;
+        if (!read_part(store, list.cell, i * slot_size, slots, count * slot_size))
+            break;
+        for (uint32_t slot = 0; slot < count; slot++)
+            offsets[read++] = cell_offset(slots[slot]);
+        i += count;
+    }
+    return read;
+}
+
 CellOffset value_at(Store& store, const ValueList& list, uint32_t i) {
-    Le32 slot;
-    if (i >= list.count || read_at(store, sig_none, slot_position(list, i), &slot, sizeof slot) != sizeof slot)
-        return CellOffset::none;
-    return cell_offset(slot);
+    CellOffset offset;
+    return values_at(store, list, i, &offset, 1) == 1 ? offset : CellOffset::none;
 }
 
 int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value) {
-    for (uint32_t i = 0; i < list.count; i++) {
-        const CellOffset offset = value_at(store, list, i);
-        if (read_value(store, offset, value) && value_is_named(store, value, name))
-            return static_cast<int32_t>(i);
+    // Slots are fetched some at a time, or the window would go to and fro between the list and the records.
+    CellOffset offsets[64];
+    uint32_t position = 0;
+    while (position < list.count) {
+        const uint32_t count = values_at(store, list, position, offsets, 64);
+        for (uint32_t i = 0; i < count; i++) {
+            if (read_value(store, offsets[i], value) && value_is_named(store, value, name))
+                return static_cast<int32_t>(position + i);
+        }
+        if (count == 0)
+            break;
+        position += count;
     }
     return -1;
 }

@@ -18,6 +18,8 @@ struct ValueList {
 ValueList find_value_list(Store& store, const KeyRecord& key);
 // The i-th value record's offset; none when it cannot be read.
 CellOffset value_at(Store& store, const ValueList& list, uint32_t i);
+// The offsets of up to most value records from the i-th on; returns how many were read.
+uint32_t values_at(Store& store, const ValueList& list, uint32_t i, CellOffset* offsets, uint32_t most);
 // Position of the value of that name, -1 when there is none.
 int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value);
 
