@@ -221,19 +221,6 @@ Outcome rewrite_at(Store& store, int64_t position, const void* now, const void* 
     return Outcome::unchanged;
 }
 
-bool read_size(Store& store, int64_t position, int32_t& size) {
-    Le32 word;
-    if (read_at(store, sig_none, position, &word, sizeof word) != sizeof word)
-        return false;
-    size = static_cast<int32_t>(static_cast<uint32_t>(word));
-    return true;
-}
-
-bool is_cell_size(int32_t size, uint32_t room, uint32_t& absolute) {
-    absolute = size < 0 ? 0U - static_cast<uint32_t>(size) : static_cast<uint32_t>(size);
-    return absolute != 0 && absolute % cell_alignment == 0 && absolute <= room;
-}
-
 int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin) {
     BinHeader header;
     const int64_t start = int64_t{base_block_size} + bin_offset;

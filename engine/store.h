@@ -8,6 +8,8 @@
 
 #include <tallowfen/registry.h>
 
+#include <cstring>
+
 namespace engine {
 
 constexpr uint32_t window_size = 16384;
@@ -104,10 +106,26 @@ bool read_part(Store& store, const Cell& cell, uint32_t skip, void* buffer, uint
 Bin* bin_of(Store& store, CellOffset offset);
 // Reads the bin's header and walks its cells; fills bin; returns the end of the walk, counted from the first bin, or -1.
 int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin);
-// Reads one size word: false when it cannot be read. The walk over a bin's cells steps with it.
-bool read_size(Store& store, int64_t position, int32_t& size);
+// Reads one size word: false when it cannot be read. The walk over a bin's cells steps with it, so the common case, a
+// word inside the window, is kept short.
+inline bool read_size(Store& store, int64_t position, int32_t& size) {
+    const ReadWindow& window = store.window;
+    const int64_t skip = position - window.start;
+    Le32 word;
+    if (window.valid && skip >= 0 && skip + int64_t{sizeof word} <= window.length)
+        memcpy(&word, window.bytes + skip, sizeof word);
+    else if (read_at(store, sig_none, position, &word, sizeof word) != sizeof word)
+        return false;
+    size = static_cast<int32_t>(static_cast<uint32_t>(word));
+    return true;
+}
+
 // Whether a size word can be a cell's of at most room bytes; gives its absolute value.
-bool is_cell_size(int32_t size, uint32_t room, uint32_t& absolute);
+inline bool is_cell_size(int32_t size, uint32_t room, uint32_t& absolute) {
+    absolute = size < 0 ? 0U - static_cast<uint32_t>(size) : static_cast<uint32_t>(size);
+    return absolute != 0 && absolute % cell_alignment == 0 && absolute <= room;
+}
+
 // Makes room for one more entry in the bin table; false when memory ran out, the table then being as before.
 bool reserve_bin(Store& store, int32_t growth);
 

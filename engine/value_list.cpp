@@ -208,7 +208,7 @@ ValueList find_value_list(Store& store, const KeyRecord& key) {
 uint32_t values_at(Store& store, const ValueList& list, uint32_t i, CellOffset* offsets, uint32_t most) {
     uint32_t read = 0;
     while (read < most && i < list.count) {
-        Le32 slots[64];
+        Le32 slots[256];
         constexpr uint32_t fits = sizeof slots / slot_size;
         const uint32_t rest = list.count - i < most - read ? list.count - i : most - read;
         const uint32_t count = rest < fits ? rest : fits;
@@ -227,11 +227,12 @@ CellOffset value_at(Store& store, const ValueList& list, uint32_t i) {
 }
 
 int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value) {
-    // Slots are fetched some at a time, or the window would go to and fro between the list and the records.
-    CellOffset offsets[64];
+    // Slots are fetched many at a time, or the window would go to and fro between the list and the records.
+    constexpr uint32_t most = 2048;
+    CellOffset offsets[most];
     uint32_t position = 0;
     while (position < list.count) {
-        const uint32_t count = values_at(store, list, position, offsets, 64);
+        const uint32_t count = values_at(store, list, position, offsets, most);
         for (uint32_t i = 0; i < count; i++) {
             if (read_value(store, offsets[i], value) && value_is_named(store, value, name))
                 return static_cast<int32_t>(position + i);

@@ -1,0 +1,276 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// Times of the engine, each to be set against another of the same run: against reading the file once, or N against 2N.
+#include "hive_file.h"
+
+#include <benchmark/benchmark.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <cstdlib>
+#include <filesystem>
+#include <random>
+#include <string>
+#include <vector>
+
+namespace {
+
+using bench::Counts;
+using bench::HiveFile;
+
+void check(int32_t status, const char* what) {
+    if (status != R_SUCCESS) {
+        std::fprintf(stderr, "%s: status %d\n", what, status);
+        std::exit(1);
+    }
+}
+
+// The hive that whole-file measures are taken on: the largest real one where there is one, else a made one.
+const std::string& large_hive() {
+    static const std::string path = [] {
+        const std::string real = std::string(TALLOWFEN_HIVES) + "/software-7";
+        return std::filesystem::exists(real) ? real : std::string();
+    }();
+    return path;
+}
+
+void make_keys(RegistryKey* parent, int count) {
+    for (int i = 0; i < count; i++) {
+        RegistryKey* key = nullptr;
+        const std::string name = "Key " + std::to_string(i);
+        check(RCreateKey(parent, name.c_str(), &key, nullptr), "create");
+        for (int v = 0; v < 3; v++) {
+            const std::string data(static_cast<size_t>(10 + 20 * v), 'x');
+            check(RSetValueExW(key, ("Value " + std::to_string(v)).c_str(), 3, data.data(),
+                               static_cast<uint32_t>(data.size())),
+                  "set");
+        }
+        RCloseKey(key);
+    }
+}
+
+std::unique_ptr<HiveFile> open_large() {
+    if (!large_hive().empty())
+        return std::make_unique<HiveFile>(large_hive());
+    auto file = std::make_unique<HiveFile>();
+    RegistryKey* root = file->open();
+    for (int i = 0; i < 200; i++) {
+        RegistryKey* branch = nullptr;
+        check(RCreateKey(root, ("Branch " + std::to_string(i)).c_str(), &branch, nullptr), "create");
+        make_keys(branch, 500);
+        RCloseKey(branch);
+    }
+    RCloseKey(root);
+    return file;
+}
+
+HiveFile& large_file() {
+    static const std::unique_ptr<HiveFile> file = open_large();
+    return *file;
+}
+
+void report(benchmark::State& state, const Counts& counts, double operations) {
+    state.counters["reads/op"] = static_cast<double>(counts.reads) / operations;
+    state.counters["readB/op"] = static_cast<double>(counts.bytes_read) / operations;
+    state.counters["writes/op"] = static_cast<double>(counts.writes) / operations;
+    state.counters["writtenB/op"] = static_cast<double>(counts.bytes_written) / operations;
+}
+
+void ReadFileOnce(benchmark::State& state) {
+    HiveFile& file = large_file();
+    file.counts = {};
+    for (auto _ : state)
+        file.read_once();
+    report(state, file.counts, static_cast<double>(state.iterations()));
+}
+BENCHMARK(ReadFileOnce)->Unit(benchmark::kMillisecond);
+
+void OpenHive(benchmark::State& state) {
+    HiveFile& file = large_file();
+    file.counts = {};
+    for (auto _ : state)
+        RCloseKey(file.open());
+    report(state, file.counts, static_cast<double>(state.iterations()));
+}
+BENCHMARK(OpenHive)->Unit(benchmark::kMillisecond);
+
+// Opens each key, queries it, reads every value's name and data, as the program's objects do.
+class Walk {
+public:
+    void key(RegistryKey* handle) {
+        keys++;
+        uint32_t subkeys = 0;
+        uint32_t values_here = 0;
+        uint32_t size = static_cast<uint32_t>(name_.size() * 2);
+        check(RQueryInfoKeyW(handle, name_.data(), &size, nullptr, nullptr, &subkeys, nullptr, nullptr, &values_here,
+                             nullptr, nullptr, nullptr, nullptr),
+              "query");
+        for (uint32_t i = 0; i < values_here; i++)
+            value(handle, i);
+        for (uint32_t i = 0; i < subkeys; i++) {
+            RegistryKey* child = nullptr;
+            check(ROpenSubKey(handle, i, &child), "open");
+            key(child);
+            RCloseKey(child);
+        }
+    }
+
+    uint64_t keys = 0;
+    uint64_t values = 0;
+
+private:
+    void value(RegistryKey* handle, uint32_t i) {
+        values++;
+        uint32_t name_size = static_cast<uint32_t>(name_.size() * 2);
+        uint32_t type = 0;
+        uint32_t size = 0;
+        check(REnumValueW(handle, i, name_.data(), &name_size, &type, nullptr, &size), "value name");
+        data_.resize(std::max<size_t>(data_.size(), size));
+        uint32_t room = size;
+        check(REnumValueW(handle, i, nullptr, nullptr, nullptr, data_.data(), &room), "value data");
+    }
+
+    std::vector<uint16_t> name_ = std::vector<uint16_t>(17000);
+    std::vector<char> data_ = std::vector<char>(4096);
+};
+
+void WalkAll(benchmark::State& state) {
+    HiveFile& file = large_file();
+    RegistryKey* root = file.open();
+    file.counts = {};
+    Walk walk;
+    for (auto _ : state)
+        walk.key(root);
+    RCloseKey(root);
+    report(state, file.counts, static_cast<double>(state.iterations()));
+    state.counters["keys"] = static_cast<double>(walk.keys) / static_cast<double>(state.iterations());
+    state.counters["values"] = static_cast<double>(walk.values) / static_cast<double>(state.iterations());
+}
+BENCHMARK(WalkAll)->Unit(benchmark::kMillisecond);
+
+std::vector<int> shuffled(int count) {
+    std::vector<int> numbers(static_cast<size_t>(count));
+    for (int i = 0; i < count; i++)
+        numbers[static_cast<size_t>(i)] = i;
+    std::mt19937 random(1);
+    std::shuffle(numbers.begin(), numbers.end(), random);
+    return numbers;
+}
+
+std::string key_name(int i) { return "Key number " + std::to_string(i); }
+
+void create_keys(RegistryKey* parent, const std::vector<int>& numbers) {
+    for (const int i : numbers) {
+        RegistryKey* key = nullptr;
+        check(RCreateKey(parent, key_name(i).c_str(), &key, nullptr), "create");
+        RCloseKey(key);
+    }
+}
+
+// The time of one path, with as many siblings as the argument says.
+void OpenPath(benchmark::State& state) {
+    HiveFile file;
+    RegistryKey* root = file.open();
+    const auto count = static_cast<int>(state.range(0));
+    create_keys(root, shuffled(count));
+    const std::vector<int> wanted = shuffled(count);
+    file.counts = {};
+    size_t next = 0;
+    for (auto _ : state) {
+        RegistryKey* key = nullptr;
+        check(ROpenKey(root, key_name(wanted[next]).c_str(), &key), "open");
+        RCloseKey(key);
+        next = (next + 1) % wanted.size();
+    }
+    report(state, file.counts, static_cast<double>(state.iterations()));
+    RCloseKey(root);
+}
+BENCHMARK(OpenPath)->RangeMultiplier(4)->Range(64, 16384)->Unit(benchmark::kMicrosecond);
+
+// Creates the argument's number of keys under one key, in random order; the time is that of all.
+void CreateKeys(benchmark::State& state) {
+    const std::vector<int> numbers = shuffled(static_cast<int>(state.range(0)));
+    Counts counts;
+    for (auto _ : state) {
+        state.PauseTiming();
+        {
+            HiveFile file;
+            RegistryKey* root = file.open();
+            file.counts = {};
+            state.ResumeTiming();
+            create_keys(root, numbers);
+            state.PauseTiming();
+            counts = file.counts;
+            RCloseKey(root);
+        }
+        state.ResumeTiming();
+    }
+    report(state, counts, static_cast<double>(numbers.size()));
+}
+BENCHMARK(CreateKeys)->Arg(2000)->Arg(4000)->Arg(8000)->Arg(16000)->Unit(benchmark::kMillisecond);
+
+void set_values(RegistryKey* key, const std::vector<int>& numbers) {
+    const uint32_t data = 1;
+    for (const int i : numbers)
+        check(RSetValueExW(key, ("Value number " + std::to_string(i)).c_str(), 4, &data, sizeof data), "set");
+}
+
+void SetValues(benchmark::State& state) {
+    const std::vector<int> numbers = shuffled(static_cast<int>(state.range(0)));
+    Counts counts;
+    for (auto _ : state) {
+        state.PauseTiming();
+        {
+            HiveFile file;
+            RegistryKey* root = file.open();
+            file.counts = {};
+            state.ResumeTiming();
+            set_values(root, numbers);
+            state.PauseTiming();
+            counts = file.counts;
+            RCloseKey(root);
+        }
+        state.ResumeTiming();
+    }
+    report(state, counts, static_cast<double>(numbers.size()));
+}
+BENCHMARK(SetValues)->Arg(2000)->Arg(4000)->Arg(8000)->Arg(16000)->Unit(benchmark::kMillisecond);
+
+// The walk over a key's value list for a name that is not there; the time is that of all its records.
+void FindMissingValue(benchmark::State& state) {
+    HiveFile file;
+    RegistryKey* root = file.open();
+    set_values(root, shuffled(static_cast<int>(state.range(0))));
+    for (auto _ : state)
+        benchmark::DoNotOptimize(RFindValueA(root, "not there"));
+    RCloseKey(root);
+}
+BENCHMARK(FindMissingValue)->Arg(4000)->Arg(8000)->Arg(16000)->Unit(benchmark::kMicrosecond);
+
+// Creates and deletes keys in turn; grown is by how much the file became longer, in bytes.
+void CreateAndDelete(benchmark::State& state) {
+    double grown = 0;
+    for (auto _ : state) {
+        HiveFile file;
+        RegistryKey* root = file.open();
+        RegistryKey* parent = nullptr;
+        check(RCreateKey(root, "Parent", &parent, nullptr), "create");
+        const int64_t before = file.size();
+        for (int i = 0; i < 10000; i++) {
+            RegistryKey* key = nullptr;
+            check(RCreateKey(parent, key_name(i).c_str(), &key, nullptr), "create");
+            RCloseKey(key);
+            check(RDeleteKey(parent, key_name(i).c_str()), "delete");
+        }
+        grown = static_cast<double>(file.size() - before);
+        RCloseKey(parent);
+        RCloseKey(root);
+    }
+    state.counters["grownB"] = grown;
+}
+BENCHMARK(CreateAndDelete)->Unit(benchmark::kMillisecond)->Iterations(1);
+
+}  // namespace
+
+BENCHMARK_MAIN();
