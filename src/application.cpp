@@ -1,0 +1,88 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "application.h"
+
+#include "failure_report.h"
+
+#include <QDebug>
+#include <QFile>
+#include <QIcon>
+#include <QLibraryInfo>
+#include <QLocale>
+#include <QTranslator>
+
+#include <cstdio>
+#include <cstdlib>
+#include <exception>
+
+namespace {
+
+const QString share_directory = QStringLiteral(TALLOWFEN_SHARE_DIR);
+
+// Kept as bytes: the terminate handler must not allocate.
+QByteArray& file_being_opened() {
+    static QByteArray file;
+    return file;
+}
+
+[[noreturn]] void tell_and_abort() {
+    const char* reason = "unknown failure";
+    const std::exception_ptr failure = std::current_exception();
+    if (failure) {
+        try {
+            std::rethrow_exception(failure);
+        } catch (const std::exception& known) {
+            reason = known.what();
+            if (file_being_opened().isEmpty()) {
+                std::fprintf(stderr, "tallowfen: %s\n", reason);
+            } else {
+                std::fprintf(stderr, "tallowfen: %s: %s\n", file_being_opened().constData(), reason);
+            }
+        } catch (...) {
+            std::fprintf(stderr, "tallowfen: %s\n", reason);
+        }
+    }
+    std::abort();
+}
+
+} // namespace
+
+Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
+    // A bare X session names no icon theme that holds the folder icon of the key tree.
+    if (!QIcon::hasThemeIcon(QStringLiteral("folder"))) {
+        QIcon::setThemeName(QStringLiteral("Adwaita"));
+    }
+}
+
+bool Application::notify(QObject* receiver, QEvent* event) {
+    try {
+        return QApplication::notify(receiver, event);
+    } catch (const std::exception& failure) {
+        FailureReport& report = FailureReport::instance();
+        report.report(report.current_key(), failure);
+        return true;
+    }
+}
+
+void load_translations(QTranslator& program, QTranslator& toolkit) {
+    QString locale;
+    for (const QString& name : {QLocale::system().name(), QStringLiteral("en_US")}) {
+        locale = name;
+        if (program.load(QStringLiteral("tallowfen_") + name, share_directory)) {
+            break;
+        }
+    }
+    QCoreApplication::installTranslator(&program);
+    qDebug().noquote().nospace() << share_directory << locale;
+
+    // Since Qt 5 the texts of the widgets live in "qtbase_"; "qt_" is there only where all of Qt is installed.
+    const QString toolkit_directory = QLibraryInfo::path(QLibraryInfo::TranslationsPath);
+    if (!toolkit.load(QStringLiteral("qt_") + locale, toolkit_directory)) {
+        [[maybe_unused]] const bool loaded = toolkit.load(QStringLiteral("qtbase_") + locale, toolkit_directory);
+    }
+    QCoreApplication::installTranslator(&toolkit);
+}
+
+void install_terminate_handler() { std::set_terminate(tell_and_abort); }
+
+void set_file_being_opened(const QString& file) { file_being_opened() = QFile::encodeName(file); }

@@ -1,0 +1,30 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#pragma once
+
+// The application object that meets exceptions from damaged keys, and what start-up needs around it.
+
+#include <QApplication>
+#include <QString>
+
+class QTranslator;
+
+// An exception that leaves an event handler is told to the user and ends there; the program goes on.
+class Application : public QApplication {
+    Q_OBJECT
+
+public:
+    Application(int& argc, char** argv);
+
+    bool notify(QObject* receiver, QEvent* event) override;
+};
+
+// Loads the program's translation from the share directory and the toolkit's own for the same locale: the system's
+// locale where there is a file for it, else en_US. Writes the directory and the locale to the debug channel.
+void load_translations(QTranslator& program, QTranslator& toolkit);
+
+// From here on an exception that nobody catches is told in one line on standard error before it ends the program.
+void install_terminate_handler();
+
+// The hive file that is being opened, for that line; empty when none is.
+void set_file_being_opened(const QString& file);

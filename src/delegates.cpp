@@ -1,0 +1,213 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "delegates.h"
+
+#include "failure_report.h"
+
+#include <QCoreApplication>
+#include <QItemEditorFactory>
+#include <QMessageBox>
+#include <QMetaProperty>
+
+#include <algorithm>
+#include <cstdio>
+#include <limits>
+
+namespace {
+
+constexpr qsizetype no_limit = std::numeric_limits<qsizetype>::max();
+// No glyph is narrower than a pixel, so a cell never shows more characters than it is wide; and a row that is
+// measured before it has a width is measured by this many.
+constexpr qsizetype shortest_cut = 1024;
+
+QString hexadecimal(const QByteArray& bytes, qsizetype limit) {
+    static const char digits[] = "0123456789abcdef";
+    const qsizetype count = limit / 3 < bytes.size() ? limit / 3 + 1 : bytes.size();
+    QString text(count * 3 - 1, QLatin1Char(' '));
+    for (qsizetype i = 0; i < count; ++i) {
+        const auto byte = static_cast<unsigned char>(bytes[i]);
+        text[i * 3] = QLatin1Char(digits[byte >> 4]);
+        text[i * 3 + 1] = QLatin1Char(digits[byte & 15]);
+    }
+    return text;
+}
+
+QString joined(const QStringList& strings, qsizetype limit) {
+    QString text;
+    for (qsizetype i = 0; i < strings.size() && text.size() < limit; ++i) {
+        if (i > 0) {
+            text += QLatin1Char(' ');
+        }
+        text += QStringView(strings[i]).left(std::min(limit, strings[i].size()));
+    }
+    return text;
+}
+
+// The text of a datum, of which only the first `limit` characters need be right.
+QString rendered(const QVariant& value, qsizetype limit) {
+    switch (value.typeId()) {
+    case QMetaType::QString:
+        return limit == no_limit ? value.toString() : value.toString().left(limit);
+    case QMetaType::UInt: {
+        char text[32];
+        std::snprintf(text, sizeof text, "0x%08x (%u)", value.toUInt(), value.toUInt());
+        return QString::fromLatin1(text);
+    }
+    case QMetaType::ULongLong: {
+        char text[64];
+        std::snprintf(text, sizeof text, "0x%016llx (%llu)", value.toULongLong(), value.toULongLong());
+        return QString::fromLatin1(text);
+    }
+    case QMetaType::QByteArray: {
+        const QByteArray bytes = value.toByteArray();
+        return bytes.isEmpty() ? QCoreApplication::translate("MainWindow", "(zero-length binary value)")
+                               : hexadecimal(bytes, limit);
+    }
+    case QMetaType::QStringList:
+        return joined(value.toStringList(), limit);
+    default:
+        break;
+    }
+    if (value.typeId() >= QMetaType::User) {
+        return ValueDelegate::tr("(value not set)");
+    }
+    std::printf("fallback: rendering '%s' as string\n", value.typeName());
+    return value.toString();
+}
+
+// Whether rendering all of the datum costs more than showing `limit` characters of it.
+bool is_longer(const QVariant& value, qsizetype limit) {
+    switch (value.typeId()) {
+    case QMetaType::QString:
+        return value.toString().size() > limit;
+    case QMetaType::QByteArray:
+        return value.toByteArray().size() > limit / 3;
+    case QMetaType::QStringList: {
+        qsizetype length = 0;
+        for (const QString& text : value.toStringList()) {
+            length += text.size() + 1;
+            if (length > limit) {
+                return true;
+            }
+        }
+        return false;
+    }
+    default:
+        return false;
+    }
+}
+
+// Writes the editor's text back when it was changed; false when the model refused it.
+bool commit(const QStyledItemDelegate& delegate, const QWidget& editor, QAbstractItemModel& model,
+            const QModelIndex& index) {
+    QByteArray property = editor.metaObject()->userProperty().name();
+    if (property.isEmpty()) {
+        const QItemEditorFactory* factory = delegate.itemEditorFactory();
+        if (!factory) {
+            factory = QItemEditorFactory::defaultFactory();
+        }
+        property = factory->valuePropertyName(model.data(index, Qt::EditRole).userType());
+    }
+    if (property.isEmpty()) {
+        return true;
+    }
+    const QVariant old_text = model.data(index, Qt::DisplayRole);
+    const QVariant new_text = editor.property(property.constData());
+    return old_text == new_text || model.setData(index, new_text, Qt::EditRole);
+}
+
+void tell_refused(QWidget* main_window, const QString& text) {
+    QMessageBox::critical(main_window, QCoreApplication::applicationName(), text, QMessageBox::Ok);
+}
+
+// The rows of the values table belong to the key that the user is at.
+void report_value_failure(const std::exception& failure) {
+    FailureReport& report = FailureReport::instance();
+    report.report(report.current_key(), failure);
+}
+
+void report_key_failure(const QModelIndex& index, const std::exception& failure) {
+    FailureReport::instance().report(key_path_of(index), failure);
+}
+
+} // namespace
+
+ValueDelegate::ValueDelegate(QWidget* main_window) : m_main_window(main_window) {}
+
+QString ValueDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
+    return rendered(value, no_limit);
+}
+
+void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
+    if (!commit(*this, *editor, *model, index)) {
+        tell_refused(m_main_window, tr("The specified value name already exists."));
+    }
+}
+
+void ValueDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const {
+    try {
+        QStyledItemDelegate::paint(painter, option, index);
+    } catch (const std::exception& failure) {
+        report_value_failure(failure);
+    }
+}
+
+QSize ValueDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const {
+    try {
+        return QStyledItemDelegate::sizeHint(option, index);
+    } catch (const std::exception& failure) {
+        report_value_failure(failure);
+        return {};
+    }
+}
+
+void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
+    try {
+        const qsizetype limit = std::max<qsizetype>(shortest_cut, option->rect.width());
+        const QVariant value = index.data(Qt::DisplayRole);
+        if (!is_longer(value, limit)) {
+            QStyledItemDelegate::initStyleOption(option, index);
+            return;
+        }
+        // An index without data takes the base class through all but the text.
+        QStyledItemDelegate::initStyleOption(option, QModelIndex());
+        option->index = index;
+        option->features |= QStyleOptionViewItem::HasDisplay;
+        option->text = rendered(value, limit);
+    } catch (const std::exception& failure) {
+        report_value_failure(failure);
+    }
+}
+
+KeyDelegate::KeyDelegate(QWidget* main_window) : m_main_window(main_window) {}
+
+void KeyDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
+    if (!commit(*this, *editor, *model, index)) {
+        tell_refused(m_main_window, tr("The specified key name already exists."));
+    }
+}
+
+void KeyDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const {
+    try {
+        QStyledItemDelegate::paint(painter, option, index);
+    } catch (const std::exception& failure) {
+        report_key_failure(index, failure);
+    }
+}
+
+QSize KeyDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const {
+    try {
+        return QStyledItemDelegate::sizeHint(option, index);
+    } catch (const std::exception& failure) {
+        report_key_failure(index, failure);
+        return {};
+    }
+}
+
+void KeyDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
+    try {
+        QStyledItemDelegate::initStyleOption(option, index);
+    } catch (const std::exception& failure) {
+        report_key_failure(index, failure);
+    }
+}

@@ -1,0 +1,119 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "edit_dialogs.h"
+
+#include <QAbstractItemModel>
+#include <QCoreApplication>
+#include <QDialog>
+#include <QDialogButtonBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QRegularExpressionValidator>
+#include <QTextDocument>
+#include <QTextEdit>
+#include <QVBoxLayout>
+
+#include <limits>
+
+namespace {
+
+// Takes the caller's widget out of the dialog again, whatever way the dialog is left: the caller owns it, and still
+// reads it.
+class Loan {
+public:
+    explicit Loan(QWidget* widget) : m_widget(widget) {}
+    ~Loan() { m_widget->setParent(nullptr); }
+    Loan(const Loan&) = delete;
+    Loan& operator=(const Loan&) = delete;
+
+private:
+    QWidget* m_widget;
+};
+
+// Lays out an editor around its data widget and runs it; true for Ok.
+bool run_editor(const QString& title, const QString& value_name, QWidget* data_widget) {
+    QDialog dialog;
+    const Loan loan(data_widget);
+    dialog.setWindowTitle(title);
+    auto* name_edit = new QLineEdit(value_name);
+    name_edit->setReadOnly(true);
+    auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, Qt::Horizontal);
+    QObject::connect(buttons, &QDialogButtonBox::accepted, &dialog, &QDialog::accept);
+    QObject::connect(buttons, &QDialogButtonBox::rejected, &dialog, &QDialog::reject);
+    auto* name_label = new QLabel(QCoreApplication::translate("ValuesView", "Value name:"));
+    name_label->setBuddy(name_edit);
+    auto* data_label = new QLabel(QCoreApplication::translate("ValuesView", "Value data:"));
+    data_label->setBuddy(data_widget);
+
+    auto* layout = new QVBoxLayout(&dialog);
+    layout->addWidget(name_label);
+    layout->addWidget(name_edit);
+    layout->addWidget(data_label);
+    layout->addWidget(data_widget);
+    layout->addWidget(buttons);
+    // The layout's own minimum first, so that the height which is then fixed is the one that the dialog has.
+    dialog.ensurePolished();
+    layout->activate();
+    dialog.resize(360, 60);
+    dialog.setMaximumHeight(dialog.height());
+    data_widget->setFocus();
+    return dialog.exec() == QDialog::Accepted;
+}
+
+// Registry text is longer than a line edit takes by default.
+void take_any_length(QLineEdit& edit) { edit.setMaxLength(std::numeric_limits<int>::max()); }
+
+// The document's text with its lines parted by "\n". Not toPlainText: that turns a non-breaking space into a blank.
+QString text_of(const QTextDocument& document, bool had_line_separators) {
+    QString text = document.toRawText();
+    text.replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
+    if (!had_line_separators) {
+        // Shift+Return puts one; the user means a line.
+        text.replace(QChar::LineSeparator, QLatin1Char('\n'));
+    }
+    return text;
+}
+
+} // namespace
+
+void edit_string(QAbstractItemModel& model, const QString& value_name, const QString& data,
+                 const QModelIndex& data_index) {
+    QLineEdit edit;
+    take_any_length(edit);
+    edit.setText(data);
+    if (run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit)) {
+        model.setData(data_index, edit.isModified() ? edit.text() : data, Qt::DisplayRole);
+    }
+}
+
+void edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
+                 const QModelIndex& data_index) {
+    QLineEdit edit;
+    take_any_length(edit);
+    edit.setText(QString::fromLatin1(data.toHex()));
+    // One class of characters instead of three alternatives: the same language, without a match step per digit on
+    // the matcher's stack, which runs out at some ten thousand digits.
+    edit.setValidator(
+        new QRegularExpressionValidator(QRegularExpression(QStringLiteral("[a-fA-F0-9]*")), &edit));
+    if (run_editor(QCoreApplication::translate("ValuesView", "Edit Binary Value", "dialog title"), value_name,
+                   &edit)) {
+        model.setData(data_index, QByteArray::fromHex(edit.text().toLatin1()), Qt::DisplayRole);
+    }
+}
+
+void edit_multi_string(QAbstractItemModel& model, const QString& value_name, const QStringList& data,
+                       const QModelIndex& data_index) {
+    QTextEdit edit;
+    edit.setAcceptRichText(false);
+    edit.setTabChangesFocus(true);
+    // Plain text, and not line by line: what looks like markup is data, and so is an empty first line.
+    const QString given = data.join(QLatin1Char('\n'));
+    edit.setPlainText(given);
+    edit.document()->setModified(false);
+    if (run_editor(QCoreApplication::translate("ValuesView", "Edit Multi-String", "dialog title"), value_name,
+                   &edit)) {
+        const QString text = text_of(*edit.document(), given.contains(QChar::LineSeparator));
+        const bool untouched = !edit.document()->isModified() && !data.isEmpty();
+        model.setData(data_index, untouched ? data : text.split(QLatin1Char('\n')), Qt::DisplayRole);
+    }
+}

@@ -1,0 +1,22 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#pragma once
+
+// The modal editors for text, bytes and lists of texts, each run for one value at a time.
+
+#include <QByteArray>
+#include <QString>
+#include <QStringList>
+
+class QAbstractItemModel;
+class QModelIndex;
+
+// Each shows the value's name and its data and returns when it is closed. Ok writes the new data to `data_index` of
+// `model` with setData and Qt::DisplayRole; anything else writes nothing. A datum that the user left alone is
+// written back exactly as it was given, also where its characters do not survive the editing widget.
+void edit_string(QAbstractItemModel& model, const QString& value_name, const QString& data,
+                 const QModelIndex& data_index);
+void edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
+                 const QModelIndex& data_index);
+void edit_multi_string(QAbstractItemModel& model, const QString& value_name, const QStringList& data,
+                       const QModelIndex& data_index);

@@ -1,0 +1,71 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "failure_report.h"
+
+#include <QApplication>
+#include <QMessageBox>
+#include <QPointer>
+
+namespace {
+
+// A hive can hold thousands of damaged keys; a box must still fit the screen.
+constexpr qsizetype max_lines = 10;
+
+} // namespace
+
+FailureReport::FailureReport(QObject* parent) : QObject(parent) {}
+
+FailureReport& FailureReport::instance() {
+    static QPointer<FailureReport> the_report;
+    if (!the_report) {
+        the_report = new FailureReport(qApp);
+    }
+    return *the_report;
+}
+
+void FailureReport::report(const QString& key_path, const std::exception& failure) {
+    const QString reason = QString::fromLocal8Bit(failure.what());
+    const QString line = key_path.isEmpty() ? tr("The registry cannot be read: %1").arg(reason)
+                                            : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
+    if (m_told.contains(line)) {
+        return;
+    }
+    m_told.insert(line);
+    m_pending.append(line);
+    if (!m_scheduled) {
+        m_scheduled = true;
+        QMetaObject::invokeMethod(this, &FailureReport::show_pending, Qt::QueuedConnection);
+    }
+}
+
+void FailureReport::show_pending() {
+    // What arrives while the box is open waits for the next one instead of stacking boxes.
+    while (!m_pending.isEmpty()) {
+        QStringList lines = m_pending.mid(0, max_lines);
+        if (m_pending.size() > max_lines) {
+            lines.append(tr("More keys cannot be read: %1").arg(m_pending.size() - max_lines));
+        }
+        m_pending.clear();
+        QMessageBox::critical(QApplication::activeWindow(), QCoreApplication::applicationName(),
+                              lines.join(QLatin1Char('\n')), QMessageBox::Ok);
+    }
+    m_scheduled = false;
+}
+
+QString key_path_of(const QModelIndex& index) {
+    QStringList names;
+    QModelIndex step = index;
+    while (step.isValid()) {
+        try {
+            names.prepend(step.data(Qt::DisplayRole).toString());
+        } catch (const std::exception&) {
+            names.prepend(QStringLiteral("?"));
+        }
+        try {
+            step = step.parent();
+        } catch (const std::exception&) {
+            step = QModelIndex();
+        }
+    }
+    return names.join(QLatin1Char('\\'));
+}

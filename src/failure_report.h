@@ -1,0 +1,43 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#pragma once
+
+// Tells the user what a damaged key did while the window runs: in one box, once per cause, never from inside a paint.
+
+#include <QModelIndex>
+#include <QObject>
+#include <QSet>
+#include <QString>
+#include <QStringList>
+
+#include <exception>
+
+class FailureReport : public QObject {
+    Q_OBJECT
+
+public:
+    // The one report of the running application, which owns it.
+    static FailureReport& instance();
+
+    // Notes what was caught while the key at `key_path` was used; an empty path means that the key is not known.
+    // The box opens from the event loop, so this may be called while painting. A cause (key and reason) that was
+    // told before is left out; what comes in while a box is open shares the next one.
+    void report(const QString& key_path, const std::exception& failure);
+
+    // The key that the user's last gesture was about: named where an exception surfaces far from the key it met.
+    void set_current_key(const QString& key_path) { m_current_key = key_path; }
+    QString current_key() const { return m_current_key; }
+
+private:
+    explicit FailureReport(QObject* parent);
+    void show_pending();
+
+    QString m_current_key;
+    QSet<QString> m_told;
+    QStringList m_pending;
+    bool m_scheduled = false;
+};
+
+// The names from the outermost key down to `index`, joined with backslashes. A name that cannot be read stands as
+// "?": this never throws.
+QString key_path_of(const QModelIndex& index);

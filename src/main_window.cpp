@@ -1,0 +1,232 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "main_window.h"
+
+#include "failure_report.h"
+#include "keys_view.h"
+#include "shared_actions.h"
+#include "values_model.h"
+#include "values_proxy_model.h"
+#include "values_view.h"
+
+#include <QAction>
+#include <QActionGroup>
+#include <QCoreApplication>
+#include <QEvent>
+#include <QHeaderView>
+#include <QKeyEvent>
+#include <QLabel>
+#include <QMenu>
+#include <QMenuBar>
+#include <QSplitter>
+#include <QStatusBar>
+
+namespace {
+
+// Parent steps from `index` to the top, no more than three; -1 for no index.
+int depth_of(const QModelIndex& index) {
+    constexpr int deepest = 3;
+    int depth = -1;
+    for (QModelIndex step = index; step.isValid() && depth < deepest; step = step.parent()) {
+        ++depth;
+    }
+    return depth;
+}
+
+} // namespace
+
+MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
+    : QMainWindow(parent, flags), key_delegate(this), value_delegate(this),
+      values_proxy(std::make_unique<ValuesProxyModel>()) {
+    setWindowTitle(QCoreApplication::applicationName());
+    shared_actions();
+    find_mode = RegModel::FindKeys;
+    find_flags = Qt::MatchContains;
+    make_views();
+    status_label = new QLabel(QString(), this);
+    // A path that is wider than the window is cut, and must not widen the window.
+    status_label->setMinimumWidth(1);
+    // Key names are data: what looks like markup in one is shown as it is.
+    status_label->setTextFormat(Qt::PlainText);
+    statusBar()->addWidget(status_label, 0);
+    connect(values_table, &QAbstractItemView::activated, this,
+            qOverload<const QModelIndex&>(&MainWindow::value_selected));
+    connect(values_table, &QAbstractItemView::clicked, this,
+            qOverload<const QModelIndex&>(&MainWindow::value_selected));
+    connect(&find_watcher, &QFutureWatcherBase::finished, this, &MainWindow::show_find_result);
+    // A program that ends by another way than this window must not leave a search behind, either.
+    connect(qApp, &QCoreApplication::aboutToQuit, this, &MainWindow::end_search);
+    make_menus();
+    menuBar()->installEventFilter(this);
+    statusBar()->installEventFilter(this);
+}
+
+MainWindow::~MainWindow() {
+    // The view must not ask a proxy that is destroyed before it.
+    values_table->setModel(nullptr);
+}
+
+void MainWindow::make_views() {
+    // Placed by hand in resizeEvent, and not the central widget.
+    splitter = new QSplitter(this);
+    splitter->setAccessibleName(QStringLiteral("splitter"));
+    keys_tree = new KeysView(splitter);
+    keys_tree->setAccessibleName(QStringLiteral("keys_tree"));
+    values_table = new ValuesView(splitter);
+    values_table->setAccessibleName(QStringLiteral("values_table"));
+    values_table->setSelectionBehavior(QAbstractItemView::SelectItems);
+    values_table->setSelectionMode(QAbstractItemView::SingleSelection);
+    values_table->setShowGrid(false);
+    values_table->setEditTriggers(QAbstractItemView::EditKeyPressed);
+    values_table->setContextMenuPolicy(Qt::CustomContextMenu);
+    values_table->verticalHeader()->setVisible(false);
+    // The values take the larger share, and what the window grows by.
+    splitter->setStretchFactor(0, 0);
+    splitter->setStretchFactor(1, 1);
+    splitter->setSizes({220, 420});
+    setTabOrder(keys_tree, values_table);
+}
+
+void MainWindow::make_menus() {
+    const SharedActions& actions = shared_actions();
+    QMenu* file_menu = menuBar()->addMenu(tr("&File", "menu title"));
+    const QAction* exit_action = file_menu->addAction(tr("Exit", "menu item"));
+    connect(exit_action, &QAction::triggered, qApp, &QCoreApplication::quit);
+
+    QMenu* edit_menu = menuBar()->addMenu(tr("&Edit", "menu title"));
+    QMenu* new_menu = edit_menu->addMenu(tr("&New", "menu title"));
+    new_menu->addAction(actions.new_key_action);
+    new_menu->addSeparator();
+    for (QAction* action : {actions.new_string_action, actions.new_binary_action, actions.new_dword_action,
+                            actions.new_qword_action, actions.new_multi_string_action,
+                            actions.new_expand_string_action}) {
+        new_menu->addAction(action);
+    }
+    edit_menu->addSeparator();
+    edit_menu->addAction(actions.delete_action);
+    edit_menu->addAction(actions.rename_action);
+    edit_menu->addSeparator();
+    QAction* find_action = edit_menu->addAction(tr("Find...", "menu item"));
+    find_action->setShortcut(QKeySequence::Find);
+    connect(find_action, &QAction::triggered, this, &MainWindow::show_find_dialog);
+    QAction* find_next_action = edit_menu->addAction(tr("Find next", "menu item"));
+    find_next_action->setShortcut(QKeySequence::FindNext);
+    connect(find_next_action, &QAction::triggered, this, &MainWindow::find_next);
+
+    QMenu* view_menu = menuBar()->addMenu(tr("&View", "menu title"));
+    QAction* refresh_action = view_menu->addAction(tr("Refresh", "menu item"));
+    refresh_action->setShortcut(QKeySequence::Refresh);
+    connect(refresh_action, &QAction::triggered, this, &MainWindow::refresh_views);
+}
+
+void MainWindow::set_model(RegModel* model) {
+    key_model = model;
+    keys_tree->setModel(model);
+    keys_tree->setItemDelegate(&key_delegate);
+    if (!model) {
+        return;
+    }
+    connect(model, &QAbstractItemModel::layoutChanged, this, qOverload<>(&MainWindow::update_statusbar));
+    connect(model, &QAbstractItemModel::dataChanged, this,
+            [this](const QModelIndex& top_left, const QModelIndex& bottom_right) {
+                update_statusbar(top_left, bottom_right);
+            });
+    connect(keys_tree->selectionModel(), &QItemSelectionModel::currentChanged, this,
+            qOverload<const QModelIndex&, const QModelIndex&>(&MainWindow::reload_values));
+}
+
+void MainWindow::show_status(const QModelIndex& key) {
+    const QString path = key_path_of(key);
+    status_label->setText(path);
+    status_label->setToolTip(path.toHtmlEscaped());
+    FailureReport::instance().set_current_key(path);
+}
+
+void MainWindow::update_statusbar() { show_status(keys_tree->currentIndex()); }
+
+void MainWindow::update_statusbar(const QModelIndex& top_left, const QModelIndex& /*bottom_right*/) {
+    if (top_left == keys_tree->currentIndex()) {
+        update_statusbar();
+    }
+}
+
+void MainWindow::reload_values(const QModelIndex& current) {
+    show_status(current);
+    place_splitter();
+    show_values_of(current);
+    if (values_table->selectionModel()) {
+        disconnect(values_table->selectionModel(), nullptr, this, nullptr);
+    }
+    values_table->setModel(values_proxy.get());
+    values_table->setItemDelegate(&value_delegate);
+    shared_actions().new_action_group->setEnabled(values_proxy->has_key());
+    set_key_actions(current);
+    connect(values_table->selectionModel(), &QItemSelectionModel::currentChanged, this,
+            qOverload<const QModelIndex&, const QModelIndex&>(&MainWindow::value_selected));
+}
+
+void MainWindow::reload_values(const QModelIndex& current, const QModelIndex& /*previous*/) {
+    reload_values(current);
+}
+
+// A key whose values cannot be read is told, and shows an empty table: the window must not go on asking it.
+void MainWindow::show_values_of(const QModelIndex& key) {
+    try {
+        set_values_source(RegModel::editable_key(key));
+        values_proxy->sort(0, Qt::AscendingOrder);
+    } catch (const std::exception& failure) {
+        FailureReport::instance().report(key_path_of(key), failure);
+        set_values_source(nullptr);
+    }
+}
+
+void MainWindow::set_values_source(RegKey* key) {
+    auto source = std::make_unique<ValuesModel>(key, nullptr);
+    // The old source goes only when the proxy has let go of it, also where the new one's key throws.
+    values_source.swap(source);
+    values_proxy->setSourceModel(values_source.get());
+}
+
+void MainWindow::set_key_actions(const QModelIndex& key) {
+    const SharedActions& actions = shared_actions();
+    const int depth = depth_of(key);
+    actions.new_key_action->setEnabled(depth >= 2);
+    actions.delete_action->setEnabled(depth >= 3);
+    actions.rename_action->setEnabled(depth >= 3);
+}
+
+void MainWindow::value_selected(const QModelIndex& current) {
+    // The selection of a table that was emptied says nothing about the actions: they are the key's again.
+    if (!current.isValid()) {
+        set_key_actions(keys_tree->currentIndex());
+        return;
+    }
+    const SharedActions& actions = shared_actions();
+    actions.delete_action->setEnabled(true);
+    actions.rename_action->setEnabled(values_proxy->flags(current).testFlag(Qt::ItemIsEditable));
+}
+
+void MainWindow::value_selected(const QModelIndex& current, const QModelIndex& /*previous*/) {
+    value_selected(current);
+}
+
+void MainWindow::refresh_views() { values_proxy->sort(0, Qt::AscendingOrder); }
+
+void MainWindow::resizeEvent(QResizeEvent* event) {
+    QMainWindow::resizeEvent(event);
+    place_splitter();
+}
+
+void MainWindow::keyPressEvent(QKeyEvent* event) { QWidget::keyPressEvent(event); }
+
+bool MainWindow::eventFilter(QObject* watched, QEvent* event) {
+    if (event->type() == QEvent::Resize || event->type() == QEvent::Move) {
+        place_splitter();
+    }
+    return QMainWindow::eventFilter(watched, event);
+}
+
+void MainWindow::place_splitter() {
+    const int top = menuBar()->height();
+    splitter->setGeometry(0, top, width(), height() - top - statusBar()->height());
+}

@@ -1,0 +1,125 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+// The window's search: one walk of the key model on a worker thread behind a modal dialog.
+
+#include "find_dialog.h"
+#include "keys_view.h"
+#include "main_window.h"
+#include "values_proxy_model.h"
+#include "values_view.h"
+
+#include <QCoreApplication>
+#include <QDialog>
+#include <QMessageBox>
+#include <QUnhandledException>
+#include <QtConcurrentRun>
+
+namespace {
+
+// What the task of a future threw; empty when it threw nothing.
+QString failure_of(QFuture<RegModel::FindResult> future) {
+    try {
+        try {
+            future.waitForFinished();
+        } catch (const QUnhandledException& wrapped) {
+            if (!wrapped.exception()) {
+                throw;
+            }
+            std::rethrow_exception(wrapped.exception());
+        }
+    } catch (const std::exception& failure) {
+        return QString::fromLocal8Bit(failure.what());
+    }
+    return {};
+}
+
+} // namespace
+
+void MainWindow::show_find_dialog() {
+    FindRequest request{find_term, find_mode, find_flags};
+    if (!ask_find_request(request)) {
+        return;
+    }
+    find_flags = request.flags;
+    find_mode = request.mode;
+    find_term = request.term;
+    start_search(key_model ? key_model->index(0, 0) : QModelIndex(), find_term);
+}
+
+void MainWindow::find_next() {
+    if (can_find_next) {
+        start_search(QModelIndex(), find_term);
+    } else {
+        show_find_dialog();
+    }
+}
+
+// An invalid start goes on where the model's last search stopped.
+void MainWindow::start_search(const QModelIndex& start, const QString& term) {
+    if (!key_model) {
+        return;
+    }
+    if (start.isValid()) {
+        key_model->begin_find(start);
+        can_find_next = true;
+    }
+    find_future = QtConcurrent::run(&RegModel::find, key_model, QVariant(term), find_mode, find_flags);
+    find_watcher.setFuture(find_future);
+    search_dialog = make_searching_dialog(this);
+    // Once it has run, the dialog is gone.
+    const int result = search_dialog->exec();
+    search_dialog = nullptr;
+    if (result == QDialog::Rejected) {
+        end_search();
+    }
+}
+
+// Returns when the worker has ended, so that nothing reads a tree that the user changes next.
+void MainWindow::end_search() {
+    find_future.cancel();
+    if (key_model) {
+        key_model->stop_find();
+    }
+    [[maybe_unused]] const QString ignored = failure_of(find_future);
+    // Whatever it found or threw in the end may still be on its way here; the user has asked not to see it.
+    find_watcher.setFuture(QFuture<RegModel::FindResult>());
+    can_find_next = false;
+}
+
+void MainWindow::show_find_result() {
+    const QString failure = failure_of(find_watcher.future());
+    if (find_watcher.isCanceled() && failure.isEmpty()) {
+        can_find_next = false;
+        return;
+    }
+    if (search_dialog) {
+        search_dialog->done(QDialog::Accepted);
+        search_dialog = nullptr;
+    }
+    if (!failure.isEmpty()) {
+        can_find_next = false;
+        QMessageBox::critical(this, QCoreApplication::applicationName(),
+                              tr("The search could not go on: %1").arg(failure), QMessageBox::Ok);
+        return;
+    }
+    const RegModel::FindResult hit = find_watcher.future().result();
+    if (hit.key.isValid()) {
+        show_hit(hit);
+        return;
+    }
+    can_find_next = false;
+    QMessageBox::information(this, QCoreApplication::applicationName(), tr("Finished searching."),
+                             QMessageBox::Ok);
+}
+
+void MainWindow::show_hit(const RegModel::FindResult& hit) {
+    for (QModelIndex step = hit.key; step.isValid(); step = step.parent()) {
+        keys_tree->setExpanded(step, true);
+    }
+    keys_tree->setCurrentIndex(hit.key);
+    if (hit.value_row >= 0) {
+        // The row is one of the sorted table, which a value added or renamed since has left unsorted.
+        values_proxy->sort(0, Qt::AscendingOrder);
+        values_table->setCurrentIndex(values_proxy->index(hit.value_row, 0));
+    }
+}

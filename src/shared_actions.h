@@ -1,0 +1,25 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#pragma once
+
+// The one set of editing actions that the main menu and both context menus share.
+
+class QAction;
+class QActionGroup;
+
+struct SharedActions {
+    QAction* new_key_action;
+    QAction* new_string_action;
+    QAction* new_binary_action;
+    QAction* new_dword_action;
+    QAction* new_qword_action;
+    QAction* new_multi_string_action;
+    QAction* new_expand_string_action;
+    QAction* delete_action;
+    QAction* rename_action;
+    QActionGroup* new_action_group;
+};
+
+// The process's set, made by the first call, in the language of that moment, and never freed. Nothing is selected
+// then, so all of it starts disabled.
+const SharedActions& shared_actions();

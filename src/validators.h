@@ -1,0 +1,33 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#pragma once
+
+// Validators for unsigned decimal numbers of 32 and 64 bits; the toolkit's own knows signed ones only.
+
+#include <QValidator>
+
+class UintValidator : public QValidator {
+    Q_OBJECT
+
+public:
+    UintValidator(quint32 bottom, quint32 top, QObject* parent = nullptr);
+
+    State validate(QString& input, int& pos) const override;
+
+private:
+    quint32 m_bottom;
+    quint32 m_top;
+};
+
+class Uint64Validator : public QValidator {
+    Q_OBJECT
+
+public:
+    Uint64Validator(quint64 bottom, quint64 top, QObject* parent = nullptr);
+
+    State validate(QString& input, int& pos) const override;
+
+private:
+    quint64 m_bottom;
+    quint64 m_top;
+};

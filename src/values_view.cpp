@@ -1,0 +1,245 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "values_view.h"
+
+#include "edit_dialogs.h"
+#include "edit_number_dialog.h"
+#include "failure_report.h"
+#include "shared_actions.h"
+#include "values_proxy_model.h"
+
+#include <QAction>
+#include <QActionGroup>
+#include <QCoreApplication>
+#include <QHeaderView>
+#include <QHelpEvent>
+#include <QKeyEvent>
+#include <QMenu>
+#include <QMessageBox>
+#include <QStyledItemDelegate>
+#include <QTextDocument>
+#include <QToolTip>
+
+namespace {
+
+constexpr int name_column = 0;
+constexpr int data_column = 2;
+
+// The registry type that an action of the "new" group creates; -1 for the action that creates a key.
+int type_created_by(const QAction* action) {
+    const SharedActions& actions = shared_actions();
+    if (action == actions.new_string_action) {
+        return 1;
+    }
+    if (action == actions.new_expand_string_action) {
+        return 2;
+    }
+    if (action == actions.new_binary_action) {
+        return 3;
+    }
+    if (action == actions.new_dword_action) {
+        return 4;
+    }
+    if (action == actions.new_multi_string_action) {
+        return 7;
+    }
+    if (action == actions.new_qword_action) {
+        return 11;
+    }
+    return -1;
+}
+
+} // namespace
+
+ValuesView::ValuesView(QWidget* parent) : QTableView(parent) {
+    const SharedActions& actions = shared_actions();
+    connect(this, &QAbstractItemView::doubleClicked, this, &ValuesView::value_double_clicked);
+    connect(this, &QWidget::customContextMenuRequested, this, &ValuesView::show_values_context_menu);
+    connect(actions.new_action_group, &QActionGroup::triggered, this, &ValuesView::run_new_value_action);
+    connect(actions.delete_action, &QAction::triggered, this, &ValuesView::run_delete_value_action);
+    connect(actions.rename_action, &QAction::triggered, this, &ValuesView::run_rename_value_action);
+    // Tab leads on to the next widget: inside the table the arrow keys move.
+    setTabKeyNavigation(false);
+    setHorizontalScrollMode(QAbstractItemView::ScrollPerPixel);
+    setWordWrap(false);
+    verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
+    verticalHeader()->setDefaultSectionSize(fontMetrics().height() + 6);
+    horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+    horizontalHeader()->setHighlightSections(false);
+    connect(horizontalHeader(), &QHeaderView::sectionCountChanged, this, &ValuesView::size_columns);
+}
+
+void ValuesView::size_columns(int old_count, int new_count) {
+    if (old_count != 0 || new_count <= data_column) {
+        return;
+    }
+    // Wide enough for most names, for the commonest type names and for a line of data; the user widens the rest.
+    const int letter = fontMetrics().averageCharWidth();
+    setColumnWidth(name_column, letter * 24);
+    setColumnWidth(1, letter * 20);
+    setColumnWidth(data_column, letter * 60);
+}
+
+void ValuesView::value_double_clicked(QModelIndex index) {
+    if (!index.isValid() || !model() || index.column() != name_column) {
+        return;
+    }
+    const QString name = index.data(Qt::DisplayRole).toString();
+    const QModelIndex data_index = model()->index(index.row(), data_column);
+    const QVariant datum = data_index.data(Qt::DisplayRole);
+    switch (datum.typeId()) {
+    case QMetaType::QString:
+        edit_string(*model(), name, datum.toString(), data_index);
+        return;
+    case QMetaType::QByteArray:
+        edit_binary(*model(), name, datum.toByteArray(), data_index);
+        return;
+    case QMetaType::QStringList:
+        edit_multi_string(*model(), name, datum.toStringList(), data_index);
+        return;
+    case QMetaType::UInt:
+        edit_dword(name, datum.toUInt(), data_index);
+        return;
+    case QMetaType::ULongLong:
+        edit_qword(name, datum.toULongLong(), data_index);
+        return;
+    default:
+        break;
+    }
+    if (datum.typeId() >= QMetaType::User) {
+        edit_string(*model(), name, QString(), data_index);
+    } else {
+        tell_refused(tr("Data type cannot be edited yet"));
+    }
+}
+
+void ValuesView::edit_dword(const QString& value_name, quint32 number, const QModelIndex& data_index) {
+    EditDwordDialog dialog(value_name);
+    dialog.setWindowTitle(tr("Edit DWORD (32-bit) Value", "dialog title"));
+    dialog.set_value(number);
+    if (dialog.exec() == QDialog::Accepted) {
+        model()->setData(data_index, QVariant(dialog.value()), Qt::DisplayRole);
+    }
+}
+
+void ValuesView::edit_qword(const QString& value_name, quint64 number, const QModelIndex& data_index) {
+    EditQwordDialog dialog(value_name);
+    dialog.setWindowTitle(tr("Edit QWORD (64-bit) Value", "dialog title"));
+    dialog.set_value(number);
+    if (dialog.exec() == QDialog::Accepted) {
+        model()->setData(data_index, QVariant(dialog.value()), Qt::DisplayRole);
+    }
+}
+
+void ValuesView::keyPressEvent(QKeyEvent* event) {
+    if (event->key() == Qt::Key_Return && state() != QAbstractItemView::EditingState) {
+        value_double_clicked(currentIndex());
+    } else {
+        QTableView::keyPressEvent(event);
+    }
+}
+
+void ValuesView::show_values_context_menu(QPoint point) {
+    const SharedActions& actions = shared_actions();
+    const QModelIndex index = indexAt(point);
+    QMenu menu;
+    if (index.isValid() && index.column() == name_column) {
+        const QAction* edit_action = menu.addAction(tr("Edit", "menu title"));
+        menu.addAction(actions.delete_action);
+        menu.addAction(actions.rename_action);
+        const int row = index.row();
+        if (menu.exec(viewport()->mapToGlobal(point)) == edit_action) {
+            value_double_clicked(model()->index(row, name_column));
+        }
+        return;
+    }
+    QMenu* new_menu = menu.addMenu(tr("New", "menu title"));
+    new_menu->addAction(actions.new_key_action);
+    new_menu->addSeparator();
+    for (QAction* action : {actions.new_string_action, actions.new_binary_action, actions.new_dword_action,
+                            actions.new_qword_action, actions.new_multi_string_action,
+                            actions.new_expand_string_action}) {
+        new_menu->addAction(action);
+    }
+    menu.exec(viewport()->mapToGlobal(point));
+}
+
+void ValuesView::run_new_value_action(QAction* action) {
+    auto* values = qobject_cast<ValuesProxyModel*>(model());
+    const int type = type_created_by(action);
+    if (!values || type < 0 || !values->has_key()) {
+        return;
+    }
+    if (!values->add_value(type)) {
+        tell_refused(tr("The value could not be created."));
+        return;
+    }
+    const QModelIndex created = values->index(values->rowCount() - 1, name_column);
+    setCurrentIndex(created);
+    edit(created);
+}
+
+void ValuesView::run_delete_value_action(bool /*checked*/) {
+    // The key tree answers the same action.
+    if (!hasFocus() || !model() || !currentIndex().isValid()) {
+        return;
+    }
+    if (QMessageBox::question(this, tr("Confirm Value Removal"),
+                              tr("Are you sure you want to delete this value?"),
+                              QMessageBox::Yes | QMessageBox::No) != QMessageBox::Yes) {
+        return;
+    }
+    const int row = currentIndex().row();
+    if (!model()->removeRows(row, 1, QModelIndex())) {
+        tell_refused(tr("The value could not be deleted."));
+        return;
+    }
+    // The proxy announces a removal as a new layout: the selection is put on what stands there now, by way of no
+    // selection, so that the actions follow.
+    const int rows = model()->rowCount();
+    setCurrentIndex(QModelIndex());
+    if (rows > 0) {
+        setCurrentIndex(model()->index(qMin(row, rows - 1), name_column));
+    }
+}
+
+void ValuesView::run_rename_value_action(bool /*checked*/) {
+    const QModelIndex current = currentIndex();
+    if (!hasFocus() || !current.isValid()) {
+        return;
+    }
+    setCurrentIndex(current);
+    edit(current);
+}
+
+void ValuesView::paintEvent(QPaintEvent* event) {
+    // Last net: the table asks the model for its flags and its size from inside a paint too.
+    try {
+        QTableView::paintEvent(event);
+    } catch (const std::exception& failure) {
+        FailureReport& report = FailureReport::instance();
+        report.report(report.current_key(), failure);
+    }
+}
+
+bool ValuesView::viewportEvent(QEvent* event) {
+    if (event->type() != QEvent::ToolTip) {
+        return QTableView::viewportEvent(event);
+    }
+    // A text that its cell cuts can be read whole; of a very long one, the beginning.
+    const auto* help = static_cast<QHelpEvent*>(event);
+    const QModelIndex index = indexAt(help->pos());
+    const auto* delegate = qobject_cast<const QStyledItemDelegate*>(itemDelegate());
+    QString text;
+    if (index.isValid() && delegate && sizeHintForIndex(index).width() > columnWidth(index.column())) {
+        constexpr qsizetype longest = 1000;
+        text = delegate->displayText(index.data(Qt::DisplayRole), locale()).left(longest);
+    }
+    // Made into paragraphs here, so that the tip takes no text for markup.
+    QToolTip::showText(help->globalPos(), text.isEmpty() ? text : Qt::convertFromPlainText(text), viewport());
+    return true;
+}
+
+void ValuesView::tell_refused(const QString& text) {
+    QMessageBox::critical(this, QCoreApplication::applicationName(), text, QMessageBox::Ok);
+}
