@@ -1,0 +1,172 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "reg_hive.h"
+
+#include "reg_key.h"
+
+#include <QFileInfo>
+#include <QMutexLocker>
+
+#include <tallowfen/registry.h>
+
+#include <sys/file.h>
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <cstdio>
+#include <set>
+#include <stdexcept>
+#include <utility>
+
+namespace {
+
+constexpr int most_handles = 100;
+
+using FileIdentity = std::pair<dev_t, ino_t>;
+
+// The files that hives of this process have open. An advisory lock says the same where the file system knows locks.
+std::set<FileIdentity>& open_files() {
+    static std::set<FileIdentity> files;
+    return files;
+}
+
+FileIdentity identity(const QFile& file) {
+    struct stat status = {};
+    if (fstat(file.handle(), &status) != 0 || !S_ISREG(status.st_mode))
+        throw std::runtime_error("Cannot open file");
+    return {status.st_dev, status.st_ino};
+}
+
+int32_t narrowed(qint64 count) { return count < 0 || count > INT32_MAX ? -1 : static_cast<int32_t>(count); }
+
+int32_t read_device(void* device, void* buffer, int32_t length) {
+    return narrowed(static_cast<QIODevice*>(device)->read(static_cast<char*>(buffer), length));
+}
+
+int32_t write_device(void* device, const void* buffer, int32_t length) {
+    return narrowed(static_cast<QIODevice*>(device)->write(static_cast<const char*>(buffer), length));
+}
+
+int32_t seek_device(void* device, int32_t offset, int32_t whence) {
+    auto* file = static_cast<QIODevice*>(device);
+    qint64 target = offset;
+    if (whence == 1)
+        target += file->pos();
+    else if (whence == 2)
+        target += file->size();
+    else if (whence != 0)
+        return -1;
+    return file->seek(target) ? static_cast<int32_t>(target) : -1;
+}
+
+}  // namespace
+
+KeyHandleHolder::~KeyHandleHolder() {
+    const QMutexLocker locker(hive_->api_mutex());
+    RCloseKey(handle_);
+}
+
+RegHive::Dialogue::Dialogue(RegHive* hive) : hive_(hive) {
+    hive_->cache_mutex_.lock();
+    hive_->api_mutex_.lock();
+}
+
+RegHive::Dialogue::~Dialogue() {
+    hive_->api_mutex_.unlock();
+    hive_->cache_mutex_.unlock();
+}
+
+RegHive::RegHive(const QString& name, const QString& path, AbstractRegKey* parent)
+    : name_(name), file_(path), handle_cache_(most_handles), io_(std::make_unique<RegistryIo>()) {
+    open_file();
+    try {
+        warn_if_dirty();
+        load();
+        root_ = std::make_unique<RegKey>(this, parent);
+        root_->reload();
+    } catch (...) {
+        if (root_handle_ != nullptr)
+            RCloseKey(root_handle_);
+        open_files().erase(identity(file_));
+        throw;
+    }
+}
+
+// Handles before the hive, the hive before the keys: the engine keeps a hive open while one of its handles is.
+RegHive::~RegHive() {
+    clear_handle_cache();
+    {
+        const QMutexLocker locker(&api_mutex_);
+        RCloseKey(root_handle_);
+    }
+    root_.reset();
+    struct stat status = {};
+    if (fstat(file_.handle(), &status) == 0)
+        open_files().erase({status.st_dev, status.st_ino});
+}
+
+void RegHive::open_file() {
+    const QFileInfo info(file_);
+    constexpr QFile::Permissions any_write =
+        QFile::WriteOwner | QFile::WriteUser | QFile::WriteGroup | QFile::WriteOther;
+    // Whoever may override permissions still means a file that nobody may write to as one to be left alone. The kind of
+    // file is asked first, since opening a pipe or a device can do something already.
+    const bool writable = (info.permissions() & (any_write & ~QFile::WriteUser)) != 0;
+    if (!info.isFile() || !writable ||
+        !file_.open(QIODevice::ReadWrite | QIODevice::Unbuffered | QIODevice::ExistingOnly))
+        throw std::runtime_error("Cannot open file");
+    const FileIdentity file = identity(file_);
+    const bool locked_elsewhere = flock(file_.handle(), LOCK_EX | LOCK_NB) != 0 && errno == EWOULDBLOCK;
+    if (locked_elsewhere || !open_files().insert(file).second)
+        throw std::runtime_error("Cannot open file");
+}
+
+// Windows numbers a hive's writes in two places; where they differ it has changes waiting in its logs.
+void RegHive::warn_if_dirty() {
+    constexpr qint64 sequences = 4;
+    char numbers[8];
+    if (file_.seek(sequences) && file_.read(numbers, sizeof numbers) == static_cast<qint64>(sizeof numbers) &&
+        memcmp(numbers, numbers + 4, 4) != 0)
+        std::fprintf(stderr, "warning: %s was not closed properly; Windows may replay its logs over changes\n",
+                     qPrintable(file_.fileName()));
+    file_.seek(0);
+}
+
+void RegHive::load() {
+    *io_ = {static_cast<QIODevice*>(&file_), seek_device, read_device, write_device};
+    root_handle_ = ROpenHive(io_.get());
+    if (root_handle_ == nullptr)
+        throw std::runtime_error("Cannot load hive");
+}
+
+RegistryKey* RegHive::key_handle(const RegKey* key) {
+    const QMutexLocker locker(&cache_mutex_);
+    if (key == root_.get())
+        return root_handle_;
+    if (const KeyHandleHolder* holder = handle_cache_.object(key))
+        return holder->handle();
+    return open_child_handle(key, static_cast<const RegKey*>(key->parent()), key->child_number());
+}
+
+RegistryKey* RegHive::open_child_handle(const RegKey* key, const RegKey* parent, int index) {
+    const QMutexLocker locker(&cache_mutex_);
+    RegistryKey* parent_handle = key_handle(parent);
+    RegistryKey* handle = nullptr;
+    {
+        const QMutexLocker api(&api_mutex_);
+        if (index < 0 || ROpenSubKey(parent_handle, static_cast<uint32_t>(index), &handle) != R_SUCCESS)
+            throw std::runtime_error("ROpenSubKey failed");
+    }
+    handle_cache_.insert(key, new KeyHandleHolder(this, handle), 1);
+    return handle;
+}
+
+void RegHive::clear_handle_cache() {
+    const QMutexLocker locker(&cache_mutex_);
+    handle_cache_.clear();
+}
+
+void RegHive::forget_handle(const RegKey* key) {
+    const QMutexLocker locker(&cache_mutex_);
+    handle_cache_.remove(key);
+}

@@ -1,0 +1,89 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// One hive file, opened for editing: file, engine, locks, root key and the cache of key handles.
+#pragma once
+
+#include <QCache>
+#include <QFile>
+#include <QRecursiveMutex>
+#include <QString>
+
+#include <memory>
+
+class AbstractRegKey;
+class RegHive;
+class RegKey;
+struct RegistryIo;
+struct RegistryKey;
+
+// Owns one engine handle; closes it under the hive's lock.
+class KeyHandleHolder {
+public:
+    KeyHandleHolder(RegHive* hive, RegistryKey* handle) : hive_(hive), handle_(handle) {}
+    ~KeyHandleHolder();
+    KeyHandleHolder(const KeyHandleHolder&) = delete;
+    KeyHandleHolder& operator=(const KeyHandleHolder&) = delete;
+
+    RegistryKey* handle() const { return handle_; }
+
+private:
+    RegHive* hive_;
+    RegistryKey* handle_;
+};
+
+// A hive exists only fully opened. The lock order is cache_mutex before api_mutex; both are recursive, since looking up
+// a handle goes up from key to key.
+class RegHive {
+public:
+    // Opens the file and loads the hive; its root key hangs below parent, which it is not appended to.
+    // std::runtime_error("Cannot open file"): missing, no regular file, no permission, locked, or open here already.
+    // std::runtime_error("Cannot load hive"): no hive that can be relied on.
+    RegHive(const QString& name, const QString& path, AbstractRegKey* parent);
+    virtual ~RegHive();
+    RegHive(const RegHive&) = delete;
+    RegHive& operator=(const RegHive&) = delete;
+
+    RegKey* root_key() const { return root_.get(); }
+    QString name() const { return name_; }
+    // Bytes of the hive file.
+    qint64 file_size() const { return file_.size(); }
+
+    // The engine handle of a key of this hive; opened and cached when it is not there. Valid only while the caller holds
+    // both locks, see Dialogue. std::runtime_error("ROpenSubKey failed").
+    RegistryKey* key_handle(const RegKey* key);
+    // The same for a key that its parent does not list yet.
+    RegistryKey* open_child_handle(const RegKey* key, const RegKey* parent, int index);
+    void clear_handle_cache();
+    // Takes one key's handle out of the cache, when the key object goes.
+    void forget_handle(const RegKey* key);
+    int cached_handles() const { return static_cast<int>(handle_cache_.count()); }
+
+    // Both locks, in their order, for the whole of one operation: no handle is evicted while it is in use.
+    class Dialogue {
+    public:
+        explicit Dialogue(RegHive* hive);
+        ~Dialogue();
+        Dialogue(const Dialogue&) = delete;
+        Dialogue& operator=(const Dialogue&) = delete;
+
+    private:
+        RegHive* hive_;
+    };
+
+    QRecursiveMutex* api_mutex() { return &api_mutex_; }
+
+private:
+    void open_file();
+    void load();
+    void warn_if_dirty();
+
+    QString name_;
+    QFile file_;
+    QRecursiveMutex api_mutex_;    // around every call into the engine for this hive
+    QRecursiveMutex cache_mutex_;  // around every use of handle_cache_
+    QCache<const RegKey*, KeyHandleHolder> handle_cache_;
+    std::unique_ptr<RegistryIo> io_;
+    std::unique_ptr<RegKey> root_;
+    RegistryKey* root_handle_ = nullptr;
+};

@@ -1,0 +1,264 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "reg_key.h"
+
+#include "reg_hive.h"
+#include "stored_text.h"
+
+#include <QMutexLocker>
+
+#include <tallowfen/registry.h>
+
+#include <algorithm>
+#include <array>
+#include <cstdio>
+#include <stdexcept>
+
+namespace {
+
+constexpr int longest_key_name = 255;  // characters, as Windows has it
+
+// One byte more than the engine is told of, preset to zero: a name that fills the buffer comes without a terminator.
+using NameBuffer = std::array<char, 513>;
+constexpr uint32_t name_room = NameBuffer().size() - 1;
+
+int32_t subkey_name(RegistryKey* handle, uint32_t index, NameBuffer& name) {
+    name.fill('\0');
+    uint32_t size = name_room;
+    return REnumKeyInfoA(handle, index, name.data(), &size, nullptr, nullptr, nullptr, nullptr);
+}
+
+// The position that the engine's own look-up finds a name at, -1 when it finds none.
+int position_by_path(RegistryKey* handle, const char* name) {
+    RegistryKey* found = nullptr;
+    uint32_t position = 0;
+    const int32_t status = ROpenKeyEx(handle, name, &found, &position);
+    if (found != nullptr)
+        RCloseKey(found);
+    return status == R_SUCCESS ? static_cast<int>(position) : -1;
+}
+
+}  // namespace
+
+AbstractRegKey::~AbstractRegKey() = default;
+
+AbstractRegKey* AbstractRegKey::child(int i) { return children_[static_cast<size_t>(i)]; }
+
+int AbstractRegKey::child_count() const {
+    const QMutexLocker locker(children_lock());
+    return static_cast<int>(children_.size());
+}
+
+int AbstractRegKey::child_number() const {
+    if (parent_ == nullptr)
+        return 0;
+    const QMutexLocker locker(parent_->children_lock());
+    const auto& siblings = parent_->children_;
+    // Views ask for this over and over; a key with 50,000 siblings is not to be searched for each time.
+    if (number_hint_ < siblings.size() && siblings[number_hint_] == this)
+        return static_cast<int>(number_hint_);
+    const auto found = std::find(siblings.begin(), siblings.end(), this);
+    if (found == siblings.end())
+        return -1;
+    number_hint_ = static_cast<size_t>(found - siblings.begin());
+    return static_cast<int>(number_hint_);
+}
+
+void AbstractRegKey::add_child(AbstractRegKey* key) {
+    const QMutexLocker locker(children_lock());
+    children_.push_back(key);
+}
+
+RegKey::RegKey(RegHive* hive, AbstractRegKey* parent) : AbstractRegKey(parent), hive_(hive) {}
+
+RegKey::RegKey(RegHive* hive, AbstractRegKey* parent, int child_number) : AbstractRegKey(parent), hive_(hive) {
+    if (parent == nullptr)
+        throw std::invalid_argument("parent");
+    if (child_number < 0)
+        throw std::invalid_argument("child_number");
+    const RegHive::Dialogue dialogue(hive_);
+    try {
+        refresh_children(hive_->open_child_handle(this, static_cast<RegKey*>(parent), child_number));
+    } catch (...) {
+        // The destructor will not run, and the cache must not know an object that never was.
+        hive_->forget_handle(this);
+        throw;
+    }
+}
+
+RegKey::~RegKey() {
+    for (AbstractRegKey* child : children_)
+        delete child;
+    hive_->forget_handle(this);
+}
+
+QRecursiveMutex* RegKey::children_lock() const { return hive_->api_mutex(); }
+
+AbstractRegKey* RegKey::child(int i) {
+    const RegHive::Dialogue dialogue(hive_);
+    if (static_cast<size_t>(i) >= children_.size() || i < 0)
+        throw std::out_of_range("vector::_M_range_check");
+    AbstractRegKey*& slot = children_[static_cast<size_t>(i)];
+    if (slot == nullptr) {
+        auto made = std::make_unique<RegKey>(hive_, this, i);
+        made->number_hint(static_cast<size_t>(i));
+        slot = made.release();
+    }
+    return slot;
+}
+
+QString RegKey::name() {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    std::array<uint16_t, 512> buffer;
+    auto size = static_cast<uint32_t>(sizeof buffer);
+    if (RQueryInfoKeyW(handle, buffer.data(), &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                       nullptr, nullptr, nullptr) != R_SUCCESS)
+        throw std::runtime_error("RQueryInfoKeyW failed");
+    if (size == 0 && this != hive_->root_key()) {
+        // The engine names no key that is a symbolic link; its parent's list does, and a row needs a name.
+        NameBuffer listed;
+        RegistryKey* parent = hive_->key_handle(static_cast<RegKey*>(parent_));
+        if (subkey_name(parent, static_cast<uint32_t>(child_number()), listed) == R_SUCCESS)
+            return QString::fromLatin1(listed.data());
+    }
+    return QString(reinterpret_cast<const QChar*>(buffer.data()), static_cast<qsizetype>(size / 2));
+}
+
+void RegKey::refresh_children(RegistryKey* handle) {
+    uint32_t count = 0;
+    if (RQueryInfoKeyW(handle, nullptr, nullptr, nullptr, nullptr, &count, nullptr, nullptr, nullptr, nullptr, nullptr,
+                       nullptr, nullptr) != R_SUCCESS)
+        throw std::runtime_error("RQueryInfoKeyW failed");
+    children_.resize(count, nullptr);
+}
+
+void RegKey::reload() {
+    const RegHive::Dialogue dialogue(hive_);
+    refresh_children(hive_->key_handle(this));
+}
+
+int RegKey::value_count() {
+    const RegHive::Dialogue dialogue(hive_);
+    uint32_t count = 0;
+    if (RQueryInfoKeyW(hive_->key_handle(this), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, &count,
+                       nullptr, nullptr, nullptr, nullptr) != R_SUCCESS)
+        throw std::runtime_error("RQueryInfoKeyW failed");
+    const auto values = static_cast<int32_t>(count);
+    if (values < 0) {
+        char text[64];
+        // The text has always said keys, though it counts values; whoever looks for it looks for that.
+        std::snprintf(text, sizeof text, "RQueryInfoKeyW claimed there are %li keys", static_cast<long>(values));
+        throw std::runtime_error(text);
+    }
+    return values;
+}
+
+bool RegKey::has_default_value() {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    std::array<uint16_t, 512> name;
+    for (uint32_t i = 0;; i++) {
+        auto size = static_cast<uint32_t>(sizeof name);
+        const int32_t status = REnumValueW(handle, i, name.data(), &size, nullptr, nullptr, nullptr);
+        if (status == R_NO_MORE_ITEMS)
+            return false;
+        if (size == 0)
+            return true;
+    }
+}
+
+int RegKey::find_child_position(RegistryKey* handle, const QByteArray& name) {
+    int result = -2;
+    size_t low = 0;
+    // The number of slots, not one less: a key that was just made has no slot yet.
+    size_t high = children_.size();
+    while (low <= high) {
+        const size_t middle = low + (high - low) / 2;
+        NameBuffer listed;
+        if (subkey_name(handle, static_cast<uint32_t>(middle), listed) != R_SUCCESS) {
+            result = -1;
+            break;
+        }
+        const int order = qstricmp(name.constData(), listed.data());
+        if (order == 0)
+            return static_cast<int>(middle);
+        if (order > 0)
+            low = middle + 1;
+        else if (middle == 0)
+            break;
+        else
+            high = middle - 1;
+    }
+    // Lists are in upper-cased order, which this search is not quite in; the engine finds what is there.
+    const int position = position_by_path(handle, name.constData());
+    return position >= 0 ? position : result;
+}
+
+int RegKey::new_key() {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    char name[32];
+    for (int i = 1;; i++) {
+        std::snprintf(name, sizeof name, "New Key #%i", i);
+        RegistryKey* made = nullptr;
+        uint32_t existed = 1;
+        if (RCreateKey(handle, name, &made, &existed) != R_SUCCESS)
+            return -1;
+        RCloseKey(made);
+        if (existed == 0)
+            break;
+    }
+    const int position = find_child_position(handle, name);
+    if (position < 0)
+        return position;
+    const auto slot = static_cast<size_t>(position);
+    children_.insert(children_.begin() + position, nullptr);
+    auto child = std::make_unique<RegKey>(hive_, this, position);
+    child->number_hint(slot);
+    children_[slot] = child.release();
+    return position;
+}
+
+bool RegKey::delete_key(int index) {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    NameBuffer name = {};
+    uint32_t size = name_room;
+    // Only the key at this position is meant: a name that leads to another one deletes nothing.
+    if (index < 0 ||
+        REnumKeyExA(handle, static_cast<uint32_t>(index), name.data(), &size, nullptr, nullptr, nullptr) !=
+            R_SUCCESS ||
+        position_by_path(handle, name.data()) != index || RDeleteKey(handle, name.data()) != R_SUCCESS)
+        return false;
+    const auto slot = children_.begin() + index;
+    const std::unique_ptr<AbstractRegKey> gone(*slot);
+    children_.erase(slot);
+    return true;
+}
+
+bool RegKey::can_delete_tree(int index) {
+    const RegHive::Dialogue dialogue(hive_);
+    return index >= 0 && RCheckDeleteTree(hive_->key_handle(this), static_cast<uint32_t>(index)) == R_SUCCESS;
+}
+
+int RegKey::rename_key(int index, const QString& new_name) {
+    if (new_name.size() > longest_key_name)
+        return -3;
+    const StoredText name = stored_text(new_name);
+    if (!name.fits || name.bytes.isEmpty() || name.bytes.contains('\\') || index < 0)
+        return -1;
+    const RegHive::Dialogue dialogue(hive_);
+    // The key gets another record and the list another order: handles from before are of no use.
+    hive_->clear_handle_cache();
+    RegistryKey* handle = hive_->key_handle(this);
+    if (RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
+        return -1;
+    const int position = find_child_position(handle, name.bytes);
+    if (position < 0)
+        return -2;
+    AbstractRegKey* renamed = children_[static_cast<size_t>(index)];
+    children_.erase(children_.begin() + index);
+    children_.insert(children_.begin() + position, renamed);
+    return position;
+}

@@ -1,0 +1,251 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// The values of a key: stored bytes to toolkit values and back.
+#include "reg_hive.h"
+#include "reg_key.h"
+#include "stored_text.h"
+
+#include <QtEndian>
+
+#include <tallowfen/registry.h>
+
+#include <array>
+#include <cstdio>
+#include <cstring>
+#include <stdexcept>
+
+namespace {
+
+constexpr int longest_value_name = 16383;  // characters, as Windows has it
+
+struct EnumeratedName {
+    QString name;
+    uint32_t type;
+    uint32_t data_size;  // bytes, as stored
+};
+
+EnumeratedName enumerate_name(RegistryKey* handle, int index) {
+    QByteArray buffer(256, '\0');
+    uint32_t size = 256;
+    EnumeratedName found = {};
+    const auto ask = [&] {
+        return REnumValueW(handle, static_cast<uint32_t>(index), reinterpret_cast<uint16_t*>(buffer.data()), &size,
+                           &found.type, nullptr, &found.data_size);
+    };
+    int32_t status = index < 0 ? int32_t{R_NO_MORE_ITEMS} : ask();
+    if (status == R_BUFFER_OVERFLOW) {
+        size *= 2;
+        buffer.resize(static_cast<qsizetype>(size));
+        status = ask();
+    }
+    if (status != R_SUCCESS)
+        throw std::invalid_argument("index");
+    found.name = QString(reinterpret_cast<const QChar*>(buffer.constData()), static_cast<qsizetype>(size / 2));
+    return found;
+}
+
+// The data as stored. false when it cannot be read, or is said to be longer than the file.
+bool read_bytes(RegHive* hive, RegistryKey* handle, int index, uint32_t size, QByteArray& bytes) {
+    if (size > hive->file_size())
+        return false;
+    bytes.resize(static_cast<qsizetype>(size));
+    char nothing = 0;
+    void* buffer = size > 0 ? bytes.data() : &nothing;
+    return REnumValueW(handle, static_cast<uint32_t>(index), nullptr, nullptr, nullptr, buffer, &size) == R_SUCCESS;
+}
+
+// A number of at most sizeof(T) bytes; missing ones read as zero.
+template <typename T>
+bool read_number(RegistryKey* handle, int index, T& number) {
+    uint32_t size = sizeof number;
+    std::array<uchar, sizeof number> bytes = {};
+    if (REnumValueW(handle, static_cast<uint32_t>(index), nullptr, nullptr, nullptr, bytes.data(), &size) !=
+        R_SUCCESS)
+        return false;
+    number = qFromLittleEndian<T>(bytes.data());
+    return true;
+}
+
+QString decode(const QByteArray& bytes, qsizetype from, qsizetype units) {
+    QString text(units, Qt::Uninitialized);
+    for (qsizetype i = 0; i < units; i++)
+        text[i] = QChar(qFromLittleEndian<quint16>(bytes.constData() + from + 2 * i));
+    return text;
+}
+
+// How many units from a byte on stand before the next zero unit or the end; an odd last byte is no character.
+qsizetype units_to_zero(const QByteArray& bytes, qsizetype from) {
+    qsizetype units = 0;
+    while (from + 2 * units + 1 < bytes.size() &&
+           (bytes[from + 2 * units] != '\0' || bytes[from + 2 * units + 1] != '\0'))
+        units++;
+    return units;
+}
+
+QStringList split_multi_string(const QByteArray& bytes) {
+    QStringList list;
+    for (qsizetype from = 0; bytes.size() - from > 1;) {
+        const qsizetype units = units_to_zero(bytes, from);
+        list.append(decode(bytes, from, units));
+        from += 2 * units + 2;
+    }
+    if (!list.isEmpty() && list.last().isEmpty())
+        list.removeLast();
+    return list;
+}
+
+// UTF-16 as it is stored, with a zero unit behind it.
+QByteArray encode(const QString& text) {
+    QByteArray bytes(text.size() * 2 + 2, '\0');
+    for (qsizetype i = 0; i < text.size(); i++)
+        qToLittleEndian(text[i].unicode(), bytes.data() + 2 * i);
+    return bytes;
+}
+
+bool is_text(uint type) { return type == REG_SZ || type == REG_EXPAND_SZ || type == REG_LINK; }
+
+// The 8-bit name that leads to the value at an index and to no other; null when none does.
+QByteArray name_leading_to(RegistryKey* handle, int index) {
+    QByteArray name(513, '\0');
+    uint32_t size = 512;
+    const auto position = static_cast<uint32_t>(index);
+    if (REnumValueA(handle, position, name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS)
+        return QByteArray();
+    if (size > 511) {
+        name = QByteArray(static_cast<qsizetype>(size) + 2, '\0');
+        size++;
+        if (REnumValueA(handle, position, name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS)
+            return QByteArray();
+    }
+    if (RFindValueA(handle, name.constData()) == index)
+        return QByteArray(name.constData());
+    // A name that is stored in UTF-16, though 8 bits could carry it.
+    const StoredText text = stored_text(enumerate_name(handle, index).name);
+    return text.fits && RFindValueA(handle, text.bytes.constData()) == index ? text.bytes : QByteArray();
+}
+
+}  // namespace
+
+RegValue RegKey::read_value_name(int index) {
+    const RegHive::Dialogue dialogue(hive_);
+    const EnumeratedName found = enumerate_name(hive_->key_handle(this), index);
+    RegValue value;
+    value.name = found.name;
+    value.type = found.type;
+    return value;
+}
+
+std::unique_ptr<RegValue> RegKey::read_value(int index) {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    const EnumeratedName found = enumerate_name(handle, index);
+    if (found.type == REG_DWORD || found.type == REG_DWORD_BIG_ENDIAN) {
+        uint number = 0;
+        if (!read_number(handle, index, number))
+            return nullptr;
+        if (found.type == REG_DWORD)
+            return std::make_unique<RegValue>(found.name, number, little_endian_order);
+        return std::make_unique<RegValue>(found.name, qbswap(number), big_endian_order);
+    }
+    if (found.type == REG_QWORD) {
+        qulonglong number = 0;
+        if (!read_number(handle, index, number))
+            return nullptr;
+        return std::make_unique<RegValue>(found.name, number);
+    }
+    QByteArray bytes;
+    if (!read_bytes(hive_, handle, index, found.data_size, bytes))
+        return nullptr;
+    if (is_text(found.type))
+        return std::make_unique<RegValue>(found.name, decode(bytes, 0, units_to_zero(bytes, 0)), found.type);
+    if (found.type == REG_MULTI_SZ)
+        return std::make_unique<RegValue>(found.name, split_multi_string(bytes));
+    return std::make_unique<RegValue>(found.name, bytes, found.type);
+}
+
+bool RegKey::store_value(const QString& name, uint type, const QByteArray& data, int index) {
+    const StoredText stored = stored_text(name);
+    if (!stored.fits || stored.bytes.size() > longest_value_name)
+        return false;
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    // Only the value at the index is meant: a name that leads to another one writes nothing.
+    if (index != any_value && RFindValueA(handle, stored.bytes.constData()) != index)
+        return false;
+    return RSetValueExW(handle, stored.bytes.constData(), type, data.constData(),
+                        static_cast<uint32_t>(data.size())) == R_SUCCESS;
+}
+
+bool RegKey::set_string_value(const QString& name, const QString& text, uint type, int index) {
+    return store_value(name, type, encode(text), index);
+}
+
+bool RegKey::set_binary_value(const QString& name, const QByteArray& bytes, uint type, int index) {
+    return store_value(name, type, bytes, index);
+}
+
+bool RegKey::set_dword_value(const QString& name, uint value, int order, int index) {
+    const bool swapped = order == big_endian_order;
+    QByteArray bytes(4, '\0');
+    qToLittleEndian(swapped ? qbswap(value) : value, bytes.data());
+    return store_value(name, swapped ? REG_DWORD_BIG_ENDIAN : REG_DWORD, bytes, index);
+}
+
+bool RegKey::set_qword_value(const QString& name, qulonglong value, int index) {
+    QByteArray bytes(8, '\0');
+    qToLittleEndian(value, bytes.data());
+    return store_value(name, REG_QWORD, bytes, index);
+}
+
+bool RegKey::set_multi_string_value(const QString& name, const QStringList& list, int index) {
+    QStringList kept = list;
+    kept.removeAll(QString());  // an empty string would read as the list's end
+    return store_value(name, REG_MULTI_SZ, encode(kept.join(QChar(u'\0')) + QChar(u'\0')), index);
+}
+
+bool RegKey::delete_value(int index) {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    if (index < 0)
+        return false;
+    const QByteArray name = name_leading_to(handle, index);
+    return !name.isNull() && RDeleteValue(handle, name.constData()) == R_SUCCESS;
+}
+
+bool RegKey::can_delete_value(int index) {
+    const RegHive::Dialogue dialogue(hive_);
+    return index >= 0 && !name_leading_to(hive_->key_handle(this), index).isNull();
+}
+
+// The engine has no rename of values: the value is stored again under the new name, which puts it at the end of the
+// list, so that the old index still means the old value, which is then deleted.
+bool RegKey::rename_value(int index, const QString& new_name) {
+    const StoredText stored = stored_text(new_name);
+    if (new_name.size() > longest_value_name || new_name.isEmpty() || !stored.fits || index < 0)
+        return false;
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    if (RQueryValueExA(handle, stored.bytes.constData(), nullptr, nullptr, nullptr) != R_FILE_NOT_FOUND ||
+        name_leading_to(handle, index).isNull() || read_value(index) == nullptr)
+        return false;
+    // The bytes go over as they are stored: a record cannot carry text behind a zero, an odd size or a short number.
+    const EnumeratedName old = enumerate_name(handle, index);
+    QByteArray bytes;
+    return read_bytes(hive_, handle, index, old.data_size, bytes) &&
+           store_value(new_name, old.type, bytes, any_value) && delete_value(index);
+}
+
+QString RegKey::new_value_name() {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    for (int i = 1;; i++) {
+        char name[64];
+        std::snprintf(name, sizeof name, "New Value #%i", i);
+        const int32_t status = RQueryValueExA(handle, name, nullptr, nullptr, nullptr);
+        if (status == R_FILE_NOT_FOUND)
+            return QString::fromLatin1(name);
+        if (status != R_SUCCESS)
+            return QString();
+    }
+}

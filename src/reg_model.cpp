@@ -1,0 +1,204 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "reg_model.h"
+
+#include "reg_hive.h"
+#include "reg_key.h"
+
+#include <QIcon>
+#include <QStringList>
+
+#include <algorithm>
+#include <stdexcept>
+
+namespace {
+
+constexpr int editable_ancestors = 3;
+
+QStringList split_mount_name(const QString& name) { return name.split(QLatin1Char('/'), Qt::SkipEmptyParts); }
+
+}  // namespace
+
+RegModel::RegModel(QObject* parent) : QAbstractItemModel(parent) {}
+
+// The hives go before the groups that their root keys hang below.
+RegModel::~RegModel() {
+    for (auto& hive : hives_)
+        hive.reset();
+    top_level_.clear();
+}
+
+bool RegModel::is_mount_name(const QString& name) { return split_mount_name(name).size() >= 2; }
+
+void RegModel::add_hive(const QString& name, const QString& file) {
+    const QStringList parts = split_mount_name(name);
+    if (parts.size() < 2)
+        throw std::out_of_range("a mount name has the form TOP/HIVE");
+    const auto found = std::find_if(top_level_.begin(), top_level_.end(),
+                                    [&](const auto& key) { return key->name() == parts[0]; });
+    AbstractRegKey* top = found != top_level_.end() ? found->get() : nullptr;
+    if (top == nullptr) {
+        top_level_.push_back(std::make_unique<DummyRegKey>(parts[0]));
+        top = top_level_.back().get();
+    }
+    hives_.push_back(std::make_unique<RegHive>(parts[1], file, top));
+    top->add_child(hives_.back()->root_key());
+}
+
+AbstractRegKey* RegModel::key_of(const QModelIndex& index) {
+    return static_cast<AbstractRegKey*>(index.internalPointer());
+}
+
+int RegModel::row_of(const AbstractRegKey* key) const {
+    if (key->parent() != nullptr)
+        return key->child_number();
+    const auto found = std::find_if(top_level_.begin(), top_level_.end(),
+                                    [&](const auto& top) { return top.get() == key; });
+    return static_cast<int>(found - top_level_.begin());
+}
+
+QModelIndex RegModel::index_of(AbstractRegKey* key) const { return createIndex(row_of(key), 0, key); }
+
+QModelIndex RegModel::index(int row, int column, const QModelIndex& parent) const {
+    if (!hasIndex(row, column, parent))
+        return QModelIndex();
+    AbstractRegKey* const key =
+        parent.isValid() ? key_of(parent)->child(row) : top_level_[static_cast<size_t>(row)].get();
+    return key != nullptr ? createIndex(row, column, key) : QModelIndex();
+}
+
+QModelIndex RegModel::parent(const QModelIndex& index) const {
+    AbstractRegKey* const up = index.isValid() ? key_of(index)->parent() : nullptr;
+    return up != nullptr ? index_of(up) : QModelIndex();
+}
+
+int RegModel::rowCount(const QModelIndex& parent) const {
+    if (parent.column() > 0)
+        return 0;
+    return parent.isValid() ? key_of(parent)->child_count() : static_cast<int>(top_level_.size());
+}
+
+int RegModel::columnCount(const QModelIndex&) const { return 1; }
+
+QVariant RegModel::data(const QModelIndex& index, int role) const {
+    if (!index.isValid())
+        return QVariant();
+    if (role == Qt::DecorationRole)
+        return QIcon::fromTheme(QStringLiteral("folder"), QIcon());
+    if (role != Qt::DisplayRole && role != Qt::EditRole)
+        return QVariant();
+    AbstractRegKey* const key = key_of(index);
+    const bool is_hive_root = key->parent() != nullptr && key->parent()->parent() == nullptr;
+    if (is_hive_root) {
+        for (const auto& hive : hives_) {
+            if (hive->root_key() == key)
+                return hive->name();
+        }
+    }
+    return key->name();
+}
+
+int RegModel::key_depth(const QModelIndex& index) const {
+    int depth = 0;
+    for (QModelIndex up = index.parent(); up.isValid() && depth < editable_ancestors; up = up.parent())
+        depth++;
+    return depth;
+}
+
+Qt::ItemFlags RegModel::flags(const QModelIndex& index) const {
+    if (!index.isValid())
+        return Qt::NoItemFlags;
+    const Qt::ItemFlags flags = Qt::ItemIsSelectable | Qt::ItemIsEnabled;
+    return key_depth(index) >= editable_ancestors ? flags | Qt::ItemIsEditable : flags;
+}
+
+RegKey* RegModel::editable_key(const QModelIndex& index) {
+    // Everything below a group is a hive's key.
+    return index.parent().parent().isValid() ? static_cast<RegKey*>(key_of(index)) : nullptr;
+}
+
+bool RegModel::setData(const QModelIndex& index, const QVariant& value, int) {
+    const QModelIndex parent = index.parent();
+    RegKey* const key = editable_key(parent);
+    if (key == nullptr)
+        return false;
+    const int row = key->rename_key(index.row(), value.toString());
+    if (row < 0)
+        return false;
+    if (row == index.row()) {
+        emit dataChanged(index, index);
+        return true;
+    }
+    // Announced without layoutAboutToBeChanged and ahead of the index's move: the tree sits directly on this model, and
+    // what listens has come to rely on this order.
+    emit layoutChanged();
+    move_persistent_indexes(index, this->index(row, 0, parent));
+    renumber_frames();
+    return true;
+}
+
+// The renamed key's index first, then those of the siblings that it passed: a view would follow them to other keys.
+void RegModel::move_persistent_indexes(const QModelIndex& renamed, const QModelIndex& moved) {
+    const QModelIndexList persistent = persistentIndexList();
+    changePersistentIndex(renamed, moved);
+    for (const QModelIndex& old : persistent) {
+        AbstractRegKey* const key = key_of(old);
+        if (key == key_of(moved) || key->parent() != key_of(moved)->parent())
+            continue;
+        const QModelIndex now = index_of(key);
+        if (now.row() != old.row())
+            changePersistentIndex(old, now);
+    }
+}
+
+int RegModel::new_key(const QModelIndex& parent) {
+    if (!parent.isValid())
+        return -1;
+    RegKey* const key = editable_key(parent);
+    if (key == nullptr)
+        return -2;
+    const int row = key->new_key();
+    if (row < 0)
+        return -3;
+    beginInsertRows(parent, row, row);
+    endInsertRows();
+    renumber_frames();
+    return row;
+}
+
+bool RegModel::removeRows(int row, int count, const QModelIndex& parent) {
+    RegKey* const key = parent.isValid() ? editable_key(parent) : nullptr;
+    if (key == nullptr || count != 1 || row < 0 || row >= key->child_count())
+        return false;
+    // A refusal half-way would leave a branch without its leaves, so the engine is asked about all of it first.
+    if (!key->can_delete_tree(row))
+        return false;
+    return remove_key(row, parent);
+}
+
+bool RegModel::remove_key(int row, const QModelIndex& parent) {
+    RegKey* const key = editable_key(parent);
+    // Found before the signals, since what cannot be opened throws.
+    const QModelIndex child = index(row, 0, parent);
+    forget_frames_below(key_of(child));
+    beginRemoveRows(parent, row, row);
+    bool removed = true;
+    try {
+        for (int i = rowCount(child) - 1; i >= 0 && removed; i--)
+            removed = remove_key(i, child);
+        removed = removed && key->delete_key(row);
+    } catch (...) {
+        endRemoveRows();
+        beginInsertRows(parent, row, row);
+        endInsertRows();
+        throw;
+    }
+    endRemoveRows();
+    if (!removed) {
+        // Still there, so whoever heard that it went hears that it came back.
+        beginInsertRows(parent, row, row);
+        endInsertRows();
+    }
+    renumber_frames();
+    return removed;
+}

@@ -1,0 +1,96 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// The key tree as an item model, and the search over it. Owns the hives and the groups above them.
+#pragma once
+
+#include <QAbstractItemModel>
+#include <QMutex>
+
+#include <memory>
+#include <vector>
+
+class AbstractRegKey;
+class RegHive;
+class RegKey;
+
+// Every index carries its key object as internal pointer, in column 0. Depths are fixed: groups, hive roots below them,
+// keys below those. Keys are renamed and deleted from depth 4 on, and get new subkeys and show values from depth 3 on.
+class RegModel : public QAbstractItemModel {
+    Q_OBJECT
+
+public:
+    enum FindModeFlag {
+        FindKeys = 1,    // compare key names
+        FindValues = 2,  // compare value names
+    };
+    Q_DECLARE_FLAGS(FindMode, FindModeFlag)
+
+    struct FindResult {
+        QModelIndex key;     // invalid: the walk ended or was stopped without a hit
+        int value_row = -1;  // row in the sorted table of the key's values; -1 for a hit on the key itself
+    };
+
+    explicit RegModel(QObject* parent = nullptr);
+    ~RegModel() override;
+
+    // Mounts a hive under the group and name that "TOP/HIVE" gives. Before any view is attached: no signals.
+    // std::out_of_range for a name without two parts; the hive's own exceptions.
+    void add_hive(const QString& name, const QString& file);
+    // Whether add_hive can split the name.
+    static bool is_mount_name(const QString& name);
+
+    QModelIndex index(int row, int column, const QModelIndex& parent = QModelIndex()) const override;
+    QModelIndex parent(const QModelIndex& index) const override;
+    int rowCount(const QModelIndex& parent = QModelIndex()) const override;
+    int columnCount(const QModelIndex& parent = QModelIndex()) const override;
+    QVariant data(const QModelIndex& index, int role) const override;
+    // Renames a key. The role is not looked at.
+    bool setData(const QModelIndex& index, const QVariant& value, int role) override;
+    Qt::ItemFlags flags(const QModelIndex& index) const override;
+    // Deletes one key with all below it, leaves first.
+    bool removeRows(int row, int count, const QModelIndex& parent = QModelIndex()) override;
+    // Makes a subkey; returns its row. -1: no parent; -2: not under this one; -3: refused.
+    int new_key(const QModelIndex& parent);
+
+    // The key behind an index at depth 3 or more, else null.
+    static RegKey* editable_key(const QModelIndex& index);
+
+    // Begins a search at a key: its subtree and its later siblings with theirs.
+    void begin_find(const QModelIndex& start);
+    // Makes a running find return early. From any thread.
+    void stop_find();
+    // Walks on to the next hit. From a worker thread, while nothing changes the tree.
+    FindResult find(const QVariant& term, RegModel::FindMode mode, Qt::MatchFlags flags);
+
+private:
+    // A place of the search still to be visited: a key (value -1), or one row of a key's shown values.
+    struct Frame {
+        QModelIndex key;
+        int value;
+    };
+
+    static AbstractRegKey* key_of(const QModelIndex& index);
+    QModelIndex index_of(AbstractRegKey* key) const;
+    int row_of(const AbstractRegKey* key) const;
+    int key_depth(const QModelIndex& index) const;
+    bool remove_key(int row, const QModelIndex& parent);
+    void move_persistent_indexes(const QModelIndex& renamed, const QModelIndex& moved);
+
+    void push_key_frames(const Frame& frame, FindMode mode);
+    bool is_stopped();
+    void forget_frames_below(const AbstractRegKey* key);
+    void renumber_frames();
+
+    std::vector<std::unique_ptr<AbstractRegKey>> top_level_;
+    std::vector<std::unique_ptr<RegHive>> hives_;
+    std::vector<Frame> search_;  // the last one is visited next
+    QMutex mutex_;               // guards stop_ alone
+    bool stop_ = false;
+    // Keys that the search may still go down to. A damaged hive can list a key more often than the file has room for
+    // keys; what the files' sizes allow bounds the walk.
+    qint64 keys_left_ = 0;
+};
+
+Q_DECLARE_OPERATORS_FOR_FLAGS(RegModel::FindMode)
+Q_DECLARE_METATYPE(RegModel::FindResult)

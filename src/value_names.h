@@ -1,0 +1,19 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// The order in which the values of a key are shown: the unnamed one first, then by name, case ignored.
+#pragma once
+
+#include <QString>
+
+#include <vector>
+
+class RegKey;
+
+// Source rows in the order of their shown names, default_name being the one that comes first. Names that differ only in
+// case keep no defined order among themselves, but the same names always come out the same.
+std::vector<int> rows_by_name(const std::vector<QString>& names, const QString& default_name);
+
+// The names of a key's values as the table shows them from row 0 on, with default_name for the unnamed value, whether
+// the key has one or the table makes one up.
+std::vector<QString> shown_value_names(RegKey& key, const QString& default_name);

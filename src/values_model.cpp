@@ -1,0 +1,201 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "values_model.h"
+
+#include "reg_key.h"
+
+#include <QIcon>
+
+namespace {
+
+constexpr int most_cached_rows = 100;
+
+}  // namespace
+
+ValuesModel::ValuesModel(RegKey* key, QObject* parent)
+    : QAbstractTableModel(parent), key_(key), cache_(most_cached_rows) {}
+
+QString ValuesModel::default_name() { return tr("(Default)"); }
+
+int ValuesModel::rowCount(const QModelIndex& parent) const {
+    return key_ == nullptr || parent.isValid() ? 0 : key_->value_count();
+}
+
+int ValuesModel::columnCount(const QModelIndex&) const { return ColumnCount; }
+
+QVariant ValuesModel::headerData(int section, Qt::Orientation, int role) const {
+    if (role != Qt::DisplayRole)
+        return QVariant();
+    switch (section) {
+    case NameColumn:
+        return tr("Name", "column title");
+    case TypeColumn:
+        return tr("Type", "column title");
+    case DataColumn:
+        return tr("Data", "column title");
+    default:
+        return QVariant();
+    }
+}
+
+Qt::ItemFlags ValuesModel::flags(const QModelIndex& index) const {
+    if (!index.isValid())
+        return Qt::NoItemFlags;
+    // Data is edited through dialogs, so only names can be selected and edited in place.
+    if (index.column() == NameColumn)
+        return Qt::ItemIsSelectable | Qt::ItemIsEditable | Qt::ItemIsEnabled;
+    return Qt::ItemIsEnabled;
+}
+
+const RegValue* ValuesModel::lookup(int row) const {
+    if (RegValue* cached = cache_.object(row))
+        return cached;
+    std::unique_ptr<RegValue> value = key_->read_value(row);
+    if (value == nullptr)
+        value = std::make_unique<RegValue>(key_->read_value_name(row));
+    RegValue* const kept = value.get();
+    cache_.insert(row, value.release(), 1);
+    return kept;
+}
+
+QVariant ValuesModel::data(const QModelIndex& index, int role) const {
+    if (!index.isValid() || key_ == nullptr)
+        return QVariant();
+    if (role == Qt::DisplayRole || role == Qt::EditRole) {
+        // A name needs no data read: a sort asks for every one.
+        if (index.column() == NameColumn) {
+            const RegValue* cached = cache_.object(index.row());
+            const QString name = cached != nullptr ? cached->name : key_->read_value_name(index.row()).name;
+            return name.isEmpty() ? default_name() : name;
+        }
+        const RegValue* value = lookup(index.row());
+        if (index.column() == DataColumn)
+            return value->data;
+        const QString type = type_name(value->type);
+        return type.isNull() ? QVariant() : QVariant(type);
+    }
+    if (role == Qt::DecorationRole && index.column() == NameColumn) {
+        const quint32 type = lookup(index.row())->type;
+        const bool text = type == REG_SZ || type == REG_EXPAND_SZ || type == REG_MULTI_SZ;
+        return QIcon(QStringLiteral(TALLOWFEN_SHARE_DIR) +
+                     (text ? QStringLiteral("type_string.ico") : QStringLiteral("type_binary.ico")));
+    }
+    return QVariant();
+}
+
+bool ValuesModel::setData(const QModelIndex& index, const QVariant& value, int) {
+    if (!index.isValid() || key_ == nullptr || index.row() >= rowCount())
+        return false;
+    if (index.column() == NameColumn) {
+        if (!value.canConvert<QString>() || !key_->rename_value(index.row(), value.toString()))
+            return false;
+        // A renamed value moves to the end of the list, and every row behind it moves up.
+        forget_from(index.row());
+        emit dataChanged(index, this->index(rowCount() - 1, NameColumn));
+        return true;
+    }
+    if (index.column() != DataColumn || !store(index.row(), value))
+        return false;
+    cache_.remove(index.row());
+    emit dataChanged(index, index);
+    return true;
+}
+
+bool ValuesModel::store(int row, const QVariant& value) {
+    const RegValue old = *lookup(row);
+    if (!old.data.isValid())
+        return false;
+    switch (old.type) {
+    case REG_SZ:
+    case REG_EXPAND_SZ:
+    case REG_LINK:
+        return key_->set_string_value(old.name, value.toString(), old.type, row);
+    case REG_DWORD:
+        return key_->set_dword_value(old.name, value.toUInt(), little_endian_order, row);
+    case REG_DWORD_BIG_ENDIAN:
+        return key_->set_dword_value(old.name, value.toUInt(), big_endian_order, row);
+    case REG_MULTI_SZ:
+        return key_->set_multi_string_value(old.name, value.toStringList(), row);
+    case REG_QWORD:
+        return key_->set_qword_value(old.name, value.toULongLong(), row);
+    case REG_NONE:
+    case REG_BINARY:
+    case REG_RESOURCE_LIST:
+    case REG_FULL_RESOURCE_DESCRIPTOR:
+    case REG_RESOURCE_REQUIREMENTS_LIST:
+        return key_->set_binary_value(old.name, value.toByteArray(), old.type, row);
+    default:
+        return false;
+    }
+}
+
+void ValuesModel::forget_from(int row) {
+    const QList<int> rows = cache_.keys();
+    for (const int cached : rows) {
+        if (cached >= row)
+            cache_.remove(cached);
+    }
+}
+
+bool ValuesModel::can_remove(int row) const {
+    return key_ != nullptr && row >= 0 && row < rowCount() && key_->can_delete_value(row);
+}
+
+bool ValuesModel::removeRows(int row, int count, const QModelIndex& parent) {
+    if (count != 1 || parent.isValid() || !can_remove(row))
+        return false;
+    beginRemoveRows(parent, row, row);
+    forget_from(row);
+    const bool removed = key_->delete_value(row);
+    endRemoveRows();
+    if (!removed) {
+        // The row is still there: whoever heard that it went hears that it came back.
+        beginInsertRows(parent, row, row);
+        endInsertRows();
+    }
+    return removed;
+}
+
+bool ValuesModel::add_value(int type) {
+    if (key_ == nullptr)
+        return false;
+    const int row = rowCount();
+    beginInsertRows(QModelIndex(), row, row);
+    const QString name = key_->new_value_name();
+    bool added = false;
+    if (!name.isNull()) {
+        switch (type) {
+        case REG_SZ:
+        case REG_EXPAND_SZ:
+        case REG_LINK:
+            added = key_->set_string_value(name, QString(), static_cast<uint>(type));
+            break;
+        case REG_BINARY:
+            added = key_->set_binary_value(name, QByteArray(), REG_BINARY);
+            break;
+        case REG_DWORD:
+            added = key_->set_dword_value(name, 0, little_endian_order);
+            break;
+        case REG_MULTI_SZ:
+            added = key_->set_multi_string_value(name, QStringList());
+            break;
+        case REG_QWORD:
+            added = key_->set_qword_value(name, 0);
+            break;
+        default:
+            break;
+        }
+    }
+    endInsertRows();
+    return added;
+}
+
+bool ValuesModel::add_default_value(const QString& data) {
+    if (key_ == nullptr)
+        return false;
+    const int row = rowCount();
+    beginInsertRows(QModelIndex(), row, row);
+    const bool added = key_->set_string_value(QString(), data, REG_SZ);
+    endInsertRows();
+    return added;
+}

@@ -1,0 +1,55 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// The values of one key as a table, in the order of the key's own list.
+#pragma once
+
+#include "reg_value.h"
+
+#include <QAbstractTableModel>
+#include <QCache>
+
+class RegKey;
+
+class ValuesModel : public QAbstractTableModel {
+    Q_OBJECT
+
+public:
+    enum Column { NameColumn, TypeColumn, DataColumn, ColumnCount };
+
+    // key may be null, which gives an empty table; it must outlive the model.
+    explicit ValuesModel(RegKey* key, QObject* parent = nullptr);
+
+    RegKey* key() const { return key_; }
+    // The text that stands for the unnamed value.
+    static QString default_name();
+
+    int rowCount(const QModelIndex& parent = QModelIndex()) const override;
+    int columnCount(const QModelIndex& parent = QModelIndex()) const override;
+    QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
+    Qt::ItemFlags flags(const QModelIndex& index) const override;
+    // The data column gives the value's QVariant as it is; the delegate makes the text. A value whose data cannot be
+    // read has an invalid variant there, and cannot be edited.
+    QVariant data(const QModelIndex& index, int role) const override;
+    // Column 0 renames, column 2 stores new data under the type that the value has. The role is not looked at.
+    bool setData(const QModelIndex& index, const QVariant& value, int role) override;
+    // One row at a time.
+    bool removeRows(int row, int count, const QModelIndex& parent = QModelIndex()) override;
+
+    // Whether removeRows could delete the row's value.
+    bool can_remove(int row) const;
+    // Makes a value with a generated name and empty data, at the end. The signals of an inserted row come also for a
+    // type that makes nothing; callers pass only the six types that can be made.
+    bool add_value(int type);
+    // Makes the unnamed value, as text.
+    bool add_default_value(const QString& data);
+
+private:
+    const RegValue* lookup(int row) const;
+    bool store(int row, const QVariant& value);
+    void forget_from(int row);
+
+    RegKey* key_;
+    // The rows used last. A value whose data cannot be read stands here with an invalid variant.
+    mutable QCache<int, RegValue> cache_;
+};

@@ -1,0 +1,247 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "values_proxy_model.h"
+
+#include "reg_key.h"
+#include "value_names.h"
+#include "values_model.h"
+
+#include <QIcon>
+
+#include <algorithm>
+
+ValuesProxyModel::ValuesProxyModel() : default_name_(tr("(Default)")) {}
+
+RegKey* ValuesProxyModel::key() const {
+    const auto* values = qobject_cast<const ValuesModel*>(sourceModel());
+    return values != nullptr ? values->key() : nullptr;
+}
+
+bool ValuesProxyModel::has_key() const { return key() != nullptr; }
+
+// Asked of the key after each change: what happened to a row does not say whether an unnamed value is left.
+void ValuesProxyModel::ask_for_default() {
+    RegKey* const shown = key();
+    synthetic_default_ = shown != nullptr && !shown->has_default_value();
+}
+
+void ValuesProxyModel::setSourceModel(QAbstractItemModel* source) {
+    beginResetModel();
+    if (sourceModel() != nullptr)
+        disconnect(sourceModel(), nullptr, this, nullptr);
+    QAbstractProxyModel::setSourceModel(source);
+    if (source != nullptr)
+        connect(source, &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
+    mapping_.clear();
+    synthetic_default_ = false;
+    try {
+        ask_for_default();
+    } catch (...) {
+        endResetModel();
+        throw;
+    }
+    endResetModel();
+}
+
+QModelIndex ValuesProxyModel::index(int row, int column, const QModelIndex& parent) const {
+    if (row < 0 || column < 0 || parent.isValid() || row >= rowCount() || column >= columnCount())
+        return QModelIndex();
+    return createIndex(row, column, static_cast<quintptr>(row));
+}
+
+QModelIndex ValuesProxyModel::parent(const QModelIndex&) const { return QModelIndex(); }
+
+int ValuesProxyModel::rowCount(const QModelIndex& parent) const {
+    return sourceModel() == nullptr || parent.isValid() ? 0 : sourceModel()->rowCount() + offset();
+}
+
+int ValuesProxyModel::columnCount(const QModelIndex&) const {
+    return sourceModel() != nullptr ? sourceModel()->columnCount() : 0;
+}
+
+bool ValuesProxyModel::hasChildren(const QModelIndex& parent) const { return rowCount(parent) > 0; }
+
+QVariant ValuesProxyModel::headerData(int section, Qt::Orientation orientation, int role) const {
+    return sourceModel() != nullptr ? sourceModel()->headerData(section, orientation, role) : QVariant();
+}
+
+int ValuesProxyModel::source_row(int row) const {
+    const int position = row - offset();
+    const auto place = static_cast<size_t>(position);
+    return position >= 0 && place < mapping_.size() ? mapping_[place] : position;
+}
+
+QModelIndex ValuesProxyModel::mapToSource(const QModelIndex& proxy_index) const {
+    if (!proxy_index.isValid() || sourceModel() == nullptr || is_synthetic(proxy_index.row()))
+        return QModelIndex();
+    return sourceModel()->index(source_row(proxy_index.row()), proxy_index.column());
+}
+
+QModelIndex ValuesProxyModel::mapFromSource(const QModelIndex& source_index) const {
+    if (!source_index.isValid())
+        return QModelIndex();
+    const auto found = std::find(mapping_.begin(), mapping_.end(), source_index.row());
+    const int position =
+        found != mapping_.end() ? static_cast<int>(found - mapping_.begin()) : source_index.row();
+    return index(position + offset(), source_index.column());
+}
+
+QVariant ValuesProxyModel::data(const QModelIndex& index, int role) const {
+    if (!index.isValid() || sourceModel() == nullptr)
+        return QVariant();
+    if (!is_synthetic(index.row()))
+        return sourceModel()->data(mapToSource(index), role);
+    if (role == Qt::DisplayRole) {
+        switch (index.column()) {
+        case ValuesModel::NameColumn:
+            return default_name_;
+        case ValuesModel::TypeColumn:
+            return type_name(REG_SZ);
+        case ValuesModel::DataColumn:
+            return QVariant::fromValue(ValueNotSet{});
+        default:
+            return QVariant();
+        }
+    }
+    if (role == Qt::DecorationRole && index.column() == ValuesModel::NameColumn)
+        return QIcon(QStringLiteral(TALLOWFEN_SHARE_DIR "type_string.ico"));
+    return QVariant();
+}
+
+Qt::ItemFlags ValuesProxyModel::flags(const QModelIndex& index) const {
+    if (!index.isValid() || sourceModel() == nullptr)
+        return Qt::NoItemFlags;
+    if (index.row() > 0)
+        return sourceModel()->flags(mapToSource(index));
+    // The unnamed value, made up or real, can never be renamed.
+    if (index.column() == ValuesModel::NameColumn)
+        return Qt::ItemIsSelectable | Qt::ItemIsEnabled;
+    return Qt::ItemIsEnabled;
+}
+
+bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, int role) {
+    if (!index.isValid() || sourceModel() == nullptr)
+        return false;
+    if (is_synthetic(index.row())) {
+        auto* values = qobject_cast<ValuesModel*>(sourceModel());
+        if (index.column() != ValuesModel::DataColumn || values == nullptr)
+            return false;
+        const bool added = values->add_default_value(value.toString());
+        ask_for_default();
+        sort(ValuesModel::NameColumn, Qt::AscendingOrder);
+        if (added)
+            emit dataChanged(index, index);
+        return added;
+    }
+    if (!sourceModel()->setData(mapToSource(index), value, role))
+        return false;
+    if (index.column() == ValuesModel::NameColumn)
+        move_to_end(index.row());
+    emit dataChanged(index, index);
+    return true;
+}
+
+// After a rename: the source has the value at its end now, and those behind it one row higher. The shown row stays where
+// the user sees it until the next sort.
+void ValuesProxyModel::move_to_end(int row) {
+    const auto position = static_cast<size_t>(row - offset());
+    if (position >= mapping_.size())
+        return;
+    const int moved = mapping_[position];
+    int lowered = 0;
+    for (int& source : mapping_) {
+        if (source > moved) {
+            source--;
+            lowered++;
+        }
+    }
+    mapping_[position] = moved + lowered;
+}
+
+bool ValuesProxyModel::removeRows(int row, int count, const QModelIndex& parent) {
+    if (sourceModel() == nullptr || parent.isValid() || count != 1 || row < 0 || row >= rowCount())
+        return false;
+    if (is_synthetic(row))
+        return true;
+    auto* values = qobject_cast<ValuesModel*>(sourceModel());
+    const int source = source_row(row);
+    if (values == nullptr || !values->can_remove(source))
+        return false;
+    const bool removed = remove_from_source(row, source);
+    if (removed)
+        sort(ValuesModel::NameColumn, Qt::AscendingOrder);
+    return removed;
+}
+
+bool ValuesProxyModel::remove_from_source(int row, int source) {
+    const int rows = rowCount();
+    // What the source says of a row that stayed after all is not passed on: this model says it itself.
+    disconnect(sourceModel(), &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
+    beginRemoveRows(QModelIndex(), row, row);
+    bool removed = false;
+    try {
+        removed = sourceModel()->removeRows(source, 1);
+        if (removed) {
+            const auto position = static_cast<size_t>(row - offset());
+            if (position < mapping_.size())
+                mapping_.erase(mapping_.begin() + static_cast<std::ptrdiff_t>(position));
+            for (int& mapped : mapping_)
+                mapped -= mapped > source ? 1 : 0;
+        }
+    } catch (...) {
+        endRemoveRows();
+        connect(sourceModel(), &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
+        throw;
+    }
+    endRemoveRows();
+    connect(sourceModel(), &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
+    if (removed)
+        ask_for_default();
+    if (rowCount() == rows) {
+        // The row is there again: it was refused, or the made-up row has taken the unnamed value's place.
+        beginInsertRows(QModelIndex(), row, row);
+        endInsertRows();
+    }
+    return removed;
+}
+
+void ValuesProxyModel::announce_layout() {
+    emit layoutAboutToBeChanged();
+    emit layoutChanged();
+}
+
+void ValuesProxyModel::sort(int, Qt::SortOrder) {
+    emit layoutAboutToBeChanged();
+    const int rows = sourceModel() != nullptr ? sourceModel()->rowCount() : 0;
+    std::vector<QString> names;
+    names.reserve(static_cast<size_t>(rows));
+    try {
+        for (int i = 0; i < rows; i++)
+            names.push_back(sourceModel()->data(sourceModel()->index(i, 0), Qt::DisplayRole).toString());
+    } catch (...) {
+        mapping_.clear();
+        emit layoutChanged();
+        throw;
+    }
+    mapping_ = rows_by_name(names, default_name_);
+    emit layoutChanged();
+}
+
+bool ValuesProxyModel::add_value(int type) {
+    auto* values = qobject_cast<ValuesModel*>(sourceModel());
+    if (values == nullptr)
+        return false;
+    const bool added = values->add_value(type);
+    if (added)
+        mapping_.push_back(static_cast<int>(mapping_.size()));
+    else
+        announce_layout();  // a row was announced that did not come
+    return added;
+}
+
+// With the source's row numbers as they are, without the offset: the rows are announced where they always were, and what
+// matters to a view, their number, is right.
+void ValuesProxyModel::on_rows_inserted(const QModelIndex&, int first, int last) {
+    beginInsertRows(QModelIndex(), first, last);
+    endInsertRows();
+}

@@ -1,0 +1,60 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// What stands between a ValuesModel and the table: sorted by name, and with a row for the unnamed value always.
+#pragma once
+
+#include <QAbstractProxyModel>
+
+#include <vector>
+
+class RegKey;
+
+// When the key has no unnamed value, row 0 is made up for it; every other row maps to a source row. Positions behind the
+// sorted ones (values added since) map to themselves, which keeps a new value at the bottom until the next sort.
+class ValuesProxyModel : public QAbstractProxyModel {
+    Q_OBJECT
+
+public:
+    ValuesProxyModel();
+
+    // A model reset. The source is not owned.
+    void setSourceModel(QAbstractItemModel* source) override;
+
+    QModelIndex index(int row, int column, const QModelIndex& parent = QModelIndex()) const override;
+    QModelIndex parent(const QModelIndex& index) const override;
+    int rowCount(const QModelIndex& parent = QModelIndex()) const override;
+    int columnCount(const QModelIndex& parent = QModelIndex()) const override;
+    bool hasChildren(const QModelIndex& parent = QModelIndex()) const override;
+    QVariant headerData(int section, Qt::Orientation orientation, int role) const override;
+    QModelIndex mapToSource(const QModelIndex& proxy_index) const override;
+    QModelIndex mapFromSource(const QModelIndex& source_index) const override;
+    QVariant data(const QModelIndex& index, int role) const override;
+    Qt::ItemFlags flags(const QModelIndex& index) const override;
+    // The data of the made-up row creates the unnamed value.
+    bool setData(const QModelIndex& index, const QVariant& value, int role) override;
+    bool removeRows(int row, int count, const QModelIndex& parent = QModelIndex()) override;
+    // Always by name, ascending, whatever is asked for.
+    void sort(int column, Qt::SortOrder order) override;
+
+    // Creates a value of a type; it is the last row until the next sort.
+    bool add_value(int type);
+    bool has_key() const;
+
+public slots:
+    void on_rows_inserted(const QModelIndex& parent, int first, int last);
+
+private:
+    RegKey* key() const;
+    int offset() const { return synthetic_default_ ? 1 : 0; }
+    bool is_synthetic(int row) const { return synthetic_default_ && row == 0; }
+    int source_row(int row) const;
+    void ask_for_default();
+    void announce_layout();
+    void move_to_end(int row);
+    bool remove_from_source(int row, int source_row);
+
+    std::vector<int> mapping_;  // source row by position; empty until the first sort
+    bool synthetic_default_ = false;
+    QString default_name_;
+};
