@@ -1,5 +1,5 @@
-# tallowfen_add_test(NAME name LABEL label [TIMEOUT seconds] COMMAND ...): one CTest entry with the environment that
-# every test gets.
+# tallowfen_add_test(NAME name LABEL label... [TIMEOUT seconds] COMMAND ...): one CTest entry with the environment that
+# every test gets. The target tests_LABEL builds what the tests of that label start.
 function(tallowfen_add_test)
     cmake_parse_arguments(T "" "NAME;TIMEOUT" "LABEL;COMMAND" ${ARGN})
     add_test(NAME ${T_NAME} COMMAND ${T_COMMAND})
@@ -9,4 +9,15 @@ function(tallowfen_add_test)
     set_tests_properties(${T_NAME} PROPERTIES
         LABELS "${T_LABEL}" TIMEOUT ${T_TIMEOUT}
         ENVIRONMENT "TALLOWFEN_HIVES=${TALLOWFEN_HIVES};QT_QPA_PLATFORM=offscreen;TSAN_OPTIONS=ignore_noninstrumented_modules=1 halt_on_error=1;ASAN_OPTIONS=detect_leaks=1")
+    foreach(label IN LISTS T_LABEL)
+        if(NOT TARGET tests_${label})
+            add_custom_target(tests_${label})
+        endif()
+        foreach(word IN LISTS T_COMMAND)
+            string(REGEX REPLACE "^\\$<TARGET_FILE:(.*)>$" "\\1" word "${word}")
+            if(TARGET ${word})
+                add_dependencies(tests_${label} ${word})
+            endif()
+        endforeach()
+    endforeach()
 endfunction()
