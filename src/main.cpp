@@ -3,8 +3,8 @@
 // The program's entry: translations, the command line, one model over every hive named, one window.
 
 #include "application.h"
+#include "browsed_model.h"
 #include "main_window.h"
-#include "reg_model.h"
 
 #include <QMessageBox>
 #include <QTranslator>
@@ -18,11 +18,12 @@ constexpr int exit_usage = 1;
 constexpr int exit_hibernated = 2;
 
 void tell_hibernated() {
-    QMessageBox::critical(nullptr, QObject::tr("Hibernation Detected"),
-                          QObject::tr("Your system is in hibernate mode. Therefore the registry cannot be edited. "
-                                      "Please restart your system and exit the hibernate mode or contact Zenta "
-                                      "Support"),
-                          QMessageBox::Ok, QMessageBox::NoButton);
+    QMessageBox::critical(
+        nullptr, QObject::tr("Hibernation Detected"),
+        QObject::tr("Your system is in hibernate mode. Therefore the registry cannot be edited. "
+                    "Please restart your system and exit the hibernate mode or contact Zenta "
+                    "Support"),
+        QMessageBox::Ok, QMessageBox::NoButton);
 }
 
 } // namespace
@@ -56,7 +57,7 @@ int main(int argc, char** argv) {
     // The model is destroyed before the window, whose destructor therefore leaves it alone.
     MainWindow window;
     window.resize(640, 480);
-    RegModel model(nullptr);
+    BrowsedModel model;
     for (int i = 1; i < argc; i += 2) {
         const QString file = QString::fromLocal8Bit(argv[i + 1]);
         set_file_being_opened(file);

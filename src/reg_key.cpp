@@ -107,6 +107,17 @@ AbstractRegKey* RegKey::child(int i) {
     return slot;
 }
 
+AbstractRegKey* RegKey::shown_child(int i) {
+    const RegHive::Dialogue dialogue(hive_);
+    try {
+        return child(i);
+    } catch (const std::runtime_error&) {
+        auto unopened = std::make_unique<RegKey>(hive_, this);
+        unopened->number_hint(static_cast<size_t>(i));
+        return children_[static_cast<size_t>(i)] = unopened.release();
+    }
+}
+
 QString RegKey::name() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);

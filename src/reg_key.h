@@ -9,6 +9,7 @@
 #include <QString>
 
 #include <memory>
+#include <optional>
 #include <vector>
 
 class QRecursiveMutex;
@@ -24,6 +25,9 @@ public:
 
     // The child in a slot; the base neither checks nor creates.
     virtual AbstractRegKey* child(int i);
+    // The same for a row that is shown: where the child cannot be opened, an object without subkeys stands for it, which
+    // throws when it is asked for anything, so that one damaged record does not hide its siblings.
+    virtual AbstractRegKey* shown_child(int i) { return child(i); }
     virtual QString name() = 0;
 
     AbstractRegKey* parent() const { return parent_; }
@@ -64,6 +68,7 @@ public:
 
     // The i-th subkey, made when it is first asked for. std::out_of_range("vector::_M_range_check") outside the list.
     AbstractRegKey* child(int i) override;
+    AbstractRegKey* shown_child(int i) override;
     // std::runtime_error("RQueryInfoKeyW failed") when the engine cannot say.
     QString name() override;
 
@@ -87,6 +92,8 @@ public:
     std::unique_ptr<RegValue> read_value(int index);
     // The name and type of a value without its data, whose variant stays invalid; throws as read_value.
     RegValue read_value_name(int index);
+    // The name alone; nothing when the value's record cannot be read.
+    std::optional<QString> value_name(int index);
     // The setters store under a name, making the value when there is none. With an index, the value of that name must
     // be the one at that position. false: refused, for this or by the engine, or 8 bits cannot carry the name.
     bool set_string_value(const QString& name, const QString& text, uint type, int index = any_value);

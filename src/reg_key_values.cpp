@@ -136,6 +136,16 @@ RegValue RegKey::read_value_name(int index) {
     return value;
 }
 
+std::optional<QString> RegKey::value_name(int index) {
+    const RegHive::Dialogue dialogue(hive_);
+    RegistryKey* handle = hive_->key_handle(this);
+    try {
+        return enumerate_name(handle, index).name;
+    } catch (const std::invalid_argument&) {
+        return std::nullopt;
+    }
+}
+
 std::unique_ptr<RegValue> RegKey::read_value(int index) {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);

@@ -63,7 +63,7 @@ QModelIndex RegModel::index(int row, int column, const QModelIndex& parent) cons
     if (!hasIndex(row, column, parent))
         return QModelIndex();
     AbstractRegKey* const key =
-        parent.isValid() ? key_of(parent)->child(row) : top_level_[static_cast<size_t>(row)].get();
+        parent.isValid() ? key_of(parent)->shown_child(row) : top_level_[static_cast<size_t>(row)].get();
     return key != nullptr ? createIndex(row, column, key) : QModelIndex();
 }
 

@@ -27,9 +27,10 @@ std::vector<QString> shown_value_names(RegKey& key, const QString& default_name)
     const int count = key.value_count();
     bool has_default = false;
     for (int i = 0; i < count; i++) {
-        const QString name = key.read_value_name(i).name;
-        has_default = has_default || name.isEmpty();
-        names.push_back(name.isEmpty() ? default_name : name);
+        const std::optional<QString> name = key.value_name(i);
+        const bool is_default = name.has_value() && name->isEmpty();
+        has_default = has_default || is_default;
+        names.push_back(is_default ? default_name : name.value_or(QString()));
     }
     std::vector<QString> shown;
     if (!has_default)

@@ -65,8 +65,10 @@ QVariant ValuesModel::data(const QModelIndex& index, int role) const {
         // A name needs no data read: a sort asks for every one.
         if (index.column() == NameColumn) {
             const RegValue* cached = cache_.object(index.row());
-            const QString name = cached != nullptr ? cached->name : key_->read_value_name(index.row()).name;
-            return name.isEmpty() ? default_name() : name;
+            const std::optional<QString> name = cached != nullptr ? cached->name : key_->value_name(index.row());
+            if (!name.has_value())
+                return QVariant();
+            return name->isEmpty() ? default_name() : *name;
         }
         const RegValue* value = lookup(index.row());
         if (index.column() == DataColumn)
