@@ -106,13 +106,8 @@ RegHive::~RegHive() {
 }
 
 void RegHive::open_file() {
-    const QFileInfo info(file_);
-    constexpr QFile::Permissions any_write =
-        QFile::WriteOwner | QFile::WriteUser | QFile::WriteGroup | QFile::WriteOther;
-    // Whoever may override permissions still means a file that nobody may write to as one to be left alone. The kind of
-    // file is asked first, since opening a pipe or a device can do something already.
-    const bool writable = (info.permissions() & (any_write & ~QFile::WriteUser)) != 0;
-    if (!info.isFile() || !writable ||
+    // The kind of file is asked first: opening a pipe or a device can do something already.
+    if (!QFileInfo(file_).isFile() ||
         !file_.open(QIODevice::ReadWrite | QIODevice::Unbuffered | QIODevice::ExistingOnly))
         throw std::runtime_error("Cannot open file");
     const FileIdentity file = identity(file_);
