@@ -208,6 +208,8 @@ void KeyDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelInde
     try {
         QStyledItemDelegate::initStyleOption(option, index);
     } catch (const std::exception& failure) {
+        option->features |= QStyleOptionViewItem::HasDisplay;
+        option->text = tr("(cannot be read)");
         report_key_failure(index, failure);
     }
 }

@@ -59,7 +59,7 @@ QString key_path_of(const QModelIndex& index) {
         try {
             names.prepend(step.data(Qt::DisplayRole).toString());
         } catch (const std::exception&) {
-            names.prepend(QStringLiteral("?"));
+            names.prepend(QStringLiteral("#%1").arg(step.row()));
         }
         try {
             step = step.parent();

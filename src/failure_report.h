@@ -38,6 +38,6 @@ private:
     bool m_scheduled = false;
 };
 
-// The names from the outermost key down to `index`, joined with backslashes. A name that cannot be read stands as
-// "?": this never throws.
+// The names from the outermost key down to `index`, joined with backslashes. For a name that cannot be read
+// stands the key's place among its siblings, as in "TOP\HIVE\#3": this never throws.
 QString key_path_of(const QModelIndex& index);

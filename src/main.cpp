@@ -3,8 +3,8 @@
 // The program's entry: translations, the command line, one model over every hive named, one window.
 
 #include "application.h"
-#include "browsed_model.h"
 #include "main_window.h"
+#include "reg_model.h"
 
 #include <QMessageBox>
 #include <QTranslator>
@@ -57,7 +57,7 @@ int main(int argc, char** argv) {
     // The model is destroyed before the window, whose destructor therefore leaves it alone.
     MainWindow window;
     window.resize(640, 480);
-    BrowsedModel model;
+    RegModel model;
     for (int i = 1; i < argc; i += 2) {
         const QString file = QString::fromLocal8Bit(argv[i + 1]);
         set_file_being_opened(file);

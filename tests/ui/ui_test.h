@@ -1,0 +1,98 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#pragma once
+
+// What every test of the user interface starts from: the program's own application object, and a hand for the
+// modal dialogs that a call under test opens.
+
+#include "application.h"
+
+#include <QApplication>
+#include <QMessageBox>
+#include <QPointer>
+#include <QPushButton>
+#include <QTest>
+#include <QTimer>
+
+#include <deque>
+#include <functional>
+
+// Answers the modal dialogs that open one after the other, each by the next step, from inside its event loop.
+class DialogHand {
+public:
+    using Step = std::function<void(QWidget*)>;
+
+    DialogHand() {
+        QObject::connect(&m_timer, &QTimer::timeout, &m_timer, [this] { look(); });
+        m_timer.start(1);
+    }
+
+    DialogHand& then(Step step) {
+        m_steps.push_back(std::move(step));
+        return *this;
+    }
+
+    // Waits for a message box, notes what it says and presses a button of it.
+    DialogHand& then_press(QMessageBox::StandardButton button) {
+        return then([this, button](QWidget* dialog) {
+            auto* box = qobject_cast<QMessageBox*>(dialog);
+            QVERIFY2(box, dialog->metaObject()->className());
+            icon = box->icon();
+            title = box->windowTitle();
+            text = box->text();
+            parent = box->parentWidget();
+            buttons = box->standardButtons();
+            QTest::mouseClick(box->button(button), Qt::LeftButton);
+        });
+    }
+
+    bool is_done() const { return m_steps.empty(); }
+
+    // Of the last box that was pressed.
+    QMessageBox::Icon icon = QMessageBox::NoIcon;
+    QString title;
+    QString text;
+    QWidget* parent = nullptr;
+    QMessageBox::StandardButtons buttons;
+
+private:
+    void look() {
+        QWidget* dialog = QApplication::activeModalWidget();
+        if (m_steps.empty() || !dialog || !dialog->isVisible() || dialog == m_answered) {
+            return;
+        }
+        m_answered = dialog;
+        const Step step = std::move(m_steps.front());
+        m_steps.pop_front();
+        // Not from inside the timer's own event: a step may open the next dialog before it returns.
+        const QPointer<QWidget> shown = dialog;
+        QTimer::singleShot(0, qApp, [step, shown] {
+            if (shown) {
+                step(shown);
+            }
+        });
+    }
+
+    QTimer m_timer;
+    QPointer<QWidget> m_answered;
+    std::deque<Step> m_steps;
+};
+
+// The widget of a type below `parent` whose text is `text`.
+template <typename Widget>
+Widget* find_by_text(const QWidget& parent, const QString& text) {
+    for (Widget* widget : parent.findChildren<Widget*>()) {
+        if (widget->text().remove(QLatin1Char('&')) == text) {
+            return widget;
+        }
+    }
+    return nullptr;
+}
+
+#define UI_TEST_MAIN(TestClass)                                                                              \
+    int main(int argc, char** argv) {                                                                        \
+        Application application(argc, argv);                                                                 \
+        QCoreApplication::setApplicationName(QStringLiteral("Registry Editor"));                             \
+        TestClass test;                                                                                      \
+        return QTest::qExec(&test, argc, argv);                                                              \
+    }
