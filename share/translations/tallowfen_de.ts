@@ -2,13 +2,6 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="de_DE" sourcelanguage="en_US">
 <context>
-    <name>BrowsedModel</name>
-    <message>
-        <source>(cannot be read)</source>
-        <translation>(kann nicht gelesen werden)</translation>
-    </message>
-</context>
-<context>
     <name>EditNumberDialog</name>
     <message>
         <source>Hexadecimal</source>
@@ -51,6 +44,10 @@
     <message>
         <source>The specified key name already exists.</source>
         <translation>Der angegebene Schlüsselname ist bereits vorhanden.</translation>
+    </message>
+    <message>
+        <source>(cannot be read)</source>
+        <translation>(kann nicht gelesen werden)</translation>
     </message>
 </context>
 <context>

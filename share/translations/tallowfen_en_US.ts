@@ -2,13 +2,6 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="en_US" sourcelanguage="en_US">
 <context>
-    <name>BrowsedModel</name>
-    <message>
-        <source>(cannot be read)</source>
-        <translation>(cannot be read)</translation>
-    </message>
-</context>
-<context>
     <name>EditNumberDialog</name>
     <message>
         <source>Hexadecimal</source>
@@ -51,6 +44,10 @@
     <message>
         <source>The specified key name already exists.</source>
         <translation>The specified key name already exists.</translation>
+    </message>
+    <message>
+        <source>(cannot be read)</source>
+        <translation>(cannot be read)</translation>
     </message>
 </context>
 <context>

@@ -2,13 +2,6 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="fr_FR" sourcelanguage="en_US">
 <context>
-    <name>BrowsedModel</name>
-    <message>
-        <source>(cannot be read)</source>
-        <translation>(illisible)</translation>
-    </message>
-</context>
-<context>
     <name>EditNumberDialog</name>
     <message>
         <source>Hexadecimal</source>
@@ -51,6 +44,10 @@
     <message>
         <source>The specified key name already exists.</source>
         <translation>Le nom de clé spécifié existe déjà.</translation>
+    </message>
+    <message>
+        <source>(cannot be read)</source>
+        <translation>(illisible)</translation>
     </message>
 </context>
 <context>

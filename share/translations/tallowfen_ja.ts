@@ -2,13 +2,6 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="ja_JP" sourcelanguage="en_US">
 <context>
-    <name>BrowsedModel</name>
-    <message>
-        <source>(cannot be read)</source>
-        <translation>(読み取れません)</translation>
-    </message>
-</context>
-<context>
     <name>EditNumberDialog</name>
     <message>
         <source>Hexadecimal</source>
@@ -51,6 +44,10 @@
     <message>
         <source>The specified key name already exists.</source>
         <translation>指定されたキー名は既に存在します。</translation>
+    </message>
+    <message>
+        <source>(cannot be read)</source>
+        <translation>(読み取れません)</translation>
     </message>
 </context>
 <context>

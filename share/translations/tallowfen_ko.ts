@@ -2,13 +2,6 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="ko_KR" sourcelanguage="en_US">
 <context>
-    <name>BrowsedModel</name>
-    <message>
-        <source>(cannot be read)</source>
-        <translation>(읽을 수 없음)</translation>
-    </message>
-</context>
-<context>
     <name>EditNumberDialog</name>
     <message>
         <source>Hexadecimal</source>
@@ -51,6 +44,10 @@
     <message>
         <source>The specified key name already exists.</source>
         <translation>지정한 키 이름이 이미 있습니다.</translation>
+    </message>
+    <message>
+        <source>(cannot be read)</source>
+        <translation>(읽을 수 없음)</translation>
     </message>
 </context>
 <context>

@@ -2,13 +2,6 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="nl_NL" sourcelanguage="en_US">
 <context>
-    <name>BrowsedModel</name>
-    <message>
-        <source>(cannot be read)</source>
-        <translation>(kan niet worden gelezen)</translation>
-    </message>
-</context>
-<context>
     <name>EditNumberDialog</name>
     <message>
         <source>Hexadecimal</source>
@@ -51,6 +44,10 @@
     <message>
         <source>The specified key name already exists.</source>
         <translation>De opgegeven sleutelnaam bestaat al.</translation>
+    </message>
+    <message>
+        <source>(cannot be read)</source>
+        <translation>(kan niet worden gelezen)</translation>
     </message>
 </context>
 <context>

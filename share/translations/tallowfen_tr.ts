@@ -2,13 +2,6 @@
 <!DOCTYPE TS>
 <TS version="2.1" language="tr_TR" sourcelanguage="en_US">
 <context>
-    <name>BrowsedModel</name>
-    <message>
-        <source>(cannot be read)</source>
-        <translation>(okunamıyor)</translation>
-    </message>
-</context>
-<context>
     <name>EditNumberDialog</name>
     <message>
         <source>Hexadecimal</source>
@@ -51,6 +44,10 @@
     <message>
         <source>The specified key name already exists.</source>
         <translation>Belirtilen anahtar adı zaten var.</translation>
+    </message>
+    <message>
+        <source>(cannot be read)</source>
+        <translation>(okunamıyor)</translation>
     </message>
 </context>
 <context>
