@@ -58,8 +58,7 @@ bool Application::notify(QObject* receiver, QEvent* event) {
     try {
         return QApplication::notify(receiver, event);
     } catch (const std::exception& failure) {
-        FailureReport& report = FailureReport::instance();
-        report.report(report.current_key(), failure);
+        FailureReport::instance().report_at_current(failure);
         return true;
     }
 }

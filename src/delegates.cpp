@@ -16,9 +16,9 @@
 namespace {
 
 constexpr qsizetype no_limit = std::numeric_limits<qsizetype>::max();
-// No glyph is narrower than a pixel, so a cell never shows more characters than it is wide; and a row that is
-// measured before it has a width is measured by this many.
-constexpr qsizetype shortest_cut = 1024;
+// A cell shows no more letters than half its width in pixels; a row that is measured before it has a width is measured
+// by this many.
+constexpr qsizetype shortest_cut = 256;
 
 QString hexadecimal(const QByteArray& bytes, qsizetype limit) {
     static const char digits[] = "0123456789abcdef";
@@ -83,8 +83,10 @@ bool is_longer(const QVariant& value, qsizetype limit) {
     case QMetaType::QByteArray:
         return value.toByteArray().size() > limit / 3;
     case QMetaType::QStringList: {
+        // const, or the loop would copy the list first.
+        const QStringList strings = value.toStringList();
         qsizetype length = 0;
-        for (const QString& text : value.toStringList()) {
+        for (const QString& text : strings) {
             length += text.size() + 1;
             if (length > limit) {
                 return true;
@@ -121,10 +123,7 @@ void tell_refused(QWidget* main_window, const QString& text) {
 }
 
 // The rows of the values table belong to the key that the user is at.
-void report_value_failure(const std::exception& failure) {
-    FailureReport& report = FailureReport::instance();
-    report.report(report.current_key(), failure);
-}
+void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_current(failure); }
 
 void report_key_failure(const QModelIndex& index, const std::exception& failure) {
     FailureReport::instance().report(key_path_of(index), failure);
@@ -163,7 +162,7 @@ QSize ValueDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIn
 
 void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
     try {
-        const qsizetype limit = std::max<qsizetype>(shortest_cut, option->rect.width());
+        const qsizetype limit = std::max<qsizetype>(shortest_cut, option->rect.width() / 2);
         const QVariant value = index.data(Qt::DisplayRole);
         if (!is_longer(value, limit)) {
             QStyledItemDelegate::initStyleOption(option, index);

@@ -25,17 +25,29 @@ FailureReport& FailureReport::instance() {
 
 void FailureReport::report(const QString& key_path, const std::exception& failure) {
     const QString reason = QString::fromLocal8Bit(failure.what());
-    const QString line = key_path.isEmpty() ? tr("The registry cannot be read: %1").arg(reason)
-                                            : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
-    if (m_told.contains(line)) {
+    const QPair<QString, QString> cause(key_path, reason);
+    if (m_told.contains(cause)) {
         return;
     }
-    m_told.insert(line);
+    m_told.insert(cause);
+    const QString line = key_path.isEmpty() ? tr("The registry cannot be read: %1").arg(reason)
+                                            : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
     m_pending.append(line);
     if (!m_scheduled) {
         m_scheduled = true;
         QMetaObject::invokeMethod(this, &FailureReport::show_pending, Qt::QueuedConnection);
     }
+}
+
+void FailureReport::report_at_current(const std::exception& failure) {
+    const QString reason = QString::fromLocal8Bit(failure.what());
+    const QString below = m_current_key + QLatin1Char('\\');
+    for (const auto& [key_path, told_reason] : std::as_const(m_told)) {
+        if (told_reason == reason && key_path.startsWith(below)) {
+            return;
+        }
+    }
+    report(m_current_key, failure);
 }
 
 void FailureReport::show_pending() {

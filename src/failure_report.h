@@ -6,6 +6,7 @@
 
 #include <QModelIndex>
 #include <QObject>
+#include <QPair>
 #include <QSet>
 #include <QString>
 #include <QStringList>
@@ -24,16 +25,19 @@ public:
     // told before is left out; what comes in while a box is open shares the next one.
     void report(const QString& key_path, const std::exception& failure);
 
-    // The key that the user's last gesture was about: named where an exception surfaces far from the key it met.
+    // The same where nothing says which key it was: the current one is named, unless one below it was told with the
+    // same reason, which is then what surfaced again.
+    void report_at_current(const std::exception& failure);
+
+    // The key that the user's last gesture was about.
     void set_current_key(const QString& key_path) { m_current_key = key_path; }
-    QString current_key() const { return m_current_key; }
 
 private:
     explicit FailureReport(QObject* parent);
     void show_pending();
 
     QString m_current_key;
-    QSet<QString> m_told;
+    QSet<QPair<QString, QString>> m_told; // key path and reason
     QStringList m_pending;
     bool m_scheduled = false;
 };

@@ -115,8 +115,7 @@ void KeysView::paintEvent(QPaintEvent* event) {
     try {
         QTreeView::paintEvent(event);
     } catch (const std::exception& failure) {
-        FailureReport& report = FailureReport::instance();
-        report.report(report.current_key(), failure);
+        FailureReport::instance().report_at_current(failure);
     }
 }
 

@@ -217,8 +217,7 @@ void ValuesView::paintEvent(QPaintEvent* event) {
     try {
         QTableView::paintEvent(event);
     } catch (const std::exception& failure) {
-        FailureReport& report = FailureReport::instance();
-        report.report(report.current_key(), failure);
+        FailureReport::instance().report_at_current(failure);
     }
 }
 
