@@ -1,0 +1,65 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#pragma once
+
+// A small hive of every kind of value, and the program's window over it.
+
+#include "keys_view.h"
+#include "main_window.h"
+#include "reg_model.h"
+#include "values_view.h"
+
+#include <QString>
+#include <QTemporaryDir>
+
+#include <memory>
+
+// A hive file of one root key, laid out byte by byte; the tree below it is made through the key objects.
+//
+//   SYSTEM            mounted as MACHINE/SYSTEM
+//     Alpha           depth 2; one value of each kind, no default value
+//       Deep          depth 3; a default value and two more
+//         Deeper      depth 4
+//       Leaf
+//       Zeta
+//     Beta
+class Scene {
+public:
+    Scene();
+
+    QString file() const { return m_directory.filePath(QStringLiteral("hive")); }
+    // Overwrites the signature of the record of a key, of which there must be one only.
+    void damage_key(const QByteArray& name) const;
+    QByteArray bytes() const;
+
+private:
+    QTemporaryDir m_directory;
+};
+
+// The window over a scene, shown and active, as the program's entry makes it.
+class Stage {
+public:
+    explicit Stage(const Scene& scene);
+
+    // The key at a path of names below the invisible root; fails the test when there is none.
+    QModelIndex key(const QString& path) const;
+    void select_key(const QString& path) const { keys->setCurrentIndex(key(path)); }
+    // The row of the values table with this name, -1 when there is none.
+    int value_row(const QString& name) const;
+    QModelIndex value(const QString& name, int column = 0) const;
+    QString cell(int row, int column) const;
+    QString status() const;
+    // The names of the shown values, top to bottom.
+    QStringList value_names() const;
+    QStringList subkeys(const QString& path) const;
+    void press_in_editor(const QString& text, Qt::Key key) const;
+
+    // In the order of the program's entry: the model goes before the window.
+    MainWindow window;
+    std::unique_ptr<RegModel> model;
+    KeysView* keys;
+    ValuesView* values;
+};
+
+// The widget below `parent` with this accessible name.
+QWidget* by_accessible_name(const QWidget& parent, const QString& name);
