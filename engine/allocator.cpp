@@ -17,6 +17,15 @@ bool write_size(Store& store, int64_t position, int32_t size) {
     return write_at(store, sig_none, position, &word, sizeof word) == sizeof word;
 }
 
+// Changes the size word of a cell that counts. Half of one would break the bin, so it is put back when it fails.
+bool change_size(Store& store, int64_t position, int32_t before, int32_t now) {
+    Le32 old_word;
+    Le32 word;
+    old_word = static_cast<uint32_t>(before);
+    word = static_cast<uint32_t>(now);
+    return rewrite_at(store, position, &word, &old_word, sizeof word) == Outcome::written;
+}
+
 // The bin whose largest free cell is the smallest that will do, the earliest of equals.
 const Bin* choose_bin(const Store& store, uint32_t size) {
     const Bin* best = nullptr;
@@ -98,22 +107,25 @@ bool lay_bin(Store& store, const Bin& bin) {
 
 // Counts the bins' new size in the base block. True when the file says so afterwards, however the write ended.
 bool count_in_base_block(Store& store, uint32_t bins_size) {
-    BaseBlock base;
-    if (read_at(store, sig_base, 0, &base, sizeof base) != sizeof base)
+    BaseBlock before;
+    if (read_at(store, sig_base, 0, &before, sizeof before) != sizeof before)
         return false;
+    BaseBlock base = before;
     base.bins_size = bins_size;
     set_checksum(base);
-    if (write_at(store, sig_base, 0, &base, sizeof base) == sizeof base)
-        return true;
+    const Outcome outcome = rewrite_at(store, 0, &base, &before, sizeof base);
+    if (outcome != Outcome::unknown)
+        return outcome == Outcome::written;
     return read_at(store, sig_base, 0, &base, sizeof base) == sizeof base && base.bins_size == bins_size;
 }
 
 bool note_in_first_bin(Store& store, uint32_t bins_size) {
-    BinHeader first;
-    if (read_at(store, sig_bin, base_block_size, &first, sizeof first) != sizeof first)
+    BinHeader before;
+    if (read_at(store, sig_bin, base_block_size, &before, sizeof before) != sizeof before)
         return false;
+    BinHeader first = before;
     first.spare = bins_size;
-    return write_at(store, sig_bin, base_block_size, &first, sizeof first) == sizeof first;
+    return rewrite_at(store, base_block_size, &first, &before, sizeof first) == Outcome::written;
 }
 
 // Appends a bin with one free cell of at least size bytes. The bin lies behind the last one, over whatever the file
@@ -164,7 +176,7 @@ CellOffset allocate(Store& store, uint32_t n) {
     if (rest > 4 && !write_size(store, cell_position(offset) + size, static_cast<int32_t>(rest)))
         return CellOffset::none;
     const uint32_t taken = rest > 4 ? size : free_size;
-    if (!write_size(store, cell_position(offset), -static_cast<int32_t>(taken)))
+    if (!change_size(store, cell_position(offset), static_cast<int32_t>(free_size), -static_cast<int32_t>(taken)))
         return CellOffset::none;
     return offset;
 }
@@ -176,7 +188,8 @@ bool free_cell(Store& store, CellOffset offset) {
     if (!is_own_cell(store, offset) || !find_used_cell(store, offset, cell))
         return false;
     const Bin bin = *bin_of(store, offset);
-    if (!write_size(store, cell_position(offset), static_cast<int32_t>(cell.size)))
+    const auto size_word = static_cast<int32_t>(cell.size);
+    if (!change_size(store, cell_position(offset), -size_word, size_word))
         return false;
     const int64_t start = int64_t{base_block_size} + bin.offset;
     uint32_t run = 0;  // where the present run of free cells began, 0 outside one
@@ -193,9 +206,10 @@ bool free_cell(Store& store, CellOffset offset) {
             run = walked;
             run_size = absolute;
         } else {
-            run_size += absolute;
-            if (!write_size(store, start + run, static_cast<int32_t>(run_size)))
+            const auto joined = static_cast<int32_t>(run_size + absolute);
+            if (!change_size(store, start + run, static_cast<int32_t>(run_size), joined))
                 return false;
+            run_size += absolute;
         }
         walked += absolute;
     }

@@ -115,7 +115,8 @@ int32_t check_entry(Store& store, const Level& parent, uint32_t position, KeyVie
         return R_INVALID_NAME;
     KeyView met;
     uint32_t where;
-    if (!find_subkey(store, parent.children, parent.key.offset(), key.searchable(), compare_signed, where, met) ||
+    if (find_subkey(store, parent.children, parent.key.offset(), key.searchable(), compare_signed, where, met) !=
+            Lookup::found ||
         where != position)
         return R_PATH_NOT_FOUND;
     return check_lists(store, key);

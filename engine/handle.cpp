@@ -227,7 +227,7 @@ int32_t follow_path(RegistryKey& from, const char* path, PathEnd& end) {
                            length < component_limit ? length : component_limit, false};
         KeyView key;
         if (end.depth == depth_limit ||
-            !find_subkey(store, *index, end.key, name, compare_signed, end.position, key)) {
+            find_subkey(store, *index, end.key, name, compare_signed, end.position, key) != Lookup::found) {
             status = R_PATH_NOT_FOUND;
             break;
         }

@@ -273,9 +273,12 @@ Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, 
                      uint32_t position) {
     if (index.is_root || position >= index.total)
         return Outcome::unchanged;
-    LeafBytes before(index.only);
-    if (!read_leaf_bytes(store, index.only, before))
+    const Leaf& leaf = index.only;
+    LeafBytes before(leaf);
+    LeafBytes now(leaf);
+    if (!read_leaf_bytes(store, leaf, before) || !read_leaf_bytes(store, leaf, now))
         return Outcome::unchanged;
+    now.remove(position);
     const Outcome outcome = take_out(store, index, position);
     if (outcome != Outcome::written)
         return outcome;
@@ -284,9 +287,10 @@ Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, 
     const Outcome counted = rewrite_key(store, parent_offset, parent, changed);
     if (counted != Outcome::unchanged)
         return counted;
-    const bool back = write_at(store, sig_none, record_position(index.cell.offset), before.block.bytes,
-                               before.used()) == before.used();
-    return back ? Outcome::unchanged : Outcome::unknown;
+    // The entry goes back in; if it cannot, the leaf stays without it, whole.
+    const Outcome back = rewrite_at(store, record_position(leaf.cell.offset), before.block.bytes, now.block.bytes,
+                                    before.used());
+    return back == Outcome::written ? Outcome::unchanged : Outcome::unknown;
 }
 
 Outcome move_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,

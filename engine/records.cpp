@@ -54,17 +54,29 @@ Outcome rewrite_value(Store& store, const ValueView& value, const ValueRecord& c
     return rewrite_at(store, record_position(value.cell.offset), &changed, &value.record, sizeof changed);
 }
 
-bool value_is_named(Store& store, const ValueView& value, const Name& name) {
-    if (value.name_characters() != name.characters())
-        return false;
+namespace {
+
+// buffer has room for the value's name; null when memory ran out.
+Named compare_name(Store& store, const ValueView& value, const Name& name, uint8_t* buffer) {
     const uint32_t length = value.record.name_length;
-    if (length == 0)
-        return true;
+    if (buffer == nullptr || !read_part(store, value.cell, sizeof(ValueRecord), buffer, length))
+        return Named::unreadable;
+    return same_name(name, {buffer, length, value.wide()}) ? Named::so : Named::otherwise;
+}
+
+}  // namespace
+
+Named compare_value(Store& store, CellOffset offset, const Name& name, ValueView& value) {
+    if (!read_value(store, offset, value))
+        return Named::unreadable;
+    if (value.name_characters() != name.characters())
+        return Named::otherwise;
+    const uint32_t length = value.record.name_length;
     uint8_t few[512];
-    const Block many(length > sizeof few ? length : 0);
-    uint8_t* bytes = length > sizeof few ? many.bytes : few;
-    return bytes != nullptr && read_part(store, value.cell, sizeof(ValueRecord), bytes, length) &&
-           same_name(name, {bytes, length, value.wide()});
+    if (length <= sizeof few)
+        return compare_name(store, value, name, few);
+    const Block many(length);
+    return compare_name(store, value, name, many.bytes);
 }
 
 }  // namespace engine

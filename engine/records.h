@@ -46,8 +46,9 @@ struct ValueView {
 bool read_value(Store& store, CellOffset offset, ValueView& value);
 // Writes the fixed 20 bytes over what the file holds; the name stays.
 Outcome rewrite_value(Store& store, const ValueView& value, const ValueRecord& changed);
-// Whether the value has this name, case ignored; an empty name is the default value's.
-bool value_is_named(Store& store, const ValueView& value, const Name& name);
+enum class Named { so, otherwise, unreadable };
+// Reads the value at an offset and says whether it has this name, case ignored; an empty name is the default value's.
+Named compare_value(Store& store, CellOffset offset, const Name& name, ValueView& value);
 
 // A memory block that frees itself.
 struct Block {

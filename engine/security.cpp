@@ -12,8 +12,8 @@ bool read_security(Store& store, CellOffset offset, SecurityRecord& record) {
     return read_record(store, sig_security, offset, &record, sizeof record) == sizeof record;
 }
 
-bool write_security(Store& store, CellOffset offset, const SecurityRecord& record) {
-    return write_at(store, sig_security, record_position(offset), &record, sizeof record) == sizeof record;
+bool rewrite_security(Store& store, CellOffset offset, const SecurityRecord& before, const SecurityRecord& now) {
+    return rewrite_at(store, record_position(offset), &now, &before, sizeof now) == Outcome::written;
 }
 
 // Takes the record out of its ring. In turn: the next one's way back, the previous one's way forward. A stop between
@@ -34,15 +34,17 @@ bool unlink(Store& store, CellOffset self, const SecurityRecord& record) {
         (has_previous && (!is_there(previous, before) || cell_offset(before.next) != self)))
         return false;
     if (has_next) {
+        const SecurityRecord unchanged = after;
         after.previous = record.previous;
-        if (!write_security(store, next, after))
+        if (!rewrite_security(store, next, unchanged, after))
             return false;
     }
     if (has_previous) {
         if (!read_security(store, previous, before))  // the same record as the next one in a ring of two
             return false;
+        const SecurityRecord unchanged = before;
         before.next = record.next;
-        if (!write_security(store, previous, before))
+        if (!rewrite_security(store, previous, unchanged, before))
             return false;
     }
     return true;
@@ -56,8 +58,9 @@ bool add_security_reference(Store& store, CellOffset security) {
     SecurityRecord record;
     if (!read_security(store, security, record) || record.references == UINT32_MAX || !is_own_cell(store, security))
         return false;
-    record.references = record.references + 1;
-    return write_security(store, security, record);
+    SecurityRecord raised = record;
+    raised.references = record.references + 1;
+    return rewrite_security(store, security, record, raised);
 }
 
 void drop_security_reference(Store& store, CellOffset security) {
@@ -69,8 +72,9 @@ void drop_security_reference(Store& store, CellOffset security) {
         free_cell(store, security);
         return;
     }
-    record.references = record.references - 1;
-    write_security(store, security, record);
+    SecurityRecord lowered = record;
+    lowered.references = record.references - 1;
+    rewrite_security(store, security, record, lowered);
 }
 
 }  // namespace engine

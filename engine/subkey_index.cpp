@@ -68,8 +68,8 @@ bool load_root(Store& store, uint32_t claimed, SubkeyIndex& index) {
     return true;
 }
 
-// Searches by halves in one order; true when the name is met on the way.
-bool search_by(Store& store, const SubkeyIndex& index, const Name& name, NameOrder order, uint32_t& position,
+// Searches by halves in one order.
+Lookup search_by(Store& store, const SubkeyIndex& index, const Name& name, NameOrder order, uint32_t& position,
                KeyView& key) {
     int64_t low = 0;
     int64_t high = int64_t{index.total} - 1;
@@ -77,45 +77,46 @@ bool search_by(Store& store, const SubkeyIndex& index, const Name& name, NameOrd
         const int64_t middle = (low + high) / 2;
         position = static_cast<uint32_t>(middle);
         if (!read_key(store, subkey_at(store, index, position), key))
-            return false;
+            return Lookup::unreadable;
         const Name stored = key.searchable();
         if (same_name(name, stored))
-            return true;
+            return Lookup::found;
         if (order(name, stored) > 0)
             low = middle + 1;
         else
             high = middle - 1;
     }
-    return false;
+    return Lookup::absent;
 }
 
 // Looks at every entry. When the list turns out to be in upper-cased order throughout, that is noted in the store.
-bool search_each(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, uint32_t& position,
+Lookup search_each(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, uint32_t& position,
                  KeyView& key) {
     KeyView other;
     KeyView* current = &key;
     KeyView* previous = &other;
-    bool sorted = index.whole;
+    bool complete = index.whole;
+    bool sorted = true;
     for (uint32_t i = 0; i < index.total; i++) {
         if (!read_key(store, subkey_at(store, index, i), *current)) {
-            sorted = false;
+            complete = false;
             continue;
         }
         if (same_name(name, current->searchable())) {
             position = i;
             if (current != &key)
                 key = *current;
-            return true;
+            return Lookup::found;
         }
-        // While sorted, previous is the entry before this one.
-        sorted = sorted && (i == 0 || compare_upper(previous->searchable(), current->searchable()) < 0);
+        // While complete, previous is the entry before this one.
+        sorted = sorted && complete && (i == 0 || compare_upper(previous->searchable(), current->searchable()) < 0);
         KeyView* next = previous;
         previous = current;
         current = next;
     }
-    if (sorted)
+    if (sorted && complete)
         store.sorted_key = parent;
-    return false;
+    return complete ? Lookup::absent : Lookup::unreadable;
 }
 
 }  // namespace
@@ -196,13 +197,14 @@ CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position) 
     return subkeys_at(store, index, position, &offset, 1) == 1 ? offset : CellOffset::none;
 }
 
-bool find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
-                 uint32_t& position, KeyView& key) {
+Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
+                   uint32_t& position, KeyView& key) {
     if (store.sorted_key == parent && parent != CellOffset::none)
         return search_by(store, index, name, compare_upper, position, key);
-    return search_by(store, index, name, order, position, key) ||
-           search_by(store, index, name, compare_upper, position, key) ||
-           search_each(store, index, parent, name, position, key);
+    if (search_by(store, index, name, order, position, key) == Lookup::found ||
+        search_by(store, index, name, compare_upper, position, key) == Lookup::found)
+        return Lookup::found;
+    return search_each(store, index, parent, name, position, key);
 }
 
 bool place_for_name(Store& store, const SubkeyIndex& index, const Name& name, uint32_t& position) {

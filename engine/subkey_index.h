@@ -46,12 +46,15 @@ uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, C
 // The key offset at a position; none when it cannot be read or its leaf is neither "li" nor of the hive's kind.
 CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position);
 
+// absent is said only when every entry that could be the name was read.
+enum class Lookup { found, absent, unreadable };
+
 using NameOrder = int (*)(const Name& searched, const Name& stored);
 
 // Finds a subkey by name in whatever order the list stands: by the given order first, then by upper-cased order, then
 // by looking at each, unless the list of this key (its offset is parent) is known to be in upper-cased order.
-// true: position and key are set.
-bool find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
+// found: position and key are set.
+Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
                  uint32_t& position, KeyView& key);
 // Where upper-cased order wants a new name. false when a record on the way cannot be read.
 bool place_for_name(Store& store, const SubkeyIndex& index, const Name& name, uint32_t& position);

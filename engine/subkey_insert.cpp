@@ -51,12 +51,13 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
         return Inserted::failed;
     uint32_t position = 0;
     KeyView found;
-    if (index.total > 0 &&
-        find_subkey(store, index, parent.offset(), name, compare_index, position, found)) {
+    const Lookup lookup = find_subkey(store, index, parent.offset(), name, compare_index, position, found);
+    if (lookup == Lookup::found) {
         key = found.offset();
         return Inserted::exists;
     }
-    if (name.length == 0 || name.length > longest_key_name || !place_for_name(store, index, name, position) ||
+    // Where a sibling cannot be read, the name may be there already.
+    if (lookup == Lookup::unreadable || name.length == 0 || name.length > longest_key_name || !place_for_name(store, index, name, position) ||
         !can_grow(index, position))
         return Inserted::failed;
 
@@ -176,7 +177,8 @@ int32_t rename_subkey(Store& store, CellOffset parent_offset, uint32_t position,
         uint32_t sibling_position;
         if (!index.whole || index.total != parent.record.subkey_count ||
             !read_key(store, subkey_at(store, index, position), old) || !is_own_cell(store, old.offset()) ||
-            find_subkey(store, index, parent_offset, name, compare_index, sibling_position, sibling))
+            find_subkey(store, index, parent_offset, name, compare_index, sibling_position, sibling) !=
+                Lookup::absent)
             status = R_FAILED;
         else if (load_key_index(store, old.record, children))
             status = children.whole && children.total == old.record.subkey_count

@@ -23,6 +23,15 @@ bool write_data(Store& store, CellOffset cell, const NewValue& value) {
     return write_at(store, sig_none, record_position(cell), value.data, value.size) == value.size;
 }
 
+// Writes new data of the same size over old; a write that fails leaves the old.
+bool overwrite_data(Store& store, CellOffset offset, const NewValue& value) {
+    Cell cell;
+    const Block before(value.size);
+    return before.bytes != nullptr && find_used_cell(store, offset, cell) &&
+           read_part(store, cell, 0, before.bytes, value.size) &&
+           rewrite_at(store, record_position(offset), value.data, before.bytes, value.size) == Outcome::written;
+}
+
 // A new cell that holds the value's data; none on failure, nothing then being left allocated.
 CellOffset place_data(Store& store, const NewValue& value) {
     const CellOffset cell = allocate(store, value.size);
@@ -62,7 +71,7 @@ bool move_data(Store& store, const ValueView& old, const ValueRecord& record, co
 bool rewrite_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value) {
     const CellOffset own = cell_offset(old.record.data);
     if (old.size() == value.size && old.record.type == value.type)
-        return write_data(store, own, value);
+        return overwrite_data(store, own, value);
     ValueView spared = old;
     if (!move_data(store, old, record, value, spared.record) || !write_data(store, own, value))
         return false;
@@ -230,18 +239,22 @@ int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueV
     // Slots are fetched many at a time, or the window would go to and fro between the list and the records.
     constexpr uint32_t most = 2048;
     CellOffset offsets[most];
+    int32_t missing = list.whole ? no_value : unreadable_value;
     uint32_t position = 0;
     while (position < list.count) {
         const uint32_t count = values_at(store, list, position, offsets, most);
-        for (uint32_t i = 0; i < count; i++) {
-            if (read_value(store, offsets[i], value) && value_is_named(store, value, name))
-                return static_cast<int32_t>(position + i);
-        }
         if (count == 0)
-            break;
+            return unreadable_value;
+        for (uint32_t i = 0; i < count; i++) {
+            const Named named = compare_value(store, offsets[i], name, value);
+            if (named == Named::so)
+                return static_cast<int32_t>(position + i);
+            if (named == Named::unreadable)
+                missing = unreadable_value;
+        }
         position += count;
     }
-    return -1;
+    return missing;
 }
 
 // A new value, in turn: its data cell, its record, its slot in the list (in a longer copy of the list, where that has no
@@ -253,7 +266,11 @@ Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const Ne
         (list.count > 0 && !is_own_cell(store, list.cell.offset)))
         return Stored::failed;
     ValueView old;
-    if (find_value(store, list, value.name, old) >= 0) {
+    const int32_t position = find_value(store, list, value.name, old);
+    // Where a record cannot be read, the name may be there already.
+    if (position == unreadable_value)
+        return Stored::failed;
+    if (position >= 0) {
         return raise_maxima(store, key_offset, key, 0, value.size) && replace_value(store, old, value)
                    ? Stored::replaced
                    : Stored::failed;

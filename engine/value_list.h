@@ -20,7 +20,10 @@ ValueList find_value_list(Store& store, const KeyRecord& key);
 CellOffset value_at(Store& store, const ValueList& list, uint32_t i);
 // The offsets of up to most value records from the i-th on; returns how many were read.
 uint32_t values_at(Store& store, const ValueList& list, uint32_t i, CellOffset* offsets, uint32_t most);
-// Position of the value of that name, -1 when there is none.
+constexpr int32_t no_value = -1;
+constexpr int32_t unreadable_value = -2;
+// Position of the value of that name; no_value when there is none, unreadable_value when there may be one among records
+// that cannot be read.
 int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value);
 
 struct NewValue {
