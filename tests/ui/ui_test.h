@@ -7,7 +7,11 @@
 
 #include "application.h"
 
+#include <QAbstractScrollArea>
+#include <QAction>
 #include <QApplication>
+#include <QContextMenuEvent>
+#include <QMenu>
 #include <QMessageBox>
 #include <QPointer>
 #include <QPushButton>
@@ -77,6 +81,37 @@ private:
     QPointer<QWidget> m_answered;
     std::deque<Step> m_steps;
 };
+
+// Opens the context menu of a view at a point of its viewport, hands it to `act` and closes it; false when no
+// menu came.
+inline bool with_context_menu(QAbstractScrollArea& view, QPoint point,
+                              const std::function<void(QMenu&)>& act) {
+    bool shown = false;
+    QTimer timer;
+    QObject::connect(&timer, &QTimer::timeout, &timer, [&] {
+        auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+        if (!menu) {
+            return;
+        }
+        timer.stop();
+        shown = true;
+        act(*menu);
+        menu->close();
+    });
+    timer.start(1);
+    QContextMenuEvent event(QContextMenuEvent::Mouse, point, view.viewport()->mapToGlobal(point));
+    QCoreApplication::sendEvent(view.viewport(), &event);
+    return shown;
+}
+
+// The texts of a menu; "-" for a separator.
+inline QStringList texts_of(const QMenu& menu) {
+    QStringList texts;
+    for (const QAction* action : menu.actions()) {
+        texts.append(action->isSeparator() ? QStringLiteral("-") : action->text());
+    }
+    return texts;
+}
 
 // The widget of a type below `parent` whose text is `text`.
 template <typename Widget>

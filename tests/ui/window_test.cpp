@@ -4,7 +4,7 @@
 // keys.
 
 #include "failure_report.h"
-#include "scene.h"
+#include "stage.h"
 #include "shared_actions.h"
 #include "ui_test.h"
 #include "values_proxy_model.h"
@@ -21,15 +21,6 @@
 #include <QStyledItemDelegate>
 
 namespace {
-
-// The texts of a menu; "-" for a separator.
-QStringList texts_of(const QMenu& menu) {
-    QStringList texts;
-    for (const QAction* action : menu.actions()) {
-        texts.append(action->isSeparator() ? QStringLiteral("-") : action->text());
-    }
-    return texts;
-}
 
 QMenu* menu_of(const QWidget& bar_or_menu, const QString& title) {
     for (QAction* action : bar_or_menu.actions()) {
@@ -388,8 +379,8 @@ void WindowTest::columns_start_wide_enough() {
 }
 
 void WindowTest::a_damaged_key_is_told_once_and_its_siblings_stay() {
-    const Scene scene;
-    scene.damage_key("Leaf");
+    Scene scene;
+    scene.damage_key("Alpha\\Leaf");
     const QByteArray before = scene.bytes();
     Stage stage(scene);
     const QModelIndex alpha = stage.model->index(0, 0, stage.key(QStringLiteral("MACHINE\\SYSTEM")));

@@ -4,6 +4,7 @@
 
 // A small hive of every kind of value, and the program's window over it.
 
+#include "hive_bytes.h"
 #include "keys_view.h"
 #include "main_window.h"
 #include "reg_model.h"
@@ -14,7 +15,7 @@
 
 #include <memory>
 
-// A hive file of one root key, laid out byte by byte; the tree below it is made through the key objects.
+// A hive file that the engine had no hand in.
 //
 //   SYSTEM            mounted as MACHINE/SYSTEM
 //     Alpha           depth 2; one value of each kind, no default value
@@ -28,11 +29,15 @@ public:
     Scene();
 
     QString file() const { return m_directory.filePath(QStringLiteral("hive")); }
-    // Overwrites the signature of the record of a key, of which there must be one only.
-    void damage_key(const QByteArray& name) const;
+    // Writes the file anew with the signature of one key's record overwritten.
+    void damage_key(const std::string& path);
     QByteArray bytes() const;
+    testkit::Bytes file_bytes() const;
 
 private:
+    void write(const testkit::Bytes& all) const;
+
+    testkit::LaidHive m_laid;
     QTemporaryDir m_directory;
 };
 
@@ -52,6 +57,8 @@ public:
     // The names of the shown values, top to bottom.
     QStringList value_names() const;
     QStringList subkeys(const QString& path) const;
+    // The keyboard back to a view after a dialog: the offscreen platform activates no window by itself.
+    void return_to(QWidget& view);
     void press_in_editor(const QString& text, Qt::Key key) const;
 
     // In the order of the program's entry: the model goes before the window.

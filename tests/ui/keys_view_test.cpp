@@ -1,0 +1,301 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+// The key tree: its context menu, and keys made, named, renamed and deleted through the shared actions.
+
+#include "hive_reader.h"
+#include "stage.h"
+#include "shared_actions.h"
+#include "ui_test.h"
+
+#include <QLineEdit>
+
+namespace {
+
+const QString alpha = QStringLiteral("MACHINE\\SYSTEM\\Alpha");
+
+QString joined(const QStringList& names) {
+    return names.join(QLatin1Char(' '));
+}
+
+// The subkeys of a path below the hive's root as they stand in the file, read without the program.
+QString subkeys_in_file(const Scene& scene, const char* path) {
+    const testkit::Hive hive = testkit::read_hive(scene.file_bytes());
+    const testkit::Key* key = hive.find(std::string(path));
+    QStringList names;
+    for (const testkit::Key& child : key->children) {
+        names.append(QString::fromStdU16String(child.name));
+    }
+    return joined(names);
+}
+
+} // namespace
+
+class KeysViewTest : public QObject {
+    Q_OBJECT
+
+private slots:
+    void the_context_menu_of_a_key();
+    void no_context_menu_below_the_last_key();
+    void a_new_key_is_named_in_place();
+    void a_new_key_keeps_its_proposed_name();
+    void a_key_that_cannot_be_made_changes_nothing();
+    void a_new_key_needs_no_focus();
+    void deletion_asks_data();
+    void deletion_asks();
+    void closing_the_question_deletes_nothing();
+    void a_branch_is_deleted_with_all_below();
+    void a_refused_deletion_is_told_and_changes_nothing();
+    void a_rename_in_place();
+    void an_escaped_rename_writes_nothing();
+    void a_rename_to_a_sibling_s_name_is_told();
+    void actions_of_the_other_view_do_nothing_here();
+};
+
+void KeysViewTest::the_context_menu_of_a_key() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha);
+    bool shown =
+        with_context_menu(*stage.keys, stage.keys->visualRect(stage.key(alpha)).center(), [](QMenu& menu) {
+            QCOMPARE(joined(texts_of(menu)), QStringLiteral("New Delete Rename"));
+            QCOMPARE(menu.actions()[0]->menu()->actions(), QList<QAction*>{shared_actions().new_key_action});
+            QCOMPARE(menu.actions()[1], shared_actions().delete_action);
+            QCOMPARE(menu.actions()[2], shared_actions().rename_action);
+            QCOMPARE(menu.parentWidget(), nullptr);
+        });
+    QVERIFY(shown);
+}
+
+void KeysViewTest::no_context_menu_below_the_last_key() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(QStringLiteral("MACHINE"));
+    const QPoint below(20, stage.keys->viewport()->height() - 5);
+    QVERIFY(!stage.keys->indexAt(below).isValid());
+    QVERIFY(!with_context_menu(*stage.keys, below, [](QMenu&) {}));
+}
+
+void KeysViewTest::a_new_key_is_named_in_place() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha);
+    stage.keys->setFocus();
+    shared_actions().new_key_action->trigger();
+    QCOMPARE(joined(stage.subkeys(alpha)), QStringLiteral("Deep Leaf New Key #1 Zeta"));
+    QCOMPARE(stage.keys->currentIndex(), stage.key(alpha + QStringLiteral("\\New Key #1")));
+    QCOMPARE(qobject_cast<QLineEdit*>(QApplication::focusWidget())->text(), QStringLiteral("New Key #1"));
+    stage.press_in_editor(QStringLiteral("aaa"), Qt::Key_Return);
+    QTRY_COMPARE(joined(stage.subkeys(alpha)), QStringLiteral("aaa Deep Leaf Zeta"));
+    QTRY_COMPARE(stage.keys->currentIndex(), stage.key(alpha + QStringLiteral("\\aaa")));
+    QCOMPARE(stage.status(), alpha + QStringLiteral("\\aaa"));
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("aaa Deep Leaf Zeta"));
+}
+
+void KeysViewTest::a_new_key_keeps_its_proposed_name() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha);
+    shared_actions().new_key_action->trigger();
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+    QTRY_VERIFY(!qobject_cast<QLineEdit*>(QApplication::focusWidget()));
+    stage.select_key(alpha);
+    shared_actions().new_key_action->trigger();
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Escape);
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Deep Leaf New Key #1 New Key #2 Zeta"));
+}
+
+void KeysViewTest::a_key_that_cannot_be_made_changes_nothing() {
+    const Scene scene;
+    Stage stage(scene);
+    // Directly below a hive's root none can be made; the action is disabled there, the slot refuses as well.
+    stage.select_key(QStringLiteral("MACHINE\\SYSTEM"));
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    hand.then_press(QMessageBox::Ok);
+    stage.keys->run_new_key_action(false);
+    QVERIFY(hand.is_done());
+    QCOMPARE(hand.icon, QMessageBox::Critical);
+    QCOMPARE(hand.title, QStringLiteral("Registry Editor"));
+    QCOMPARE(hand.text, QStringLiteral("The key could not be created."));
+    QCOMPARE(stage.keys->currentIndex(), stage.key(QStringLiteral("MACHINE\\SYSTEM")));
+    QVERIFY(!stage.keys->findChild<QLineEdit*>());
+    QCOMPARE(scene.bytes(), before);
+}
+
+void KeysViewTest::a_new_key_needs_no_focus() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha);
+    stage.values->setFocus();
+    shared_actions().new_key_action->trigger();
+    QCOMPARE(joined(stage.subkeys(alpha)), QStringLiteral("Deep Leaf New Key #1 Zeta"));
+}
+
+void KeysViewTest::deletion_asks_data() {
+    QTest::addColumn<QMessageBox::StandardButton>("answer");
+    QTest::addColumn<QString>("left");
+    QTest::newRow("yes") << QMessageBox::Yes << "Deep Zeta";
+    QTest::newRow("no") << QMessageBox::No << "Deep Leaf Zeta";
+}
+
+void KeysViewTest::deletion_asks() {
+    QFETCH(QMessageBox::StandardButton, answer);
+    QFETCH(QString, left);
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    stage.keys->setFocus();
+    DialogHand hand;
+    hand.then_press(answer);
+    QTest::keyClick(stage.keys, Qt::Key_Delete);
+    QVERIFY(hand.is_done());
+    QCOMPARE(hand.icon, QMessageBox::Question);
+    QCOMPARE(hand.title, QStringLiteral("Confirm Key Removal"));
+    QCOMPARE(hand.text, QStringLiteral("Are you sure you want to delete this key and its subkeys?"));
+    QCOMPARE(hand.parent, stage.keys);
+    QCOMPARE(hand.buttons, QMessageBox::Yes | QMessageBox::No);
+    QCOMPARE(joined(stage.subkeys(alpha)), left);
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), left);
+    QVERIFY(stage.keys->currentIndex().isValid());
+    QCOMPARE(stage.status(), answer == QMessageBox::Yes ? alpha + QStringLiteral("\\Zeta")
+                                                        : alpha + QStringLiteral("\\Leaf"));
+}
+
+void KeysViewTest::closing_the_question_deletes_nothing() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    stage.keys->setFocus();
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    hand.then([](QWidget* dialog) { QTest::keyClick(dialog, Qt::Key_Escape); });
+    shared_actions().delete_action->trigger();
+    QVERIFY(hand.is_done());
+    QCOMPARE(scene.bytes(), before);
+}
+
+void KeysViewTest::a_branch_is_deleted_with_all_below() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.keys->expandAll();
+    stage.select_key(alpha + QStringLiteral("\\Deep"));
+    stage.keys->setFocus();
+    DialogHand hand;
+    hand.then_press(QMessageBox::Yes);
+    shared_actions().delete_action->trigger();
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Leaf Zeta"));
+    // The last key of a branch leaves its parent current.
+    for (int i = 0; i < 2; ++i) {
+        stage.return_to(*stage.keys);
+        stage.keys->setCurrentIndex(stage.model->index(0, 0, stage.key(alpha)));
+        hand.then_press(QMessageBox::Yes);
+        shared_actions().delete_action->trigger();
+        QVERIFY(hand.is_done());
+    }
+    QCOMPARE(stage.keys->currentIndex(), stage.key(alpha));
+    QCOMPARE(stage.status(), alpha);
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QString());
+}
+
+void KeysViewTest::a_refused_deletion_is_told_and_changes_nothing() {
+    Scene scene;
+    scene.damage_key("Alpha\\Deep\\Deeper");
+    Stage stage(scene);
+    const QModelIndex deep = stage.key(alpha + QStringLiteral("\\Deep"));
+    stage.keys->setCurrentIndex(deep);
+    stage.keys->setFocus();
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    hand.then_press(QMessageBox::Yes).then_press(QMessageBox::Ok);
+    shared_actions().delete_action->trigger();
+    QTRY_VERIFY(hand.is_done());
+    QCOMPARE(hand.icon, QMessageBox::Critical);
+    QCOMPARE(hand.text, QStringLiteral("The key could not be deleted."));
+    QCOMPARE(joined(stage.subkeys(alpha)), QStringLiteral("Deep Leaf Zeta"));
+    QCOMPARE(stage.keys->currentIndex(), stage.key(alpha + QStringLiteral("\\Deep")));
+    QCOMPARE(stage.values->model()->rowCount(), 3);
+    QCOMPARE(scene.bytes(), before);
+
+    // And the next gesture works.
+    stage.return_to(*stage.keys);
+    stage.select_key(alpha + QStringLiteral("\\Zeta"));
+    hand.then_press(QMessageBox::Yes);
+    shared_actions().delete_action->trigger();
+    QCOMPARE(joined(stage.subkeys(alpha)), QStringLiteral("Deep Leaf"));
+}
+
+void KeysViewTest::a_rename_in_place() {
+    const Scene scene;
+    Stage stage(scene);
+    for (const char* name : {"Lead", "zz", "AA"}) {
+        const QString old_name = stage.keys->currentIndex().parent() == stage.key(alpha)
+                                     ? stage.keys->currentIndex().data(Qt::DisplayRole).toString()
+                                     : QStringLiteral("Leaf");
+        stage.select_key(alpha + QLatin1Char('\\') + old_name);
+        stage.keys->setFocus();
+        shared_actions().rename_action->trigger();
+        stage.press_in_editor(QString::fromLatin1(name), Qt::Key_Return);
+        QTRY_COMPARE(stage.keys->currentIndex().data(Qt::DisplayRole).toString(), QString::fromLatin1(name));
+        QTRY_VERIFY(stage.keys->hasFocus());
+    }
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("AA Deep Zeta"));
+    QCOMPARE(stage.keys->selectionModel()->selectedIndexes(), QModelIndexList{stage.keys->currentIndex()});
+}
+
+void KeysViewTest::an_escaped_rename_writes_nothing() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    stage.keys->setFocus();
+    const QByteArray before = scene.bytes();
+    QTest::keyClick(stage.keys, Qt::Key_F2);
+    stage.press_in_editor(QStringLiteral("other"), Qt::Key_Escape);
+    QTRY_VERIFY(stage.keys->hasFocus());
+    QCOMPARE(scene.bytes(), before);
+    // Confirmed unchanged, nothing is written either.
+    shared_actions().rename_action->trigger();
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Return);
+    QTRY_VERIFY(stage.keys->hasFocus());
+    QCOMPARE(scene.bytes(), before);
+}
+
+void KeysViewTest::a_rename_to_a_sibling_s_name_is_told() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    stage.keys->setFocus();
+    const QByteArray before = scene.bytes();
+    shared_actions().rename_action->trigger();
+    DialogHand hand;
+    hand.then_press(QMessageBox::Ok);
+    stage.press_in_editor(QStringLiteral("zeta"), Qt::Key_Return);
+    QTRY_VERIFY(hand.is_done());
+    QCOMPARE(hand.text, QStringLiteral("The specified key name already exists."));
+    QCOMPARE(hand.parent, &stage.window);
+    QTRY_VERIFY(!QApplication::activeModalWidget());
+    QTRY_VERIFY(!stage.keys->findChild<QLineEdit*>());
+    QCOMPARE(joined(stage.subkeys(alpha)), QStringLiteral("Deep Leaf Zeta"));
+    QCOMPARE(scene.bytes(), before);
+}
+
+void KeysViewTest::actions_of_the_other_view_do_nothing_here() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    // Nothing is selected in the table, so there is nothing to ask about there.
+    stage.values->setFocus();
+    QVERIFY(stage.values->hasFocus());
+    stage.values->setCurrentIndex(QModelIndex());
+    const QByteArray before = scene.bytes();
+    shared_actions().delete_action->setEnabled(true);
+    shared_actions().rename_action->setEnabled(true);
+    shared_actions().delete_action->trigger();
+    shared_actions().rename_action->trigger();
+    QCoreApplication::processEvents();
+    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    QVERIFY(!stage.keys->findChild<QLineEdit*>());
+    QCOMPARE(scene.bytes(), before);
+}
+
+UI_TEST_MAIN(KeysViewTest)
+#include "keys_view_test.moc"
