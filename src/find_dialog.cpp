@@ -24,9 +24,13 @@ bool ask_find_request(FindRequest& request) {
     keys_box->setChecked(request.mode.testFlag(RegModel::FindKeys));
     auto* values_box = new QCheckBox(QCoreApplication::translate("MainWindow", "Find values"));
     values_box->setChecked(request.mode.testFlag(RegModel::FindValues));
-    auto* substring_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Find substring"));
-    auto* whole_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Find whole string"));
-    auto* wildcard_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Use wildcards"));
+    // Children of the dialog from the start: only among siblings does checking one uncheck the others.
+    auto* substring_button =
+        new QRadioButton(QCoreApplication::translate("MainWindow", "Find substring"), &dialog);
+    auto* whole_button =
+        new QRadioButton(QCoreApplication::translate("MainWindow", "Find whole string"), &dialog);
+    auto* wildcard_button =
+        new QRadioButton(QCoreApplication::translate("MainWindow", "Use wildcards"), &dialog);
     substring_button->setChecked(true);
     if (request.flags == Qt::MatchFixedString) {
         whole_button->setChecked(true);
@@ -38,9 +42,9 @@ bool ask_find_request(FindRequest& request) {
     QObject::connect(buttons, &QDialogButtonBox::rejected, &dialog, &QDialog::reject);
 
     auto* layout = new QVBoxLayout(&dialog);
-    for (QWidget* widget : std::initializer_list<QWidget*>{term_label, term_edit, keys_box, values_box,
-                                                           substring_button, whole_button, wildcard_button,
-                                                           buttons}) {
+    for (QWidget* widget :
+         std::initializer_list<QWidget*>{term_label, term_edit, keys_box, values_box, substring_button,
+                                         whole_button, wildcard_button, buttons}) {
         layout->addWidget(widget);
     }
     // The layout's own minimum first, so that the height which is then fixed is the one that the dialog has.
