@@ -52,6 +52,9 @@ Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
     if (!QIcon::hasThemeIcon(QStringLiteral("folder"))) {
         QIcon::setThemeName(QStringLiteral("Adwaita"));
     }
+    // Where no theme is installed either, the share directory's own folder.png shows. Only from here on: with it the
+    // question above would always be answered with yes.
+    QIcon::setFallbackSearchPaths(QIcon::fallbackSearchPaths() << share_directory);
 }
 
 bool Application::notify(QObject* receiver, QEvent* event) {

@@ -1,8 +1,8 @@
 #!/usr/bin/env python3
 # SPDX-FileCopyrightText: 2026 The tallowfen developers
 # SPDX-License-Identifier: MIT
-"""Draws the bitmaps that are kept beside their SVG sources: the two .ico files of the values table and the program's
-own icon in the sizes of the hicolor theme. Run it by hand after a change to a drawing; it needs rsvg-convert."""
+"""Draws the bitmaps that are kept beside their SVG sources: the two .ico files of the values table, the folder
+of the key tree, and the program's own icon in the sizes of the hicolor theme. Run it by hand after a change to a drawing; it needs rsvg-convert."""
 
 import pathlib
 import struct
@@ -34,6 +34,7 @@ def main():
     for name in ("type_string", "type_binary"):
         pictures = [(size, png(HERE / f"{name}.svg", size)) for size in ICO_SIZES]
         (HERE / f"{name}.ico").write_bytes(ico(pictures))
+    (HERE / "folder.png").write_bytes(png(HERE / "folder.svg", 48))
     for size in THEME_SIZES:
         (PROGRAM_ICON.parent / f"{size}x{size}.png").write_bytes(png(PROGRAM_ICON, size))
 

@@ -33,7 +33,7 @@ def common_files():
 
 def share_files(source):
     """Names in the share directory."""
-    return {"type_string.ico", "type_binary.ico"} | {f"tallowfen_{name}.qm" for name in locales(source)}
+    return {"type_string.ico", "type_binary.ico", "folder.png"} | {f"tallowfen_{name}.qm" for name in locales(source)}
 
 
 def present(top):
