@@ -381,7 +381,14 @@ class Program:
 
     def pick(self, *path):
         """Picks an item of the menu bar with the mouse."""
-        self._pick_below(self.find(None, kind="menu bar"), path)
+        menu = self.find(None, kind="menu bar")
+        for i, text in enumerate(path):
+            item = self._enabled_item(menu, text)
+            until(lambda: has(item, State.SHOWING) and place(item)[2] > 1, f"the menu item {text!r} to show")
+            self.click(item)
+            if i + 1 < len(path):
+                menu = self._popup(item)
+                until(lambda: has(menu, State.SHOWING), f"the menu {text!r} to open")
 
     def context_menu(self):
         """The context menu that is open."""
@@ -394,28 +401,47 @@ class Program:
 
         return until(look, "a context menu")
 
-    def context_items(self, *path):
-        menu = self.context_menu()
-        for text in path:
-            menu = self._popup(self._item(menu, text))
-        return self._items(menu)
+    def context_items(self):
+        """The texts of the open context menu; None for a separator."""
+        return self._texts(self.context_menu())
+
+    def _texts(self, menu):
+        return [item.text if item else None for item in self._items(menu)]
 
     def pick_context(self, *path):
-        """Picks an item of the open context menu with the mouse."""
-        menu = self.context_menu()
-        self._pick_below(menu, path)
-        self.gone(menu)
+        """Picks an item of the open context menu with the mouse; gives the texts of each menu on the way.
 
-    def _pick_below(self, menu, path):
+        An action that stands in the menu bar as well is on the bus only as that item, with that place. So the place
+        in a context menu is counted: its first item is always the menu's own, and all are of one height.
+        """
+        first = menu = self.context_menu()
+        height = until(lambda: place(children(menu)[0])[3], "the height of a menu item")
+        seen = []
         for i, text in enumerate(path):
-            item = until(lambda: self._item(menu, text), f"the menu item {text!r}")
-            until(lambda: has(item, State.SHOWING) and place(item)[2] > 1, f"the menu item {text!r} to show")
-            if not has(item, State.ENABLED):
-                raise Failure(f"the menu item {text!r} is greyed")
-            self.click(item)
+            self._enabled_item(menu, text)
+            texts = self._texts(menu)
+            seen.append(texts)
+            self.click(self._point_in_menu(menu, texts, text, height))
             if i + 1 < len(path):
-                menu = self._popup(item)
-                until(lambda: has(menu, State.SHOWING), f"the menu {text!r} to open")
+                menu = self._popup(self._item(menu, text))
+                until(lambda: has(menu, State.SHOWING) and place(menu)[3] >= height, f"the menu {text!r} to open")
+        self.gone(first)
+        return seen
+
+    @staticmethod
+    def _point_in_menu(menu, texts, text, height):
+        x, y, width, whole = place(menu)
+        separators = texts.count(None)
+        gap = (whole - (len(texts) - separators) * height) // separators if separators else 0
+        above = texts[: texts.index(text)]
+        y += sum(gap if each is None else height for each in above) + height // 2
+        return x + width // 2, y
+
+    def _enabled_item(self, menu, text):
+        item = until(lambda: self._item(menu, text), f"the menu item {text!r}")
+        if not has(item, State.ENABLED):
+            raise Failure(f"the menu item {text!r} is greyed")
+        return item
 
     # ---- acting ---------------------------------------------------------------------------------------------------
 

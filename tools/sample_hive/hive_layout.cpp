@@ -65,10 +65,9 @@ Bytes stored_name(const std::u16string& name) {
     return fits_8_bits(name) ? Bytes(name.begin(), name.end()) : utf16(name);
 }
 
-// Latin letters of the first 256 characters and Russian ones: all that the sample's names hold.
+// Latin letters of the first 256 characters: the sample's other names have no lower case.
 char16_t upper(char16_t unit) {
-    const bool lower = (unit >= u'a' && unit <= u'z') || (unit >= 0xE0 && unit <= 0xFE && unit != 0xF7) ||
-                       (unit >= 0x430 && unit <= 0x44F);
+    const bool lower = (unit >= u'a' && unit <= u'z') || (unit >= 0xE0 && unit <= 0xFE && unit != 0xF7);
     return lower ? static_cast<char16_t>(unit - 0x20) : unit;
 }
 

@@ -6,6 +6,8 @@
 #include "hive_layout.h"
 
 #include <cstdio>
+#include <cstdlib>
+#include <utility>
 
 namespace {
 
@@ -104,7 +106,23 @@ void add_control(SampleKey& control_set, bool complete) {
         add_value_types(control);
         control.add(u"Lsa").set_dword("restrictanonymous", 0).add(u"JD").class_name = u"1a2b3c4d";
         control.add(u"Gr\u00FC\u00DFe").set_text("Kept in", u"eight bits a character");
-        control.add(u"\u041A\u043B\u044E\u0447").set_text("Kept in", u"UTF-16");
+        control.add(u"\u041A\u041B\u042E\u0427").set_text("Kept in", u"UTF-16");
+    }
+}
+
+void add_many(SampleKey& root, unsigned long count) {
+    constexpr unsigned long group_size = 1000;
+    SampleKey& many = root.add(u"Many");
+    many.subkeys.reserve(count / group_size + 1);
+    for (unsigned long i = 0; i < count; ++i) {
+        const auto digits = [](unsigned long number) {
+            const std::string text = std::to_string(group_size * group_size + number);
+            return std::u16string(text.begin(), text.end());
+        };
+        if (i % group_size == 0) {
+            many.add(u"Group " + digits(i / group_size)).subkeys.reserve(group_size);
+        }
+        many.subkeys.back().add(u"Key " + digits(i)).set_dword("Number", static_cast<std::uint32_t>(i));
     }
 }
 
@@ -140,11 +158,15 @@ bool write_file(const char* path, const std::vector<std::uint8_t>& bytes) {
 } // namespace
 
 int main(int argc, char** argv) {
-    if (argc != 2) {
-        std::fputs("usage: make_sample_hive FILE\n", stderr);
+    if (argc != 2 && argc != 3) {
+        std::fputs("usage: make_sample_hive FILE [KEYS]\n", stderr);
         return 1;
     }
-    if (!write_file(argv[1], lay_out_hive(sample_tree(), u"SYSTEM"))) {
+    SampleKey root = sample_tree();
+    if (argc == 3) {
+        add_many(root, std::strtoul(argv[2], nullptr, 10));
+    }
+    if (!write_file(argv[1], lay_out_hive(std::move(root), u"SYSTEM"))) {
         std::perror(argv[1]);
         return 1;
     }
