@@ -97,7 +97,7 @@ void MainWindow::show_find_result() {
         search_dialog = nullptr;
     }
     if (!failure.isEmpty()) {
-        can_find_next = false;
+        // "Find next" goes on behind the key that threw.
         QMessageBox::critical(this, QCoreApplication::applicationName(),
                               tr("The search could not go on: %1").arg(failure), QMessageBox::Ok);
         return;

@@ -3,8 +3,8 @@
 // The key tree: its context menu, and keys made, named, renamed and deleted through the shared actions.
 
 #include "hive_reader.h"
-#include "stage.h"
 #include "shared_actions.h"
+#include "stage.h"
 #include "ui_test.h"
 
 #include <QLineEdit>

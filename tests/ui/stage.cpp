@@ -75,7 +75,7 @@ QByteArray Scene::bytes() const {
     return in.readAll();
 }
 
-Stage::Stage(const Scene& scene) : model(std::make_unique<RegModel>()) {
+Stage::Stage(const Scene& scene, std::unique_ptr<RegModel> key_model) : model(std::move(key_model)) {
     window.resize(640, 480);
     model->add_hive(QStringLiteral("MACHINE/SYSTEM"), scene.file());
     window.set_model(model.get());

@@ -44,7 +44,7 @@ private:
 // The window over a scene, shown and active, as the program's entry makes it.
 class Stage {
 public:
-    explicit Stage(const Scene& scene);
+    explicit Stage(const Scene& scene, std::unique_ptr<RegModel> key_model = std::make_unique<RegModel>());
 
     // The key at a path of names below the invisible root; fails the test when there is none.
     QModelIndex key(const QString& path) const;

@@ -20,6 +20,7 @@
 
 #include <deque>
 #include <functional>
+#include <utility>
 
 // Answers the modal dialogs that open one after the other, each by the next step, from inside its event loop.
 class DialogHand {
@@ -31,8 +32,14 @@ public:
         m_timer.start(1);
     }
 
+    // The "Searching..." dialog, which comes and goes by itself, is left to then_while_searching.
     DialogHand& then(Step step) {
-        m_steps.push_back(std::move(step));
+        m_steps.push_back({std::move(step), false});
+        return *this;
+    }
+
+    DialogHand& then_while_searching(Step step) {
+        m_steps.push_back({std::move(step), true});
         return *this;
     }
 
@@ -65,8 +72,12 @@ private:
         if (m_steps.empty() || !dialog || !dialog->isVisible() || dialog == m_answered) {
             return;
         }
+        const bool is_searching = dialog->accessibleName() == QStringLiteral("Searching...");
+        if (is_searching != m_steps.front().second) {
+            return;
+        }
         m_answered = dialog;
-        const Step step = std::move(m_steps.front());
+        const Step step = std::move(m_steps.front().first);
         m_steps.pop_front();
         // Not from inside the timer's own event: a step may open the next dialog before it returns.
         const QPointer<QWidget> shown = dialog;
@@ -79,7 +90,7 @@ private:
 
     QTimer m_timer;
     QPointer<QWidget> m_answered;
-    std::deque<Step> m_steps;
+    std::deque<std::pair<Step, bool>> m_steps; // and whether it is for the search's dialog
 };
 
 // Opens the context menu of a view at a point of its viewport, hands it to `act` and closes it; false when no

@@ -3,8 +3,8 @@
 // The values table: which editor opens for which data, values made, named and deleted, and the context menus.
 
 #include "reg_key.h"
-#include "stage.h"
 #include "shared_actions.h"
+#include "stage.h"
 #include "ui_test.h"
 
 #include <QDialogButtonBox>

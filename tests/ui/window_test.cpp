@@ -4,8 +4,8 @@
 // keys.
 
 #include "failure_report.h"
-#include "stage.h"
 #include "shared_actions.h"
+#include "stage.h"
 #include "ui_test.h"
 #include "values_proxy_model.h"
 
