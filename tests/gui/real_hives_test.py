@@ -17,13 +17,13 @@ def simple(text):
 
 
 def choose_key(state):
-    """The first key, three below the root, that has values and siblings and can be reached by plain names."""
+    """The first key, two or three below the root, with values, plain names on its way and few neighbours."""
     for path, values in state.items():
-        if len(path) == 3 and 2 <= len(values) <= LARGEST_TABLE and all(map(simple, path)):
-            siblings = [each for each in state if len(each) == 3 and each[:2] == path[:2]]
-            uncles = [each for each in state if len(each) == 2 and each[:1] == path[:1]]
-            if len(siblings) < 40 and len(uncles) < 40:
-                return list(path)
+        if len(path) not in (2, 3) or not 2 <= len(values) <= LARGEST_TABLE or not all(map(simple, path)):
+            continue
+        levels = [below(state, path[:depth]) for depth in range(len(path) + 1)]
+        if sum(map(len, levels)) < 120 and len({each.lower() for each in levels[-1]}) == len(levels[-1]):
+            return list(path)
     raise AssertionError("no key to try the gestures on")
 
 
