@@ -1,0 +1,243 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+
+// Renaming and deleting keys: what moves, what is freed, what is refused and then left alone.
+#include "scene.h"
+
+#include <gtest/gtest.h>
+
+using namespace testkit;
+
+namespace {
+
+HiveLayout tree() {
+    HiveLayout layout;
+    layout.security_records = 2;
+    KeyLayout& top = layout.root.add("Top");
+    KeyLayout& key = top.add("Middle");
+    key.class_name = u"Klass";
+    key.security = 1;
+    key.time = 0x1234;
+    for (const char* name : {"v1", "v2", "v3", "v4"})
+        key.set(name, 3, pattern(20));
+    key.add("Child1").add("Deep");
+    key.add("Child2");
+    top.add("Alone");
+    KeyLayout& full = top.add("Values");
+    for (const char* name : {"v1", "v2", "v3", "v4"})
+        full.set(name, 4, {1, 2, 3, 4});
+    return layout;
+}
+
+class Moving : public testing::Test {
+protected:
+    Moving() : scene(tree()) {}
+    Scene scene;
+};
+
+TEST_F(Moving, a_rename_changes_the_name_and_nothing_else) {
+    const Hive before = scene.Read();
+    EXPECT_EQ(scene.Rename("Top\\Middle", "zeta"), 0);
+    EXPECT_EQ(scene.Check(), "");
+    const Hive after = scene.Read();
+    EXPECT_EQ(after.find("Top\\Middle"), nullptr);
+    const Key* old_key = before.find("Top\\Middle");
+    const Key* key = after.find("Top\\zeta");
+    ASSERT_NE(key, nullptr);
+    EXPECT_EQ(key->name, u"zeta");
+    EXPECT_EQ(key->time, old_key->time);
+    EXPECT_EQ(key->flags, old_key->flags);
+    EXPECT_EQ(key->class_name, u"Klass");
+    EXPECT_EQ(key->security, old_key->security);
+    EXPECT_EQ(key->values.size(), 4U);
+    EXPECT_EQ(key->children.size(), 2U);
+    EXPECT_NE(after.find("Top\\zeta\\Child1\\Deep"), nullptr);
+}
+
+TEST_F(Moving, a_rename_to_every_place_among_the_siblings_keeps_the_order) {
+    for (const char* name : {"A", "az", "B", "Values2", "zz", "_", "[x", "Middle"}) {
+        const std::string present = utf8([&] {
+            const Hive hive = scene.Read();
+            for (const Key& key : hive.find("Top")->children)
+                if (!key.children.empty())
+                    return key.name;
+            return std::u16string();
+        }());
+        EXPECT_EQ(scene.Rename("Top\\" + present, name), 0) << name;
+        EXPECT_EQ(scene.Check(), "") << name;
+    }
+    EXPECT_EQ(scene.Changes(), std::vector<std::string>{});
+}
+
+struct Refused {
+    const char* rule;
+    const char* path;
+    const char* name;
+    int32_t status;
+};
+
+class RenameRefused : public testing::TestWithParam<Refused> {};
+
+TEST_P(RenameRefused, writes_nothing) {
+    Scene scene(tree());
+    EXPECT_EQ(scene.Rename(GetParam().path, GetParam().name), GetParam().status);
+    EXPECT_TRUE(scene.Untouched());
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Rows, RenameRefused,
+    testing::Values(Refused{"empty", "Top\\Middle", "", R_INVALID_PARAMETER},
+                    Refused{"a_backslash", "Top\\Middle", "a\\b", R_INVALID_PARAMETER},
+                    Refused{"a_siblings_name", "Top\\Middle", "Alone", R_FAILED},
+                    Refused{"a_siblings_name_in_other_case", "Top\\Middle", "aLONE", R_FAILED},
+                    Refused{"its_own_name", "Top\\Middle", "Middle", R_FAILED},
+                    Refused{"its_own_name_in_other_case", "Top\\Middle", "MIDDLE", R_FAILED}),
+    [](const auto& row) { return row.param.rule; });
+
+TEST_F(Moving, a_rename_past_the_end_gives_3_and_a_null_name_87) {
+    EXPECT_EQ(RRenameKey(scene.root(), 1, "x"), R_PATH_NOT_FOUND);
+    EXPECT_EQ(RRenameKey(scene.root(), none, "x"), R_PATH_NOT_FOUND);
+    EXPECT_EQ(RRenameKey(scene.root(), 0, nullptr), R_INVALID_PARAMETER);
+    EXPECT_TRUE(scene.Untouched());
+}
+
+TEST_F(Moving, a_key_named_in_utf16_is_renamed_to_a_name_in_8_bits) {
+    HiveLayout layout = tree();
+    layout.root.children[0].children[0].wide_name = true;
+    Scene other(layout);
+    Handle top = other.OpenKey("Top");
+    EXPECT_EQ(RRenameKey(top.get(), 1, "narrow"), 0);
+    EXPECT_EQ(other.Check(), "");
+    const Hive now = other.Read();
+    ASSERT_NE(now.find("Top\\narrow"), nullptr);
+    EXPECT_TRUE(now.find("Top\\narrow")->name_8bit);
+}
+
+TEST_F(Moving, a_rename_below_an_index_root_works_in_every_leaf_kind) {
+    for (Leaf leaf : {Leaf::fast, Leaf::hash, Leaf::plain}) {
+        HiveLayout layout;
+        KeyLayout& many = layout.root.add("many");
+        layout.leaf = leaf == Leaf::plain ? Leaf::hash : leaf;
+        many.own_leaf = true;
+        many.leaf = leaf;
+        many.per_leaf = 2;
+        for (const char* name : {"a", "c", "e", "g", "i", "k"})
+            many.add(name).add("below");
+        Scene other(layout);
+        for (const char* const* pair :
+             {(const char* const[]){"many\\a", "z"}, (const char* const[]){"many\\k", "b"},
+              (const char* const[]){"many\\e", "d"}}) {
+            EXPECT_EQ(other.Rename(pair[0], pair[1]), 0) << pair[0];
+            EXPECT_EQ(other.Check(), "") << pair[0];
+        }
+        EXPECT_NE(other.Read().find("many\\z\\below"), nullptr);
+    }
+}
+
+TEST_F(Moving, a_deletion_below_an_index_root_gives_3_and_writes_nothing) {
+    HiveLayout layout;
+    KeyLayout& many = layout.root.add("many");
+    many.per_leaf = 2;
+    for (const char* name : {"a", "b", "c"})
+        many.add(name).set("v", 4, {1, 2, 3, 4});
+    Scene other(layout);
+    EXPECT_EQ(other.Delete("many\\b"), R_PATH_NOT_FOUND);
+    EXPECT_TRUE(other.Untouched());
+}
+
+TEST_F(Moving, deleting_a_key_with_four_values_leaves_the_second_and_fourth_allocated) {
+    EXPECT_EQ(scene.Delete("Top\\Values"), 0);
+    EXPECT_EQ(scene.Check(2), "");
+    EXPECT_EQ(scene.Examine().leaks.values.size(), 2U);
+    EXPECT_EQ(scene.Read().find("Top\\Values"), nullptr);
+}
+
+class ValuesLeft : public testing::TestWithParam<size_t> {};
+
+TEST_P(ValuesLeft, is_half_rounded_down) {
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    KeyLayout& key = top.add("Key");
+    for (size_t i = 0; i < GetParam(); ++i)
+        key.set("v" + std::to_string(i), 4, {1, 2, 3, 4});
+    Scene scene(layout);
+    EXPECT_EQ(scene.Delete("Top\\Key"), 0);
+    EXPECT_EQ(scene.Check(GetParam() / 2), "");
+}
+
+INSTANTIATE_TEST_SUITE_P(Deleting, ValuesLeft, testing::Range(size_t{0}, size_t{8}));
+
+TEST_F(Moving, a_key_with_a_subkey_gives_145_and_nothing_changes) {
+    EXPECT_EQ(scene.Delete("Top\\Middle"), R_KEY_HAS_CHILDREN);
+    EXPECT_TRUE(scene.Untouched());
+}
+
+TEST_F(Moving, the_roots_handle_deletes_nothing) {
+    EXPECT_EQ(RDeleteKey(scene.root(), "Top\\Alone"), R_INVALID_HANDLE);
+    EXPECT_TRUE(scene.Untouched());
+}
+
+TEST_F(Moving, deleting_what_is_not_there_gives_3) {
+    EXPECT_EQ(scene.Delete("Top\\None"), R_PATH_NOT_FOUND);
+    Handle top = scene.OpenKey("Top");
+    EXPECT_EQ(RDeleteKey(top.get(), ""), R_PATH_NOT_FOUND);
+    EXPECT_EQ(RDeleteKey(top.get(), nullptr), R_PATH_NOT_FOUND);
+    EXPECT_TRUE(scene.Untouched());
+}
+
+TEST_F(Moving, a_deletion_by_a_longer_path_reaches_the_last_component) {
+    Handle top = scene.OpenKey("Top");
+    EXPECT_EQ(RDeleteKey(top.get(), "\\middle\\Child1\\DEEP"), 0);
+    EXPECT_EQ(scene.Changes(), (std::vector<std::string>{"- key Top\\Middle\\Child1\\Deep"}));
+    EXPECT_EQ(scene.Check(), "");
+}
+
+TEST_F(Moving, the_last_key_of_a_security_record_takes_it_along) {
+    HiveLayout layout;
+    layout.security_records = 3;
+    KeyLayout& top = layout.root.add("Top");
+    top.add("Other").security = 2;
+    top.add("Own").security = 1;
+    Scene other(layout);
+    EXPECT_EQ(other.Delete("Top\\Own"), 0);
+    EXPECT_EQ(other.Check(), "");
+    EXPECT_EQ(other.Delete("Top\\Other"), 0);
+    EXPECT_EQ(other.Check(), "");
+}
+
+TEST_F(Moving, a_tree_deleted_leaf_by_leaf_is_gone_and_its_place_can_be_used_again) {
+    for (const char* path : {"Top\\Middle\\Child1\\Deep", "Top\\Middle\\Child1", "Top\\Middle\\Child2"}) {
+        EXPECT_EQ(scene.Delete(path), 0) << path;
+        EXPECT_EQ(scene.Check(), "") << path;
+    }
+    EXPECT_EQ(scene.Delete("Top\\Middle"), 0);
+    EXPECT_EQ(scene.Check(2 + 4 + 1), ""); // every other record, the data cells, the class
+    EXPECT_EQ(scene.Create("Top\\Middle\\Child1"), 0);
+    EXPECT_EQ(scene.Check(2 + 4 + 1), "");
+}
+
+TEST_F(Moving, whether_a_tree_can_be_deleted_is_told_without_writing) {
+    Handle top = scene.OpenKey("Top");
+    EXPECT_EQ(RCheckDeleteTree(top.get(), 1), 0);
+    EXPECT_NE(RCheckDeleteTree(top.get(), 9), 0);
+    EXPECT_EQ(RCheckDeleteTree(scene.root(), 0), R_INVALID_HANDLE);
+    EXPECT_TRUE(scene.Untouched());
+}
+
+TEST_F(Moving, every_cut_of_a_rename_opens_and_keeps_what_it_did_not_name) {
+    scene.file().keep_cuts = true;
+    EXPECT_EQ(scene.Rename("Top\\Middle", "a longer name than before"), 0);
+    ASSERT_FALSE(scene.file().cuts.empty());
+    for (const Bytes& cut : scene.file().cuts) {
+        Scene stopped(cut);
+        ASSERT_TRUE(stopped.is_open());
+        EXPECT_TRUE(stopped.OpenKey("Top\\Alone"));
+        Handle values = stopped.OpenKey("Top\\Values");
+        ASSERT_TRUE(values);
+        EXPECT_EQ(RFindValueA(values.get(), "v4"), 3);
+        EXPECT_TRUE(stopped.OpenKey("Top\\Middle\\Child1\\Deep") ||
+                    stopped.OpenKey("Top\\a longer name than before\\Child1\\Deep"));
+    }
+}
+
+} // namespace
