@@ -139,7 +139,10 @@ bool build_bin_table(Store& store) {
     }
     store.bins_size = static_cast<int32_t>(bins_size);
     Cell cell;
-    return offset == bins_size && find_used_cell(store, store.root, cell) && cell.room() >= sizeof root;
+    if (offset != bins_size || !find_used_cell(store, store.root, cell) || cell.room() < sizeof root)
+        return false;
+    // The index that told the leaf kind must be a cell in use too, or the next value might be put over it.
+    return root.subkey_count == 0 || find_used_cell(store, store.root_index, cell);
 }
 
 }  // namespace
