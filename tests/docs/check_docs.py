@@ -31,7 +31,11 @@ class Repository:
         return sorted([*self.top.glob("*.md"), *(self.top / "docs").rglob("*.md")])
 
     def has(self, path):
-        return any(self.top.glob(path.rstrip("/"))) if "*" in path else (self.top / path).exists()
+        if "*" in path:
+            return any(self.top.glob(path.rstrip("/")))
+        # An empty folder is none: a clone does not have it.
+        file = self.top / path
+        return any(file.iterdir()) if file.is_dir() else file.exists()
 
 
 def code_blocks(text):
@@ -62,10 +66,19 @@ def link_problems(document, text):
 
 def path_problems(repository, text):
     for code in re.findall(r"`([^`\n]+)`", without_blocks(text)):
+        code = code.split()[0] if code.startswith("tools/") else code
         if " " not in code and code.split("/")[0] in FOLDERS and "/" in code and not repository.has(code):
             yield f"there is no {code}"
         if re.match(r"\./\w", code):
             yield from command_problems(repository, code)
+
+
+def label_problems(repository, text):
+    """Tables whose first column is headed "label" name labels of tests."""
+    table = re.search(r"^\| *label *\|.*\n(?:\|.*\n)+", text, re.M)
+    for label in re.findall(r"^\| *`(\w+)` *\|", table.group(0), re.M) if table else []:
+        if label not in repository.labels:
+            yield f"no test has the label {label}"
 
 
 def option_problems(repository, words):
@@ -100,6 +113,7 @@ def problems(repository, document):
     text = document.read_text(encoding="utf-8")
     yield from link_problems(document, text)
     yield from path_problems(repository, text)
+    yield from label_problems(repository, text)
     for language, lines in code_blocks(text):
         if language == "sh":
             for line in lines:

@@ -46,6 +46,9 @@ class Faults(unittest.TestCase):
         self.sound("`src/main.cpp` `src/*.cpp` `src/` `/mnt/x` `TOP/HIVE`")
         self.faulty("`src/gone.cpp`", "src/gone.cpp")
         self.faulty("`src/*.h`", "src/*.h")
+        (self.top / "tools").mkdir()
+        self.faulty("`tools/`", "tools/")
+        self.faulty("`tools/gone 1 2`", "tools/gone")
 
     def test_commands(self):
         self.sound("```sh\n./run A/B file  # comment\nsudo cat x\n```\n")
@@ -62,6 +65,8 @@ class Faults(unittest.TestCase):
 
     def test_labels(self):
         self.faulty("```sh\nctest -L gone\n```\n", "label gone")
+        self.sound("| label | where |\n|---|---|\n| `docs` | here |\n")
+        self.faulty("| label | where |\n|---|---|\n| `docs` | here |\n| `gone` | there |\n", "label gone")
 
     def test_block_inside_a_list(self):
         self.faulty("1. So:\n\n   ```sh\n   ./gone\n   ```\n", "./gone")
