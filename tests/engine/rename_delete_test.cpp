@@ -124,11 +124,11 @@ TEST_F(Moving, a_rename_below_an_index_root_works_in_every_leaf_kind) {
         for (const char* name : {"a", "c", "e", "g", "i", "k"})
             many.add(name).add("below");
         Scene other(layout);
-        for (const char* const* pair :
-             {(const char* const[]){"many\\a", "z"}, (const char* const[]){"many\\k", "b"},
-              (const char* const[]){"many\\e", "d"}}) {
-            EXPECT_EQ(other.Rename(pair[0], pair[1]), 0) << pair[0];
-            EXPECT_EQ(other.Check(), "") << pair[0];
+        const std::pair<const char*, const char*> renames[] = {
+            {"many\\a", "z"}, {"many\\k", "b"}, {"many\\e", "d"}};
+        for (const auto& [path, name] : renames) {
+            EXPECT_EQ(other.Rename(path, name), 0) << path;
+            EXPECT_EQ(other.Check(), "") << path;
         }
         EXPECT_NE(other.Read().find("many\\z\\below"), nullptr);
     }
