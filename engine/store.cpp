@@ -138,11 +138,10 @@ bool build_bin_table(Store& store) {
         offset = end;
     }
     store.bins_size = static_cast<int32_t>(bins_size);
+    // Root and index must be cells that their bins' walks come by, or the next value might be put over them.
     Cell cell;
-    if (offset != bins_size || !find_used_cell(store, store.root, cell) || cell.room() < sizeof root)
-        return false;
-    // The index that told the leaf kind must be a cell in use too, or the next value might be put over it.
-    return root.subkey_count == 0 || find_used_cell(store, store.root_index, cell);
+    return offset == bins_size && is_own_cell(store, store.root) && find_used_cell(store, store.root, cell) &&
+           cell.room() >= sizeof root && (root.subkey_count == 0 || is_own_cell(store, store.root_index));
 }
 
 }  // namespace
