@@ -63,7 +63,7 @@ void MainWindow::start_search(const QModelIndex& start, const QString& term) {
         key_model->begin_find(start);
         can_find_next = true;
     }
-    find_future = QtConcurrent::run(&RegModel::find, key_model, QVariant(term), find_mode, find_flags);
+    find_future = QtConcurrent::run(&RegModel::find, key_model.data(), QVariant(term), find_mode, find_flags);
     find_watcher.setFuture(find_future);
     search_dialog = make_searching_dialog(this);
     // Once it has run, the dialog is gone.
