@@ -70,7 +70,7 @@ public:
     const std::vector<std::string>& log() const { return log_; }
 
 private:
-    uint32_t below(uint32_t n) { return random_() % n; }
+    uint32_t below(uint32_t n) { return static_cast<uint32_t>(random_()) % n; }
 
     std::string name(uint32_t most) {
         static const std::string letters = "abcXYZ019_^`[]{} \xC4\xE4";
@@ -146,8 +146,8 @@ private:
         const std::string value = any(here_->values);
         log_.push_back("delete " + path_ + " : " + value);
         // The data cell of a removed value stays allocated, and the list's when no value is left.
-        leaks_ += here_->values[value].second.size() > inline_size ? 1 : 0;
-        leaks_ += here_->values.size() == 1 ? 1 : 0;
+        leaks_ += here_->values[value].second.size() > inline_size ? 1U : 0U;
+        leaks_ += here_->values.size() == 1 ? 1U : 0U;
         here_->values.erase(value);
         return scene_.DeleteValue(path_, value);
     }
@@ -175,7 +175,7 @@ private:
         // Every other value record of a deleted key stays allocated, and all of its data cells.
         leaks_ += gone.values.size() / 2;
         for (const auto& [value, content] : gone.values)
-            leaks_ += content.second.size() > inline_size ? 1 : 0;
+            leaks_ += content.second.size() > inline_size ? 1U : 0U;
         here_->keys.erase(child);
         return status;
     }
