@@ -4,8 +4,8 @@
 import os
 import subprocess
 
-from desktop import Program, until
-from session import PROGRAM, Session, equal, make_sample, run, step
+from desktop import Program, descendants, name, role, until
+from session import PICTURES, PROGRAM, Session, equal, make_sample, run, step
 
 HIBERNATED = (
     "Your system is in hibernate mode. Therefore the registry cannot be edited. Please restart your system and exit "
@@ -103,8 +103,6 @@ def hibernated(scratch):
         try:
             box = program.dialog("Hibernation Detected")
             until(lambda: HIBERNATED in program.labels(box), "the box's text")
-            from session import PICTURES
-
             program.picture(os.path.join(PICTURES, "hibernated.png"), box)
             equal([each for each in ("OK", "Cancel") if has_button(program, box, each)], ["OK"], "its buttons")
             program.click(program.button(box, "OK"))
@@ -114,8 +112,6 @@ def hibernated(scratch):
 
 
 def has_button(program, box, text):
-    from desktop import descendants, name, role
-
     return any(role(each) == "push button" and name(each).replace("&", "") == text for each in descendants(box))
 
 

@@ -228,7 +228,7 @@ class Program:
 
     def fields(self, dialog):
         """The text fields of a dialog from top to bottom."""
-        fields = [thing for thing in descendants(dialog) if role(thing) in ("text", "entry") and has(thing, State.SHOWING)]
+        fields = [each for each in descendants(dialog) if role(each) in ("text", "entry") and has(each, State.SHOWING)]
         return sorted(fields, key=lambda field: place(field)[1])
 
     def editor(self):

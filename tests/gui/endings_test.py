@@ -5,7 +5,7 @@ import os
 import signal
 import subprocess
 
-from desktop import place, text_of, until, xdotool
+from desktop import place, until, xdotool
 from session import TITLE, Session, equal, make_sample, read_hive, difference, run, text_data
 
 CONTROL = ["ControlSet001", "Control"]

@@ -4,7 +4,7 @@
 import fnmatch
 import os
 
-from desktop import State, has, name, text_of, until
+from desktop import State, has, text_of, until
 from session import TITLE, Session, equal, make_sample, run, step
 
 KEYS = "Find keys"

@@ -77,12 +77,11 @@ def pick_new(session, steps_down):
     """The menu of new things: its first item is highlighted as it opens."""
     program = session.program
     program.keys("alt+e")
-    until(lambda: has(program.find("Edit", kind="menu item"), State.FOCUSED) or True, "the edit menu")
     program.keys("n")
     program.keys(*["Down"] * steps_down, "Return")
 
 
-def answer(session, title, key, picture=None):
+def answer(session, title, key):
     box = session.program.dialog(title)
     session.program.keys(key)
     session.program.gone(box)

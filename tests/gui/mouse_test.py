@@ -3,7 +3,7 @@
 """A user with a mouse on a made hive: every gesture, and the file after each."""
 import os
 
-from desktop import Atspi, State, children, has, name, place, role, text_of, until, xdotool
+from desktop import name, place, text_of, until, xdotool
 from session import NEW_VALUE_KINDS, TITLE, Session, equal, list_data, make_sample, run, step, text_data
 
 CONTROL = ["ControlSet001", "Control"]
@@ -12,10 +12,13 @@ MADE = CONTROL + ["Made by hand"]
 DELETE_KEY = ("Confirm Key Removal", "Are you sure you want to delete this key and its subkeys?")
 DELETE_VALUE = ("Confirm Value Removal", "Are you sure you want to delete this value?")
 
+MARKUP = "Some <b>text</b>"
+SCRIPTS = "Gr\u00fc\u00dfe \u041f\u0440\u0438\u0432\u0435\u0442 \u65e5\u672c\u8a9e \U0001f5c2"
+
 # What each kind of new value holds before it is edited, how it is edited, and what it holds then.
 KINDS = (
     # menu text, type, empty data, dialog, typed text, stored data, shown
-    ("String Value", 1, text_data(""), "Edit String", "Some <b>text</b>", text_data("Some <b>text</b>"), "Some <b>text</b>"),
+    ("String Value", 1, text_data(""), "Edit String", MARKUP, text_data(MARKUP), MARKUP),
     ("Binary Value", 3, b"", "Edit Binary Value", "0A0b", b"\x0a\x0b", None),
     ("DWORD (32-bit) Value", 4, bytes(4), "Edit DWORD (32-bit) Value", "DEADBEEF", b"\xef\xbe\xad\xde", "3735928559"),
     ("QWORD (64-bit) Value", 11, bytes(8), "Edit QWORD (64-bit) Value", "ff", b"\xff" + bytes(7), "255"),
@@ -51,7 +54,7 @@ def look_around(session):
         ("Nothing", "REG_NONE", None),
         ("Nothing with bytes", "REG_NONE", None),
         ("Text, markup", "REG_SZ", '<b>not bold</b> & "quoted"'),
-        ("Text, many scripts", "REG_SZ", "Gr\u00fc\u00dfe \u041f\u0440\u0438\u0432\u0435\u0442 \u65e5\u672c\u8a9e \U0001f5c2"),
+        ("Text, many scripts", "REG_SZ", SCRIPTS),
         ("Expandable", "REG_EXPAND_SZ", "%SystemRoot%\\system32"),
         ("Binary", "REG_BINARY", None),
         ("DWORD", "REG_DWORD", "42"),

@@ -1,9 +1,6 @@
 # SPDX-FileCopyrightText: 2026 The tallowfen developers
 # SPDX-License-Identifier: MIT
 """The gestures that change a file, on scratch copies of real hives."""
-import os
-
-from desktop import State, has, text_of, until
 from session import Session, equal, real_hive, run, step, text_data
 
 # A hive with "lh" leaves, an older one with "lf" leaves, and one with keys named in UTF-16.

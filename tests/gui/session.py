@@ -8,7 +8,7 @@ import subprocess
 import sys
 import tempfile
 
-from desktop import Failure, Program, State, has, name, place, text_of, until, xdotool
+from desktop import Failure, Program, State, has, name, place, text_of, until
 
 PROGRAM = os.environ["TALLOWFEN_PROGRAM"]
 HIVE_DUMP = os.environ["TALLOWFEN_HIVE_DUMP"]
@@ -274,7 +274,10 @@ def difference(wanted, seen):
 
 
 def brief(value):
-    return "absent" if value is None else f"type {value[0]}, {len(value[1] or b'')} bytes {(value[1] or b'')[:40].hex()}"
+    if value is None:
+        return "absent"
+    kind, data = value
+    return f"type {kind}, " + ("unreadable" if data is None else f"{len(data)} bytes {data[:40].hex()}")
 
 
 def run(*scenes):
