@@ -129,7 +129,7 @@ bool enter(Store& store, Level& level) {
 
 // Walks the subtree with a stack of its own; the hive's size bounds the steps, the depth limit the stack.
 int32_t check_tree(Store& store, Level* levels, uint32_t room, const Level& parent, uint32_t position) {
-    uint32_t steps = static_cast<uint32_t>(store.bins_size) / sizeof(KeyRecord);
+    auto steps = static_cast<uint32_t>(static_cast<uint32_t>(store.bins_size) / sizeof(KeyRecord));
     int32_t status = check_entry(store, parent, position, levels[0].key);
     if (status != R_SUCCESS)
         return status;

@@ -46,7 +46,8 @@ bool count_leaf(const Store& store, SubkeyIndex& index, Leaf& leaf) {
 }
 
 bool load_root(Store& store, uint32_t claimed, SubkeyIndex& index) {
-    const uint32_t capacity = (index.cell.room() - static_cast<uint32_t>(sizeof(IndexHead))) / sizeof(Le32);
+    const uint32_t capacity =
+        (index.cell.room() - static_cast<uint32_t>(sizeof(IndexHead))) / static_cast<uint32_t>(sizeof(Le32));
     const uint32_t count = claimed < capacity ? claimed : capacity;
     index.is_root = true;
     index.whole = count == claimed && count > 0;

@@ -5,7 +5,6 @@
 #include "reg_key.h"
 
 #include <QFileInfo>
-#include <QMutexLocker>
 
 #include <tallowfen/registry.h>
 
@@ -62,7 +61,7 @@ int32_t seek_device(void* device, int32_t offset, int32_t whence) {
 }  // namespace
 
 KeyHandleHolder::~KeyHandleHolder() {
-    const QMutexLocker locker(hive_->api_mutex());
+    const std::lock_guard locker(*hive_->api_mutex());
     RCloseKey(handle_);
 }
 
@@ -96,7 +95,7 @@ RegHive::RegHive(const QString& name, const QString& path, AbstractRegKey* paren
 RegHive::~RegHive() {
     clear_handle_cache();
     {
-        const QMutexLocker locker(&api_mutex_);
+        const std::lock_guard locker(api_mutex_);
         RCloseKey(root_handle_);
     }
     root_.reset();
@@ -135,7 +134,7 @@ void RegHive::load() {
 }
 
 RegistryKey* RegHive::key_handle(const RegKey* key) {
-    const QMutexLocker locker(&cache_mutex_);
+    const std::lock_guard locker(cache_mutex_);
     if (key == root_.get())
         return root_handle_;
     if (const KeyHandleHolder* holder = handle_cache_.object(key))
@@ -144,11 +143,11 @@ RegistryKey* RegHive::key_handle(const RegKey* key) {
 }
 
 RegistryKey* RegHive::open_child_handle(const RegKey* key, const RegKey* parent, int index) {
-    const QMutexLocker locker(&cache_mutex_);
+    const std::lock_guard locker(cache_mutex_);
     RegistryKey* parent_handle = key_handle(parent);
     RegistryKey* handle = nullptr;
     {
-        const QMutexLocker api(&api_mutex_);
+        const std::lock_guard api(api_mutex_);
         if (index < 0 || ROpenSubKey(parent_handle, static_cast<uint32_t>(index), &handle) != R_SUCCESS)
             throw std::runtime_error("ROpenSubKey failed");
     }
@@ -157,11 +156,11 @@ RegistryKey* RegHive::open_child_handle(const RegKey* key, const RegKey* parent,
 }
 
 void RegHive::clear_handle_cache() {
-    const QMutexLocker locker(&cache_mutex_);
+    const std::lock_guard locker(cache_mutex_);
     handle_cache_.clear();
 }
 
 void RegHive::forget_handle(const RegKey* key) {
-    const QMutexLocker locker(&cache_mutex_);
+    const std::lock_guard locker(cache_mutex_);
     handle_cache_.remove(key);
 }

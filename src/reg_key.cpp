@@ -5,8 +5,6 @@
 #include "reg_hive.h"
 #include "stored_text.h"
 
-#include <QMutexLocker>
-
 #include <tallowfen/registry.h>
 
 #include <algorithm>
@@ -44,15 +42,20 @@ AbstractRegKey::~AbstractRegKey() = default;
 
 AbstractRegKey* AbstractRegKey::child(int i) { return children_[static_cast<size_t>(i)]; }
 
+std::unique_lock<std::recursive_mutex> AbstractRegKey::lock_children() const {
+    std::recursive_mutex* const lock = children_lock();
+    return lock != nullptr ? std::unique_lock(*lock) : std::unique_lock<std::recursive_mutex>();
+}
+
 int AbstractRegKey::child_count() const {
-    const QMutexLocker locker(children_lock());
+    const auto locker = lock_children();
     return static_cast<int>(children_.size());
 }
 
 int AbstractRegKey::child_number() const {
     if (parent_ == nullptr)
         return 0;
-    const QMutexLocker locker(parent_->children_lock());
+    const auto locker = parent_->lock_children();
     const auto& siblings = parent_->children_;
     // Views ask for this over and over; a key with 50,000 siblings is not to be searched for each time.
     if (number_hint_ < siblings.size() && siblings[number_hint_] == this)
@@ -65,7 +68,7 @@ int AbstractRegKey::child_number() const {
 }
 
 void AbstractRegKey::add_child(AbstractRegKey* key) {
-    const QMutexLocker locker(children_lock());
+    const auto locker = lock_children();
     children_.push_back(key);
 }
 
@@ -92,7 +95,7 @@ RegKey::~RegKey() {
     hive_->forget_handle(this);
 }
 
-QRecursiveMutex* RegKey::children_lock() const { return hive_->api_mutex(); }
+std::recursive_mutex* RegKey::children_lock() const { return hive_->api_mutex(); }
 
 AbstractRegKey* RegKey::child(int i) {
     const RegHive::Dialogue dialogue(hive_);

@@ -9,10 +9,10 @@
 #include <QString>
 
 #include <memory>
+#include <mutex>
 #include <optional>
 #include <vector>
 
-class QRecursiveMutex;
 class RegHive;
 struct RegistryKey;
 
@@ -46,8 +46,9 @@ protected:
     std::vector<AbstractRegKey*> children_;
 
 private:
+    std::unique_lock<std::recursive_mutex> lock_children() const;
     // The lock that guards the children: the hive's, null for a group.
-    virtual QRecursiveMutex* children_lock() const { return nullptr; }
+    virtual std::recursive_mutex* children_lock() const { return nullptr; }
 
     // Where the parent listed this key last; checked before it is believed.
     mutable size_t number_hint_ = 0;
@@ -115,7 +116,7 @@ public:
 private:
     friend class RegHive;
 
-    QRecursiveMutex* children_lock() const override;
+    std::recursive_mutex* children_lock() const override;
     void refresh_children(RegistryKey* handle);
     int find_child_position(RegistryKey* handle, const QByteArray& name);
     bool store_value(const QString& name, uint type, const QByteArray& data, int index);

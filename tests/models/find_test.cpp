@@ -1,0 +1,216 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "hive_on_disk.h"
+#include "real_hives.h"
+
+#include "reg_model.h"
+
+#include <QTest>
+
+#include <algorithm>
+
+namespace {
+
+testkit::HiveLayout layout() {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout& software = hive.root.add("Software");
+    software.set("Zed", 4, testkit::pattern(4));
+    software.set("alpha", 4, testkit::pattern(4));
+    testkit::KeyLayout& run = software.add("RunOnce");
+    run.set("", 1, testkit::text_data("x"));
+    run.set("run it", 1, testkit::text_data("x"));
+    software.add("MyServiceA");
+    software.add("MyServiceAB");
+    hive.root.add("prerun");
+    return hive;
+}
+
+QString path_of(const QModelIndex& index) {
+    QStringList names;
+    for (QModelIndex up = index; up.isValid(); up = up.parent())
+        names.prepend(up.data().toString());
+    return names.join(QLatin1Char('/'));
+}
+
+struct Searched {
+    HiveOnDisk file;
+    RegModel model;
+
+    Searched() : file(layout()) { model.add_hive(QStringLiteral("TOP/HIVE"), file.path()); }
+    explicit Searched(const testkit::Bytes& bytes) : file(bytes) {
+        model.add_hive(QStringLiteral("TOP/HIVE"), file.path());
+    }
+
+    // Every hit of a search from the first group on, as "PATH" or "PATH : ROW".
+    QStringList all(const QString& term, RegModel::FindMode mode, Qt::MatchFlags flags = Qt::MatchContains) {
+        QStringList hits;
+        model.begin_find(model.index(0, 0));
+        for (;;) {
+            const RegModel::FindResult hit = model.find(term, mode, flags);
+            if (!hit.key.isValid())
+                return hits;
+            hits.append(path_of(hit.key) +
+                        (hit.value_row < 0 ? QString() : QStringLiteral(" : %1").arg(hit.value_row)));
+        }
+    }
+};
+
+QStringList list(std::initializer_list<const char*> names) {
+    QStringList all;
+    for (const char* name : names)
+        all.append(QLatin1String(name));
+    return all;
+}
+
+// What the search has to find in a hive, in its order, by the tests' own reader: each key's name, then the names of its
+// values as the table sorts them, then its subkeys.
+void expect_below(const testkit::Key& key, const QString& path, int depth, const QString& term, QStringList& hits) {
+    const auto matches = [&](const QString& name) { return name.contains(term, Qt::CaseInsensitive); };
+    const QString own = depth == 0 ? QStringLiteral("HIVE") : QString::fromStdU16String(key.name);
+    if (matches(own))
+        hits.append(path);
+    QStringList names;
+    bool has_default = false;
+    for (const testkit::Value& value : key.values) {
+        has_default = has_default || value.name.empty();
+        if (!value.name.empty())
+            names.append(QString::fromStdU16String(value.name));
+    }
+    Q_UNUSED(has_default);
+    std::stable_sort(names.begin(), names.end(),
+                     [](const QString& a, const QString& b) { return a.compare(b, Qt::CaseInsensitive) < 0; });
+    names.prepend(QStringLiteral("(Default)"));
+    for (int row = 0; depth > 0 && row < names.size(); row++) {
+        if (matches(names[row]))
+            hits.append(path + QStringLiteral(" : %1").arg(row));
+    }
+    for (const testkit::Key& child : key.children)
+        expect_below(child, path + QLatin1Char('/') + QString::fromStdU16String(child.name), depth + 1, term, hits);
+}
+
+} // namespace
+
+class FindTest : public QObject {
+    Q_OBJECT
+
+private slots:
+    void a_substring_is_found_in_any_case() {
+        QCOMPARE(Searched().all(QStringLiteral("run"), RegModel::FindKeys),
+                 list({"TOP/HIVE/prerun", "TOP/HIVE/Software/RunOnce"}));
+    }
+
+    void a_whole_string_is_no_part_of_a_longer_one() {
+        Searched searched;
+        QCOMPARE(searched.all(QStringLiteral("run"), RegModel::FindKeys, Qt::MatchFixedString), QStringList());
+        QCOMPARE(searched.all(QStringLiteral("RUNONCE"), RegModel::FindKeys, Qt::MatchFixedString),
+                 list({"TOP/HIVE/Software/RunOnce"}));
+    }
+
+    void a_wildcard_pattern_matches_the_whole_name() {
+        Searched searched;
+        QCOMPARE(searched.all(QStringLiteral("*service?"), RegModel::FindKeys, Qt::MatchWildcard),
+                 list({"TOP/HIVE/Software/MyServiceA"}));
+        QCOMPARE(searched.all(QStringLiteral("service?"), RegModel::FindKeys, Qt::MatchWildcard), QStringList());
+    }
+
+    void the_default_value_is_in_every_key_that_shows_values() {
+        QCOMPARE(Searched().all(QStringLiteral("(Default)"), RegModel::FindValues),
+                 list({"TOP/HIVE/prerun : 0", "TOP/HIVE/Software : 0", "TOP/HIVE/Software/MyServiceA : 0",
+                       "TOP/HIVE/Software/MyServiceAB : 0", "TOP/HIVE/Software/RunOnce : 0"}));
+    }
+
+    void a_key_comes_before_its_values() {
+        QCOMPARE(Searched().all(QStringLiteral("run"), RegModel::FindKeys | RegModel::FindValues),
+                 list({"TOP/HIVE/prerun", "TOP/HIVE/Software/RunOnce", "TOP/HIVE/Software/RunOnce : 1"}));
+    }
+
+    void a_hit_without_a_value_has_the_row_minus_one() {
+        Searched searched;
+        searched.model.begin_find(searched.model.index(0, 0));
+        const RegModel::FindResult hit =
+            searched.model.find(QStringLiteral("HIVE"), RegModel::FindKeys, Qt::MatchContains);
+        QCOMPARE(path_of(hit.key), QStringLiteral("TOP/HIVE"));
+        QCOMPARE(hit.value_row, -1);
+    }
+
+    void nothing_found_ends_at_once_when_asked_again() {
+        Searched searched;
+        QCOMPARE(searched.all(QStringLiteral("absent"), RegModel::FindKeys | RegModel::FindValues), QStringList());
+        QVERIFY(!searched.model.find(QStringLiteral("run"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
+        QCOMPARE(searched.all(QStringLiteral("run"), {}), QStringList());
+    }
+
+    void an_empty_term_matches_every_name() {
+        QCOMPARE(Searched().all(QString(), RegModel::FindKeys).size(), 7);
+    }
+
+    // The flag is looked at after the tenth frame, and then after every eleventh.
+    void a_stopped_search_ends_within_eleven_frames() {
+        testkit::HiveLayout many;
+        for (int i = 0; i < 100; i++)
+            many.root.add("Key " + std::to_string(100 + i));
+        Searched searched(testkit::lay_out(many).bytes);
+        searched.model.begin_find(searched.model.index(0, 0));
+        searched.model.stop_find();
+        QVERIFY(!searched.model.find(QStringLiteral("absent"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
+        // Ten frames are gone: the group, the root and eight keys; the flag still stands, so eleven more go each time.
+        const auto next = [&] {
+            return path_of(searched.model.find(QString(), RegModel::FindKeys, Qt::MatchContains).key);
+        };
+        QCOMPARE(next(), QStringLiteral("TOP/HIVE/Key 108"));
+        QVERIFY(!searched.model.find(QStringLiteral("absent"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
+        QCOMPARE(next(), QStringLiteral("TOP/HIVE/Key 119"));
+    }
+
+    void a_search_survives_that_its_next_key_is_deleted() {
+        Searched searched;
+        searched.model.begin_find(searched.model.index(0, 0));
+        const auto next = [&] {
+            return searched.model.find(QStringLiteral("service"), RegModel::FindKeys, Qt::MatchContains).key;
+        };
+        const QModelIndex first = next();
+        QCOMPARE(path_of(first), QStringLiteral("TOP/HIVE/Software/MyServiceA"));
+        QVERIFY(searched.model.removeRows(first.row() + 1, 1, first.parent()));
+        QVERIFY(!next().isValid());
+    }
+
+    // A key that lists itself over and over: the file's size bounds the walk.
+    void a_loop_of_keys_ends() {
+        testkit::HiveLayout looped;
+        testkit::KeyLayout& key = looped.root.add("Loop");
+        key.add("a");
+        key.add("b");
+        testkit::LaidHive laid = testkit::lay_out(looped);
+        const uint32_t loop = laid.at("Loop").record;
+        for (const uint32_t entry : {4U, 12U})
+            laid.put32(laid.at("Loop").index, entry, loop);
+        Searched searched(laid.bytes);
+        QVERIFY(searched.all(QStringLiteral("absent"), RegModel::FindKeys | RegModel::FindValues).isEmpty());
+    }
+
+    void a_real_hive_gives_every_name_once_and_in_order() {
+        int searched_hives = 0;
+        for (const testkit::RealHive& hive : testkit::real_hives()) {
+            if (hive.keys > 3000 || hive.name == "software-nt4")
+                continue;
+            const testkit::Bytes bytes = testkit::read_file(hive.path);
+            Searched searched(bytes);
+            for (const char* term : {"e", "", "no such name"}) {
+                QStringList expected;
+                const QString text = QLatin1String(term);
+                if (text.isEmpty())
+                    expected.append(QStringLiteral("TOP"));
+                expect_below(testkit::read_hive(bytes).root, QStringLiteral("TOP/HIVE"), 0, text, expected);
+                QStringList found = searched.all(text, RegModel::FindKeys | RegModel::FindValues);
+                QCOMPARE(found.size(), expected.size());
+                for (int i = 0; i < found.size(); i++)
+                    QCOMPARE(found[i], expected[i]);
+            }
+            searched_hives++;
+        }
+        qInfo("searched %d real hives", searched_hives);
+    }
+};
+
+QTEST_MAIN(FindTest)
+#include "find_test.moc"

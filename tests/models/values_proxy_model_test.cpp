@@ -1,0 +1,223 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "hive_on_disk.h"
+
+#include "reg_hive.h"
+#include "reg_key.h"
+#include "values_model.h"
+#include "values_proxy_model.h"
+
+#include <QAbstractItemModelTester>
+#include <QSignalSpy>
+#include <QHeaderView>
+#include <QTableView>
+#include <QTest>
+
+namespace {
+
+testkit::HiveLayout layout() {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout& bare = hive.root.add("Bare");
+    for (const char* name : {"gamma", "Beta", "alpha"})
+        bare.set(name, 4, testkit::pattern(4));
+    hive.root.add("Empty");
+    testkit::KeyLayout& full = hive.root.add("Full");
+    full.set("b", 4, testkit::pattern(4));
+    full.set("", 1, testkit::text_data("set"));
+    full.set("(Default)", 4, testkit::pattern(4));
+    full.set("A", 4, testkit::pattern(4));
+    return hive;
+}
+
+struct Shown {
+    HiveOnDisk file{layout()};
+    DummyRegKey top{QStringLiteral("TOP")};
+    RegHive hive{QStringLiteral("HIVE"), file.path(), &top};
+    std::unique_ptr<ValuesModel> source;
+    ValuesProxyModel proxy;
+    QTableView view;
+
+    explicit Shown(int key) : source(new ValuesModel(static_cast<RegKey*>(hive.root_key()->child(key)))) {
+        proxy.setSourceModel(source.get());
+        proxy.sort(0, Qt::AscendingOrder);
+        view.setModel(&proxy);
+    }
+    ~Shown() { view.setModel(nullptr); }
+
+    QStringList names() {
+        QStringList all;
+        for (int row = 0; row < proxy.rowCount(); row++)
+            all.append(proxy.index(row, 0).data().toString());
+        return all;
+    }
+};
+
+enum Key { Bare, Empty, Full };
+
+QStringList list(std::initializer_list<const char*> names) {
+    QStringList all;
+    for (const char* name : names)
+        all.append(QLatin1String(name));
+    return all;
+}
+
+} // namespace
+
+class ValuesProxyModelTest : public QObject {
+    Q_OBJECT
+
+private slots:
+    void the_model_is_one_that_views_can_rely_on() {
+        Shown shown(Bare);
+        const QAbstractItemModelTester tester(&shown.proxy, QAbstractItemModelTester::FailureReportingMode::QtTest);
+        QVERIFY(shown.proxy.setData(shown.proxy.index(1, 0), QStringLiteral("delta"), Qt::EditRole));
+        QVERIFY(shown.proxy.removeRows(2, 1));
+    }
+
+    void a_key_without_an_unnamed_value_gets_a_row_for_it() {
+        Shown shown(Bare);
+        QCOMPARE(shown.proxy.rowCount(), 4);
+        QCOMPARE(shown.proxy.columnCount(), 3);
+        QCOMPARE(shown.proxy.index(0, 0).data().toString(), QStringLiteral("(Default)"));
+        QCOMPARE(shown.proxy.index(0, 1).data().toString(), QStringLiteral("REG_SZ"));
+        QCOMPARE(shown.proxy.index(0, 2).data().metaType(), QMetaType::fromType<ValueNotSet>());
+        QVERIFY(!shown.proxy.index(0, 0).data(Qt::EditRole).isValid());
+        QVERIFY(!shown.proxy.index(4, 0).isValid());
+    }
+
+    void names_are_sorted_without_case_and_the_unnamed_value_first() {
+        QCOMPARE(Shown(Bare).names(), list({"(Default)", "alpha", "Beta", "gamma"}));
+        Shown full(Full);
+        QCOMPARE(full.names(), list({"(Default)", "(Default)", "A", "b"}));
+        QCOMPARE(full.proxy.rowCount(), 4);
+    }
+
+    void every_sort_is_by_name_ascending() {
+        Shown shown(Bare);
+        shown.proxy.sort(2, Qt::DescendingOrder);
+        QCOMPARE(shown.names(), list({"(Default)", "alpha", "Beta", "gamma"}));
+    }
+
+    void rows_map_both_ways() {
+        Shown shown(Bare);
+        QVERIFY(!shown.proxy.mapToSource(shown.proxy.index(0, 0)).isValid());
+        QCOMPARE(shown.proxy.mapToSource(shown.proxy.index(1, 2)), shown.source->index(2, 2));
+        QCOMPARE(shown.proxy.mapFromSource(shown.source->index(0, 1)), shown.proxy.index(3, 1));
+    }
+
+    void the_first_row_can_never_be_renamed() {
+        for (const Key key : {Bare, Full}) {
+            Shown shown(key);
+            QCOMPARE(shown.proxy.flags(shown.proxy.index(0, 0)), Qt::ItemIsSelectable | Qt::ItemIsEnabled);
+            QCOMPARE(shown.proxy.flags(shown.proxy.index(0, 2)), Qt::ItemFlags(Qt::ItemIsEnabled));
+            QVERIFY(shown.proxy.flags(shown.proxy.index(2, 0)).testFlag(Qt::ItemIsEditable));
+        }
+    }
+
+    void data_for_the_made_up_row_makes_the_value() {
+        Shown shown(Bare);
+        QSignalSpy changed(&shown.proxy, &QAbstractItemModel::dataChanged);
+        QVERIFY(!shown.proxy.setData(shown.proxy.index(0, 0), QStringLiteral("x"), Qt::EditRole));
+        QVERIFY(shown.proxy.setData(shown.proxy.index(0, 2), QStringLiteral("made"), Qt::DisplayRole));
+        QCOMPARE(changed.count(), 1);
+        QCOMPARE(shown.names(), list({"(Default)", "alpha", "Beta", "gamma"}));
+        QCOMPARE(shown.proxy.index(0, 2).data().toString(), QStringLiteral("made"));
+        QCOMPARE(shown.file.stored_type("Bare", ""), 1);
+        QCOMPARE(shown.view.verticalHeader()->count(), 4);
+    }
+
+    void deleting_the_unnamed_value_brings_the_made_up_row() {
+        Shown shown(Full);
+        // Of the two rows that read alike the unnamed value's is the one of type REG_SZ.
+        const int row = shown.proxy.index(0, 1).data().toString() == QStringLiteral("REG_SZ") ? 0 : 1;
+        QVERIFY(shown.proxy.removeRows(row, 1));
+        QCOMPARE(shown.names(), list({"(Default)", "(Default)", "A", "b"}));
+        QCOMPARE(shown.proxy.index(0, 2).data().metaType(), QMetaType::fromType<ValueNotSet>());
+        QCOMPARE(shown.file.stored("Full", ""), QByteArrayLiteral("?"));
+        QCOMPARE(shown.view.verticalHeader()->count(), 4);
+    }
+
+    void the_made_up_row_cannot_be_deleted_and_says_so_to_nobody() {
+        Shown shown(Bare);
+        const testkit::Bytes before = shown.file.bytes();
+        QVERIFY(shown.proxy.removeRows(0, 1));
+        QVERIFY(shown.file.bytes() == before);
+        QCOMPARE(shown.proxy.rowCount(), 4);
+    }
+
+    void a_new_value_is_last_until_the_next_sort() {
+        Shown shown(Bare);
+        QVERIFY(shown.proxy.add_value(4));
+        QCOMPARE(shown.names(), list({"(Default)", "alpha", "Beta", "gamma", "New Value #1"}));
+        QVERIFY(shown.proxy.setData(shown.proxy.index(4, 0), QStringLiteral("aa"), Qt::EditRole));
+        QCOMPARE(shown.names(), list({"(Default)", "alpha", "Beta", "gamma", "aa"}));
+        shown.proxy.sort(0, Qt::AscendingOrder);
+        QCOMPARE(shown.names(), list({"(Default)", "aa", "alpha", "Beta", "gamma"}));
+    }
+
+    void a_renamed_value_keeps_its_row_until_the_next_sort() {
+        Shown shown(Bare);
+        QVERIFY(shown.proxy.setData(shown.proxy.index(1, 0), QStringLiteral("zeta"), Qt::EditRole));
+        QCOMPARE(shown.names(), list({"(Default)", "zeta", "Beta", "gamma"}));
+        QVERIFY(shown.proxy.setData(shown.proxy.index(2, 2), QVariant(7U), Qt::DisplayRole));
+        QCOMPARE(shown.file.stored("Bare", "Beta"), QByteArray("\7\0\0\0", 4));
+        shown.proxy.sort(0, Qt::AscendingOrder);
+        QCOMPARE(shown.names(), list({"(Default)", "Beta", "gamma", "zeta"}));
+    }
+
+    void a_refused_rename_changes_nothing() {
+        Shown shown(Bare);
+        const testkit::Bytes before = shown.file.bytes();
+        QVERIFY(!shown.proxy.setData(shown.proxy.index(1, 0), QStringLiteral("GAMMA"), Qt::EditRole));
+        QVERIFY(shown.file.bytes() == before);
+        QCOMPARE(shown.names(), list({"(Default)", "alpha", "Beta", "gamma"}));
+    }
+
+    // The source's numbers go out as they are, without the row that is made up.
+    void inserted_rows_are_announced_with_the_sources_numbers() {
+        Shown shown(Bare);
+        QSignalSpy inserted(&shown.proxy, &QAbstractItemModel::rowsInserted);
+        QVERIFY(shown.proxy.add_value(1));
+        QCOMPARE(inserted.count(), 1);
+        QCOMPARE(inserted[0][1].toInt(), 3);
+        QCOMPARE(inserted[0][2].toInt(), 3);
+        QCOMPARE(shown.view.verticalHeader()->count(), 5);
+    }
+
+    void a_value_that_was_not_made_leaves_the_view_right() {
+        Shown shown(Bare);
+        QVERIFY(!shown.proxy.add_value(8));
+        QCOMPARE(shown.proxy.rowCount(), 4);
+        QCOMPARE(shown.names(), list({"(Default)", "alpha", "Beta", "gamma"}));
+    }
+
+    void a_null_source_or_key_has_no_rows() {
+        ValuesProxyModel proxy;
+        QCOMPARE(proxy.rowCount(), 0);
+        QCOMPARE(proxy.columnCount(), 0);
+        QVERIFY(!proxy.has_key());
+        ValuesModel keyless(nullptr);
+        proxy.setSourceModel(&keyless);
+        QCOMPARE(proxy.rowCount(), 0);
+        QVERIFY(!proxy.has_key());
+        QVERIFY(!proxy.removeRows(0, 1));
+        QVERIFY(!proxy.add_value(1));
+        proxy.setSourceModel(nullptr);
+        QCOMPARE(proxy.rowCount(), 0);
+    }
+
+    void a_new_source_is_a_reset() {
+        Shown shown(Bare);
+        QSignalSpy reset(&shown.proxy, &QAbstractItemModel::modelReset);
+        ValuesModel other(static_cast<RegKey*>(shown.hive.root_key()->child(Empty)));
+        shown.view.setCurrentIndex(shown.proxy.index(3, 0));
+        shown.proxy.setSourceModel(&other);
+        QCOMPARE(reset.count(), 1);
+        QCOMPARE(shown.names(), list({"(Default)"}));
+        QVERIFY(!shown.view.currentIndex().isValid());
+        shown.proxy.setSourceModel(nullptr);
+    }
+};
+
+QTEST_MAIN(ValuesProxyModelTest)
+#include "values_proxy_model_test.moc"
