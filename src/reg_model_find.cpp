@@ -44,19 +44,30 @@ private:
     std::vector<QString> names_;
 };
 
+// Passes a lock where one thread leaves data to another.
+class HandOver {
+public:
+    explicit HandOver(QMutex* mutex) : mutex_(mutex) { const QMutexLocker locker(mutex_); }
+    ~HandOver() { const QMutexLocker locker(mutex_); }
+    HandOver(const HandOver&) = delete;
+    HandOver& operator=(const HandOver&) = delete;
+
+private:
+    QMutex* mutex_;
+};
+
 }  // namespace
 
 void RegModel::begin_find(const QModelIndex& start) {
-    {
-        const QMutexLocker locker(&mutex_);
-        stop_ = false;
-    }
     search_.clear();
     if (start.isValid())
         search_.push_back({start, -1});
     keys_left_ = static_cast<qint64>(top_level_.size() + hives_.size());
     for (const auto& hive : hives_)
         keys_left_ += hive->file_size() / smallest_key;
+    // Last, so that the lock hands the stack over to the worker as well.
+    const QMutexLocker locker(&mutex_);
+    stop_ = false;
 }
 
 void RegModel::stop_find() {
@@ -93,6 +104,9 @@ RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mod
     const QString text = term.toString();
     const int kind = static_cast<int>(flags) & 0xF;
     CurrentNames names;
+    // The stack is the worker's from here on and goes back at the end. The pool orders the two ends already, but in code
+    // that the thread sanitizer cannot see.
+    const HandOver hand_over(&mutex_);
     int counter = 1;
     while (!search_.empty()) {
         const Frame frame = search_.back();

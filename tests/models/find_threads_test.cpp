@@ -8,7 +8,8 @@
 
 #include <QTest>
 #include <QTreeView>
-#include <QtConcurrent>
+
+#include <thread>
 
 class FindThreadsTest : public QObject {
     Q_OBJECT
@@ -35,19 +36,17 @@ private slots:
         view.expand(root);
         for (int round = 0; round < 50; round++) {
             model.begin_find(model.index(0, 0));
-            QFuture<RegModel::FindResult> search = QtConcurrent::run([&model] {
-                return model.find(QStringLiteral("absent"), RegModel::FindKeys | RegModel::FindValues,
-                                  Qt::MatchContains);
+            // A plain thread: the sanitizer sees where it begins and ends, which it cannot see of the toolkit's pool.
+            std::thread search([&model] {
+                model.find(QStringLiteral("absent"), RegModel::FindKeys | RegModel::FindValues, Qt::MatchContains);
             });
             view.setExpanded(model.index(round, 0, root), true);
             view.scrollTo(model.index((round * 7) % 60, 0, root));
             view.viewport()->repaint();
             QCoreApplication::processEvents();
-            if (round % 5 != 0) {
-                search.cancel();
+            if (round % 5 != 0)
                 model.stop_find();
-            }
-            search.waitForFinished();
+            search.join();
         }
         // The next search finds all the same.
         model.begin_find(model.index(0, 0));
