@@ -32,7 +32,7 @@ class Failure(AssertionError):
     """What a test says when the window is not as it must be."""
 
 
-def until(condition, what, timeout=10):
+def until(condition, what, timeout=20):
     """The condition's value once it is true; never a fixed pause."""
     end = time.monotonic() + timeout
     problem = None
@@ -174,7 +174,7 @@ class Program:
 
     # ---- looking --------------------------------------------------------------------------------------------------
 
-    def find(self, what, below=None, kind=None, timeout=10):
+    def find(self, what, below=None, kind=None, timeout=20):
         """The widget that shows and has this accessible name and, if asked for, this role."""
 
         def look():
@@ -205,8 +205,20 @@ class Program:
         return [name(thing) for thing in children(self.root) if has(thing, State.SHOWING)]
 
     def gone(self, thing, timeout=20):
+        """Waits until it is closed and another window of the program has the keyboard: a key that is pressed between
+        the two goes nowhere."""
         what = name(thing)
         until(lambda: not has(thing, State.SHOWING), f"{what!r} to close", timeout)
+        until(
+            lambda: any(has(each, State.ACTIVE) and has(each, State.SHOWING) for each in children(self.root)),
+            f"the keyboard to come back from {what!r}",
+            timeout,
+        )
+
+    def alone(self, title):
+        """Waits until this window is the only one and has the keyboard."""
+        until(lambda: self.open_titles() == [title], f"nothing but {title!r}")
+        self.window(title)
 
     def labels(self, dialog):
         return [name(thing) for thing in descendants(dialog) if role(thing) == "label" and name(thing)]
@@ -389,6 +401,13 @@ class Program:
             if i + 1 < len(path):
                 menu = self._popup(item)
                 until(lambda: has(menu, State.SHOWING), f"the menu {text!r} to open")
+
+    def menu_open(self, *path):
+        """Waits until this menu of the menu bar is open."""
+        menu = self.find(None, kind="menu bar")
+        for text in path:
+            menu = self._popup(self._item(menu, text))
+        until(lambda: has(menu, State.SHOWING), f"the menu {path} to open")
 
     def context_menu(self):
         """The context menu that is open."""

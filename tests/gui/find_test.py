@@ -78,7 +78,7 @@ def search_through(session, term, boxes, kind):
         until(lambda: program.selected_path(session.tree) == path, f"the hit {path} in the tree")
         if value is not None:
             until(lambda: selected_value(session) == value, f"the hit {value!r} of {path} in the table")
-        until(lambda: program.open_titles() == [TITLE], "the search to close")
+        program.alone(TITLE)
         program.keys("F3")
     session.message(TITLE, "Finished searching.", "OK", "finished-searching")
 
@@ -130,7 +130,7 @@ def cancelling(scratch):
             else:
                 program.keys("Escape")
             program.gone(searching)
-            until(lambda: program.open_titles() == [TITLE], "nothing but the window")
+            program.alone(TITLE)
             equal((program.tree_rows(session.tree), session.rows(), session.status()), before, "tree and table")
             program.keys("F3")
             dialog = program.dialog("Find")

@@ -77,7 +77,9 @@ def pick_new(session, steps_down):
     """The menu of new things: its first item is highlighted as it opens."""
     program = session.program
     program.keys("alt+e")
+    program.menu_open("Edit")
     program.keys("n")
+    program.menu_open("Edit", "New")
     program.keys(*["Down"] * steps_down, "Return")
 
 
@@ -194,7 +196,7 @@ def finding(session):
     program.keys("Return")
     for control_set in ("ControlSet001", "ControlSet002"):
         session.selected([control_set, "Services", "Tcpip"])
-        until(lambda: program.open_titles() == [TITLE], "the search to close")
+        program.alone(TITLE)
         program.keys("F3")
     box = program.dialog(TITLE)
     equal("Finished searching." in program.labels(box), True, "the end of the search")
@@ -210,7 +212,9 @@ def whole_session(scratch):
         for scene in (keys_session, values_session, number_base, deleting, finding):
             step(scene.__doc__)
             scene(session)
-        session.program.keys("alt+f", "Return")
+        session.program.keys("alt+f")
+        session.program.menu_open("File")
+        session.program.keys("Return")
         equal(session.program.status(), 0, "the exit status")
         session.unchanged("the end")
 
