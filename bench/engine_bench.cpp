@@ -3,6 +3,7 @@
 //
 // Times of the engine, each to be set against another of the same run: against reading the file once, or N against 2N.
 #include "hive_file.h"
+#include "walk.h"
 
 #include <benchmark/benchmark.h>
 
@@ -17,14 +18,9 @@
 namespace {
 
 using bench::Counts;
+using bench::check;
 using bench::HiveFile;
-
-void check(int32_t status, const char* what) {
-    if (status != R_SUCCESS) {
-        std::fprintf(stderr, "%s: status %d\n", what, status);
-        std::exit(1);
-    }
-}
+using bench::Walk;
 
 // The hive that whole-file measures are taken on: the largest real one where there is one, else a made one.
 const std::string& large_hive() {
@@ -35,32 +31,12 @@ const std::string& large_hive() {
     return path;
 }
 
-void make_keys(RegistryKey* parent, int count) {
-    for (int i = 0; i < count; i++) {
-        RegistryKey* key = nullptr;
-        const std::string name = "Key " + std::to_string(i);
-        check(RCreateKey(parent, name.c_str(), &key, nullptr), "create");
-        for (int v = 0; v < 3; v++) {
-            const std::string data(static_cast<size_t>(10 + 20 * v), 'x');
-            check(RSetValueExW(key, ("Value " + std::to_string(v)).c_str(), 3, data.data(),
-                               static_cast<uint32_t>(data.size())),
-                  "set");
-        }
-        RCloseKey(key);
-    }
-}
-
 std::unique_ptr<HiveFile> open_large() {
     if (!large_hive().empty())
         return std::make_unique<HiveFile>(large_hive());
     auto file = std::make_unique<HiveFile>();
     RegistryKey* root = file->open();
-    for (int i = 0; i < 200; i++) {
-        RegistryKey* branch = nullptr;
-        check(RCreateKey(root, ("Branch " + std::to_string(i)).c_str(), &branch, nullptr), "create");
-        make_keys(branch, 500);
-        RCloseKey(branch);
-    }
+    bench::make_branches(root, 200, 500);
     RCloseKey(root);
     return file;
 }
@@ -94,46 +70,6 @@ void OpenHive(benchmark::State& state) {
     report(state, file.counts, static_cast<double>(state.iterations()));
 }
 BENCHMARK(OpenHive)->Unit(benchmark::kMillisecond);
-
-// Opens each key, queries it, reads every value's name and data, as the program's objects do.
-class Walk {
-public:
-    void key(RegistryKey* handle) {
-        keys++;
-        uint32_t subkeys = 0;
-        uint32_t values_here = 0;
-        uint32_t size = static_cast<uint32_t>(name_.size() * 2);
-        check(RQueryInfoKeyW(handle, name_.data(), &size, nullptr, nullptr, &subkeys, nullptr, nullptr, &values_here,
-                             nullptr, nullptr, nullptr, nullptr),
-              "query");
-        for (uint32_t i = 0; i < values_here; i++)
-            value(handle, i);
-        for (uint32_t i = 0; i < subkeys; i++) {
-            RegistryKey* child = nullptr;
-            check(ROpenSubKey(handle, i, &child), "open");
-            key(child);
-            RCloseKey(child);
-        }
-    }
-
-    uint64_t keys = 0;
-    uint64_t values = 0;
-
-private:
-    void value(RegistryKey* handle, uint32_t i) {
-        values++;
-        uint32_t name_size = static_cast<uint32_t>(name_.size() * 2);
-        uint32_t type = 0;
-        uint32_t size = 0;
-        check(REnumValueW(handle, i, name_.data(), &name_size, &type, nullptr, &size), "value name");
-        data_.resize(std::max<size_t>(data_.size(), size));
-        uint32_t room = size;
-        check(REnumValueW(handle, i, nullptr, nullptr, nullptr, data_.data(), &room), "value data");
-    }
-
-    std::vector<uint16_t> name_ = std::vector<uint16_t>(17000);
-    std::vector<char> data_ = std::vector<char>(4096);
-};
 
 void WalkAll(benchmark::State& state) {
     HiveFile& file = large_file();

@@ -105,6 +105,14 @@ HiveFile::HiveFile() : writable_(true) {
     device_ = std::make_unique<Device>(Device{fd_, &counts});
 }
 
+HiveFile::HiveFile(const std::string& path, New)
+    : fd_(::open(path.c_str(), O_RDWR | O_CREAT | O_TRUNC | O_CLOEXEC, 0600)), writable_(true) {
+    const std::vector<uint8_t> bytes = empty_hive();
+    if (fd_ < 0 || ::write(fd_, bytes.data(), bytes.size()) != static_cast<ssize_t>(bytes.size()))
+        fail(path.c_str());
+    device_ = std::make_unique<Device>(Device{fd_, &counts});
+}
+
 HiveFile::HiveFile(const std::string& path) : fd_(::open(path.c_str(), O_RDONLY | O_CLOEXEC)) {
     if (fd_ < 0)
         fail(path.c_str());

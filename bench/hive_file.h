@@ -26,6 +26,9 @@ class HiveFile {
 public:
     // An empty hive in a scratch file: one bin, a root key with its security record.
     HiveFile();
+    // The same in a file of that name, which stays.
+    enum New { Empty };
+    HiveFile(const std::string& path, New);
     // A file that is there, opened for reading alone.
     explicit HiveFile(const std::string& path);
     ~HiveFile();
