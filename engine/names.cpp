@@ -87,6 +87,20 @@ int compare_upper(const Name& a, const Name& b) {
     return order(a.characters(), b.characters());
 }
 
+bool same_name(const Name& a, const Name& b) {
+    if (a.characters() != b.characters())
+        return false;
+    const bool narrow_both = !a.wide && !b.wide;
+    // From the end: the names under one key often begin alike and differ in a number behind.
+    for (uint32_t i = a.characters(); i-- > 0;) {
+        if (narrow_both && a.bytes[i] == b.bytes[i])
+            continue;
+        if (upper_unit(a, i) != upper_unit(b, i))
+            return false;
+    }
+    return true;
+}
+
 uint32_t leaf_hint(uint32_t leaf_signature, const Name& name) {
     if (leaf_signature == sig_hash_leaf) {
         uint32_t hash = 0;

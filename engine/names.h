@@ -29,7 +29,8 @@ int compare_signed(const Name& searched, const Name& stored);
 int compare_index(const Name& searched, const Name& stored);
 // The order in which Windows keeps its lists, as far as 8 bits tell: upper-cased units, unsigned.
 int compare_upper(const Name& a, const Name& b);
-inline bool same_name(const Name& a, const Name& b) { return compare_upper(a, b) == 0; }
+// Whether compare_upper finds no difference.
+bool same_name(const Name& a, const Name& b);
 
 // What a leaf of this kind ("lf" or "lh") holds beside a key's offset.
 uint32_t leaf_hint(uint32_t leaf_signature, const Name& name);
