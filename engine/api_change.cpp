@@ -73,8 +73,7 @@ int32_t RDeleteValue(RegistryKey* key, const char* name) {
     KeyView view;
     if (!read_key(*key->store, key->info->own, view))
         return R_FAILED;
-    const int32_t status =
-        remove_value(*key->store, key->info->own, view.record, static_cast<uint32_t>(position));
+    const int32_t status = remove_value(*key->store, key->info->own, view.record, static_cast<uint32_t>(position));
     reread_counts(*key);
     return status;
 }

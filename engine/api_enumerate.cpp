@@ -190,8 +190,8 @@ int32_t REnumKeyExA(RegistryKey* key, uint32_t index, char* name, uint32_t* name
     return REnumKeyInfoA(key, index, name, name_size, nullptr, class_name, class_size, out_last_write);
 }
 
-int32_t REnumValueA(RegistryKey* key, uint32_t index, char* name, uint32_t* name_size, uint32_t* out_type,
-                    void* data, uint32_t* data_size) {
+int32_t REnumValueA(RegistryKey* key, uint32_t index, char* name, uint32_t* name_size, uint32_t* out_type, void* data,
+                    uint32_t* data_size) {
     const ValueView* value = nullptr;
     int32_t status = find_enumerated(key, index, value);
     if (status == R_SUCCESS)
@@ -220,8 +220,7 @@ int32_t RFindValueA(RegistryKey* key, const char* name) {
     if (!is_key(key))
         return R_FAILED;
     ValueView value;
-    const int32_t position =
-        find_value(*key->store, current_values(*key), name_of(name != nullptr ? name : ""), value);
+    const int32_t position = find_value(*key->store, current_values(*key), name_of(name != nullptr ? name : ""), value);
     return position >= 0 ? position : int32_t{R_FAILED};
 }
 

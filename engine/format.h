@@ -50,18 +50,14 @@ constexpr uint32_t bin_alignment = 4096;
 constexpr uint32_t cell_head_size = 4;  // the signed size word in front of every record
 constexpr uint32_t cell_alignment = 8;
 
-constexpr int64_t cell_position(CellOffset offset) {
-    return int64_t{base_block_size} + static_cast<int32_t>(offset);
-}
+constexpr int64_t cell_position(CellOffset offset) { return int64_t{base_block_size} + static_cast<int32_t>(offset); }
 constexpr int64_t record_position(CellOffset offset) { return cell_position(offset) + cell_head_size; }
 
 // Signatures as they read in little-endian order: one above 32766 stands in four bytes, the others in two.
 constexpr uint32_t signature2(char a, char b) {
     return static_cast<uint32_t>(static_cast<uint8_t>(a)) | static_cast<uint32_t>(static_cast<uint8_t>(b)) << 8;
 }
-constexpr uint32_t signature4(char a, char b, char c, char d) {
-    return signature2(a, b) | signature2(c, d) << 16;
-}
+constexpr uint32_t signature4(char a, char b, char c, char d) { return signature2(a, b) | signature2(c, d) << 16; }
 constexpr uint32_t sig_none = 0;
 constexpr uint32_t sig_base = signature4('r', 'e', 'g', 'f');
 constexpr uint32_t sig_bin = signature4('h', 'b', 'i', 'n');

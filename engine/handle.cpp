@@ -59,8 +59,7 @@ void take_values(RegistryKey& handle, Store& store, const KeyRecord& record) {
     handle.values_generation = store.generation;
     handle.recent_position = UINT32_MAX;
     handle.value_offsets.first = 0;
-    handle.value_offsets.count =
-        values_at(store, handle.values, 0, handle.value_offsets.offsets, OffsetBatch::most);
+    handle.value_offsets.count = values_at(store, handle.values, 0, handle.value_offsets.offsets, OffsetBatch::most);
 }
 
 // The same of its subkeys. false when memory ran out.
@@ -223,8 +222,8 @@ int32_t follow_path(RegistryKey& from, const char* path, PathEnd& end) {
     int32_t status = R_SUCCESS;
     while (*path != '\0') {
         const uint32_t length = component_length(path);
-        const Name name = {reinterpret_cast<const uint8_t*>(path),
-                           length < component_limit ? length : component_limit, false};
+        const Name name = {reinterpret_cast<const uint8_t*>(path), length < component_limit ? length : component_limit,
+                           false};
         KeyView key;
         if (end.depth == depth_limit ||
             find_subkey(store, *index, end.key, name, compare_signed, end.position, key) != Lookup::found) {

@@ -52,7 +52,7 @@ struct RegistryKey {
     engine::Store* store;
     engine::KeyInfo* info;
 
-    uint32_t depth;                // levels below the root
+    uint32_t depth;  // levels below the root
     // What was read of the key's lists; read anew once the hive has been written to.
     engine::SubkeyIndex index;
     engine::OffsetBatch subkeys;

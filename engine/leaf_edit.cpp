@@ -92,8 +92,8 @@ Outcome take_back(Store& store, CellOffset parent_offset, KeyRecord& parent, con
 }
 
 // The first subkey: into the emptied leaf that the key still has, or into a new one.
-Outcome add_first(Store& store, CellOffset parent_offset, KeyRecord& parent, const KeyRecord& changed,
-                  CellOffset key, const Name& name) {
+Outcome add_first(Store& store, CellOffset parent_offset, KeyRecord& parent, const KeyRecord& changed, CellOffset key,
+                  const Name& name) {
     struct {
         IndexHead head;
         LeafEntry entry;
@@ -177,8 +177,8 @@ Outcome take_out(Store& store, const SubkeyIndex& index, uint32_t position) {
         if (!read_leaf_bytes(store, root, now) || !read_leaf_bytes(store, root, before))
             return Outcome::unchanged;
         now.remove(number);
-        const Outcome outcome = rewrite_at(store, record_position(root.cell.offset), now.block.bytes,
-                                           before.block.bytes, now.used());
+        const Outcome outcome =
+            rewrite_at(store, record_position(root.cell.offset), now.block.bytes, before.block.bytes, now.used());
         if (outcome == Outcome::written)
             free_cell(store, leaf.cell.offset);
         return outcome;
@@ -288,8 +288,8 @@ Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, 
     if (counted != Outcome::unchanged)
         return counted;
     // The entry goes back in; if it cannot, the leaf stays without it, whole.
-    const Outcome back = rewrite_at(store, record_position(leaf.cell.offset), before.block.bytes, now.block.bytes,
-                                    before.used());
+    const Outcome back =
+        rewrite_at(store, record_position(leaf.cell.offset), before.block.bytes, now.block.bytes, before.used());
     return back == Outcome::written ? Outcome::unchanged : Outcome::unknown;
 }
 

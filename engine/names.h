@@ -35,8 +35,8 @@ bool same_name(const Name& a, const Name& b);
 // What a leaf of this kind ("lf" or "lh") holds beside a key's offset.
 uint32_t leaf_hint(uint32_t leaf_signature, const Name& name);
 
-// Conversions through the hooks: in place, or from src to dst, until the terminating zero or count characters, whichever
-// is first. They return the number of characters converted, the zero not among them.
+// Conversions through the hooks: in place, or from src to dst, until the terminating zero or count characters,
+// whichever is first. They return the number of characters converted, the zero not among them.
 uint32_t convert_in_place(char (*hook)(char), char* text, uint32_t count);
 uint32_t narrow(const uint8_t* src, char* dst, uint32_t count);
 uint32_t widen(const uint8_t* src, uint8_t* dst, uint32_t count);

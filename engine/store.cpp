@@ -303,9 +303,7 @@ bool find_cell(Store& store, CellOffset offset, Cell& cell) {
     return true;
 }
 
-bool find_used_cell(Store& store, CellOffset offset, Cell& cell) {
-    return find_cell(store, offset, cell) && cell.used;
-}
+bool find_used_cell(Store& store, CellOffset offset, Cell& cell) { return find_cell(store, offset, cell) && cell.used; }
 
 bool is_own_cell(Store& store, CellOffset offset) {
     Cell cell;
@@ -335,8 +333,7 @@ uint32_t read_record(Store& store, uint32_t signature, CellOffset offset, void* 
 bool read_part(Store& store, const Cell& cell, uint32_t skip, void* buffer, uint32_t length) {
     if (skip > cell.room() || length > cell.room() - skip)
         return false;
-    return length == 0 ||
-           read_at(store, sig_none, record_position(cell.offset) + skip, buffer, length) == length;
+    return length == 0 || read_at(store, sig_none, record_position(cell.offset) + skip, buffer, length) == length;
 }
 
 }  // namespace engine

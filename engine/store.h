@@ -83,8 +83,8 @@ uint32_t write_at(Store& store, uint32_t signature, int64_t position, const void
 // What became of bytes that were to change: they did, they are as before, or nobody knows.
 enum class Outcome { written, unchanged, unknown };
 
-// Writes now over before, which is what the file holds there. A write that fails is undone as far as the device lets it,
-// so that a caller knows whether what the bytes refer to may be freed.
+// Writes now over before, which is what the file holds there. A write that fails is undone as far as the device lets
+// it, so that a caller knows whether what the bytes refer to may be freed.
 Outcome rewrite_at(Store& store, int64_t position, const void* now, const void* before, uint32_t length);
 
 // The absolute value of the cell's size word, -1 when it cannot be read or is no multiple of 8.
@@ -104,7 +104,8 @@ bool read_part(Store& store, const Cell& cell, uint32_t skip, void* buffer, uint
 
 // Finds the bin that holds an offset (not its header); null when none does.
 Bin* bin_of(Store& store, CellOffset offset);
-// Reads the bin's header and walks its cells; fills bin; returns the end of the walk, counted from the first bin, or -1.
+// Reads the bin's header and walks its cells; fills bin; returns the end of the walk, counted from the first bin, or
+// -1.
 int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin);
 // Reads one size word: false when it cannot be read. The walk over a bin's cells steps with it, so the common case, a
 // word inside the window, is kept short.

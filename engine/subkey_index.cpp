@@ -71,7 +71,7 @@ bool load_root(Store& store, uint32_t claimed, SubkeyIndex& index) {
 
 // Searches by halves in one order.
 Lookup search_by(Store& store, const SubkeyIndex& index, const Name& name, NameOrder order, uint32_t& position,
-               KeyView& key) {
+                 KeyView& key) {
     int64_t low = 0;
     int64_t high = int64_t{index.total} - 1;
     while (low <= high) {
@@ -92,7 +92,7 @@ Lookup search_by(Store& store, const SubkeyIndex& index, const Name& name, NameO
 
 // Looks at every entry. When the list turns out to be in upper-cased order throughout, that is noted in the store.
 Lookup search_each(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, uint32_t& position,
-                 KeyView& key) {
+                   KeyView& key) {
     KeyView other;
     KeyView* current = &key;
     KeyView* previous = &other;

@@ -20,13 +20,13 @@ struct Leaf {
 
 // What one index held when it was read. Nothing in it outlives a write: see generation.
 struct SubkeyIndex {
-    Cell cell;           // the key's own index: a leaf, or a root over leaves
+    Cell cell;  // the key's own index: a leaf, or a root over leaves
     bool is_root;
-    bool whole;          // every count was one that its cell can hold, every leaf a leaf
-    uint32_t total;      // entries of all leaves
+    bool whole;      // every count was one that its cell can hold, every leaf a leaf
+    uint32_t total;  // entries of all leaves
     uint32_t leaf_count;
-    uint32_t generation; // the store's when the index was read
-    Leaf* leaves;        // null for a single leaf, which then stands in only
+    uint32_t generation;  // the store's when the index was read
+    Leaf* leaves;         // null for a single leaf, which then stands in only
     Leaf only;
 
     const Leaf& leaf(uint32_t i) const { return leaves != nullptr ? leaves[i] : only; }
@@ -55,7 +55,7 @@ using NameOrder = int (*)(const Name& searched, const Name& stored);
 // by looking at each, unless the list of this key (its offset is parent) is known to be in upper-cased order.
 // found: position and key are set.
 Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
-                 uint32_t& position, KeyView& key);
+                   uint32_t& position, KeyView& key);
 // Where upper-cased order wants a new name. false when a record on the way cannot be read.
 bool place_for_name(Store& store, const SubkeyIndex& index, const Name& name, uint32_t& position);
 

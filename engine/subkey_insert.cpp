@@ -38,8 +38,7 @@ CellOffset place_key(Store& store, const KeyRecord& record, const Name& name) {
     memcpy(bytes, &record, sizeof record);
     memcpy(bytes + sizeof record, name.bytes, name.length);
     const CellOffset offset = allocate(store, length);
-    if (offset == CellOffset::none ||
-        write_at(store, sig_key, record_position(offset), bytes, length) == length)
+    if (offset == CellOffset::none || write_at(store, sig_key, record_position(offset), bytes, length) == length)
         return offset;
     free_cell(store, offset);
     return CellOffset::none;
@@ -57,8 +56,8 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
         return Inserted::exists;
     }
     // Where a sibling cannot be read, the name may be there already.
-    if (lookup == Lookup::unreadable || name.length == 0 || name.length > longest_key_name || !place_for_name(store, index, name, position) ||
-        !can_grow(index, position))
+    if (lookup == Lookup::unreadable || name.length == 0 || name.length > longest_key_name ||
+        !place_for_name(store, index, name, position) || !can_grow(index, position))
         return Inserted::failed;
 
     const CellOffset security = cell_offset(parent.record.security);
@@ -95,8 +94,8 @@ uint32_t set_parents(Store& store, const SubkeyIndex& children, uint32_t count, 
 }
 
 // Puts the renamed record in the old one's place; both are complete. Every child knows the new one already.
-int32_t switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position,
-                       const Name& name, CellOffset renamed) {
+int32_t switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position, const Name& name,
+                       CellOffset renamed) {
     uint32_t place = 0;
     if (!place_for_name(store, index, name, place))
         return R_CAN_NOT_COMPLETE;
@@ -105,8 +104,7 @@ int32_t switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, 
         changed.longest_subkey = 2 * name.length;
     if (rewrite_key(store, parent.offset(), parent.record, changed) != Outcome::written)
         return R_CAN_NOT_COMPLETE;
-    const Outcome outcome =
-        move_entry(store, parent.offset(), parent.record, index, position, place, renamed, name);
+    const Outcome outcome = move_entry(store, parent.offset(), parent.record, index, position, place, renamed, name);
     if (outcome == Outcome::unknown)
         return R_FAILED;
     return outcome == Outcome::written ? R_SUCCESS : R_CAN_NOT_COMPLETE;
@@ -142,8 +140,7 @@ int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, u
 //   the security record's count: one too high, which only keeps the record longer;
 //   the new record in its cell: out of reach;
 //   the entry in the list, see add_entry: the key is there.
-Inserted insert_subkey(Store& store, CellOffset parent_offset, const Name& name, bool new_reference,
-                       CellOffset& key) {
+Inserted insert_subkey(Store& store, CellOffset parent_offset, const Name& name, bool new_reference, CellOffset& key) {
     KeyView parent;
     SubkeyIndex index;
     if (!read_key(store, parent_offset, parent) || !is_own_cell(store, parent_offset) ||
@@ -177,8 +174,7 @@ int32_t rename_subkey(Store& store, CellOffset parent_offset, uint32_t position,
         uint32_t sibling_position;
         if (!index.whole || index.total != parent.record.subkey_count ||
             !read_key(store, subkey_at(store, index, position), old) || !is_own_cell(store, old.offset()) ||
-            find_subkey(store, index, parent_offset, name, compare_index, sibling_position, sibling) !=
-                Lookup::absent)
+            find_subkey(store, index, parent_offset, name, compare_index, sibling_position, sibling) != Lookup::absent)
             status = R_FAILED;
         else if (load_key_index(store, old.record, children))
             status = children.whole && children.total == old.record.subkey_count

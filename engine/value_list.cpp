@@ -51,7 +51,8 @@ void put_inline(ValueRecord& record, const NewValue& value) {
 
 // New data in a new cell, to which the record then leads; moved is the record as it stands afterwards. The old data
 // cell is left as it is.
-bool move_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value, ValueRecord& moved) {
+bool move_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value,
+               ValueRecord& moved) {
     const CellOffset cell = place_data(store, value);
     if (cell == CellOffset::none)
         return false;
@@ -151,8 +152,7 @@ CellOffset grow_list(Store& store, const ValueList& list) {
     const uint32_t length = list.count * slot_size;
     const Block slots(length);
     if (slots.bytes != nullptr && read_part(store, list.cell, 0, slots.bytes, length) &&
-        (length == 0 ||
-         write_at(store, sig_none, record_position(cell), slots.bytes, length) == length))
+        (length == 0 || write_at(store, sig_none, record_position(cell), slots.bytes, length) == length))
         return cell;
     free_cell(store, cell);
     return CellOffset::none;
@@ -257,13 +257,12 @@ int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueV
     return missing;
 }
 
-// A new value, in turn: its data cell, its record, its slot in the list (in a longer copy of the list, where that has no
-// room), the key's record with count and list, then the old list is freed. Until the key's record is written the value
-// is not there.
+// A new value, in turn: its data cell, its record, its slot in the list (in a longer copy of the list, where that has
+// no room), the key's record with count and list, then the old list is freed. Until the key's record is written the
+// value is not there.
 Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const NewValue& value) {
     const ValueList list = find_value_list(store, key);
-    if (!list.whole || !is_own_cell(store, key_offset) ||
-        (list.count > 0 && !is_own_cell(store, list.cell.offset)))
+    if (!list.whole || !is_own_cell(store, key_offset) || (list.count > 0 && !is_own_cell(store, list.cell.offset)))
         return Stored::failed;
     ValueView old;
     const int32_t position = find_value(store, list, value.name, old);

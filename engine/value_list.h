@@ -9,9 +9,9 @@
 namespace engine {
 
 struct ValueList {
-    Cell cell;          // the list's; undefined when there is no list
-    uint32_t count;     // as many as the cell can hold, at most the record's own count
-    bool whole;         // count is the record's own: the list may be changed
+    Cell cell;       // the list's; undefined when there is no list
+    uint32_t count;  // as many as the cell can hold, at most the record's own count
+    bool whole;      // count is the record's own: the list may be changed
 };
 
 // Reads where the key's list lies and what it can hold.

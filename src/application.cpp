@@ -45,7 +45,7 @@ QByteArray& file_being_opened() {
     std::abort();
 }
 
-} // namespace
+}  // namespace
 
 Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
     // A bare X session names no icon theme that holds the folder icon of the key tree.

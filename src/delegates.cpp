@@ -129,7 +129,7 @@ void report_key_failure(const QModelIndex& index, const std::exception& failure)
     FailureReport::instance().report(key_path_of(index), failure);
 }
 
-} // namespace
+}  // namespace
 
 ValueDelegate::ValueDelegate(QWidget* main_window) : m_main_window(main_window) {}
 

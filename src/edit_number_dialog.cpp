@@ -19,8 +19,8 @@
 namespace {
 
 QValidator* make_hex_validator(int bits, QObject* parent) {
-    const QString pattern = bits > 32 ? QStringLiteral("([a-f]|[A-F]|[0-9]){0,16}")
-                                      : QStringLiteral("([a-f]|[A-F]|[0-9]){0,8}");
+    const QString pattern =
+        bits > 32 ? QStringLiteral("([a-f]|[A-F]|[0-9]){0,16}") : QStringLiteral("([a-f]|[A-F]|[0-9]){0,8}");
     return new QRegularExpressionValidator(QRegularExpression(pattern), parent);
 }
 
@@ -31,7 +31,7 @@ QValidator* make_dec_validator(int bits, QObject* parent) {
     return new UintValidator(0, std::numeric_limits<quint32>::max(), parent);
 }
 
-} // namespace
+}  // namespace
 
 EditNumberDialog::EditNumberDialog(const QString& value_name, int bits)
     : data_edit(new QLineEdit), hex_button(new QRadioButton(tr("Hexadecimal"))),

@@ -11,7 +11,7 @@ namespace {
 // A hive can hold thousands of damaged keys; a box must still fit the screen.
 constexpr qsizetype max_lines = 10;
 
-} // namespace
+}  // namespace
 
 FailureReport::FailureReport(QObject* parent) : QObject(parent) {}
 

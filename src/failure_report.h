@@ -37,7 +37,7 @@ private:
     void show_pending();
 
     QString m_current_key;
-    QSet<QPair<QString, QString>> m_told; // key path and reason
+    QSet<QPair<QString, QString>> m_told;  // key path and reason
     QStringList m_pending;
     bool m_scheduled = false;
 };

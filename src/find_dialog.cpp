@@ -25,12 +25,9 @@ bool ask_find_request(FindRequest& request) {
     auto* values_box = new QCheckBox(QCoreApplication::translate("MainWindow", "Find values"));
     values_box->setChecked(request.mode.testFlag(RegModel::FindValues));
     // Children of the dialog from the start: only among siblings does checking one uncheck the others.
-    auto* substring_button =
-        new QRadioButton(QCoreApplication::translate("MainWindow", "Find substring"), &dialog);
-    auto* whole_button =
-        new QRadioButton(QCoreApplication::translate("MainWindow", "Find whole string"), &dialog);
-    auto* wildcard_button =
-        new QRadioButton(QCoreApplication::translate("MainWindow", "Use wildcards"), &dialog);
+    auto* substring_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Find substring"), &dialog);
+    auto* whole_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Find whole string"), &dialog);
+    auto* wildcard_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Use wildcards"), &dialog);
     substring_button->setChecked(true);
     if (request.flags == Qt::MatchFixedString) {
         whole_button->setChecked(true);
@@ -42,9 +39,8 @@ bool ask_find_request(FindRequest& request) {
     QObject::connect(buttons, &QDialogButtonBox::rejected, &dialog, &QDialog::reject);
 
     auto* layout = new QVBoxLayout(&dialog);
-    for (QWidget* widget :
-         std::initializer_list<QWidget*>{term_label, term_edit, keys_box, values_box, substring_button,
-                                         whole_button, wildcard_button, buttons}) {
+    for (QWidget* widget : std::initializer_list<QWidget*>{term_label, term_edit, keys_box, values_box,
+                                                           substring_button, whole_button, wildcard_button, buttons}) {
         layout->addWidget(widget);
     }
     // The layout's own minimum first, so that the height which is then fixed is the one that the dialog has.
@@ -71,8 +67,7 @@ QDialog* make_searching_dialog(QWidget* parent) {
     auto* dialog = new QDialog(parent);
     dialog->setAttribute(Qt::WA_DeleteOnClose);
     // The comment lacks its closing parenthesis in every translation too: it is part of the text's identity.
-    dialog->setWindowTitle(
-        QCoreApplication::translate("MainWindow", "Find", "dialog title (search in progress"));
+    dialog->setWindowTitle(QCoreApplication::translate("MainWindow", "Find", "dialog title (search in progress"));
     dialog->setAccessibleName(QStringLiteral("Searching..."));
     auto* busy = new QProgressBar;
     busy->setRange(0, 0);

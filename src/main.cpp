@@ -18,15 +18,14 @@ constexpr int exit_usage = 1;
 constexpr int exit_hibernated = 2;
 
 void tell_hibernated() {
-    QMessageBox::critical(
-        nullptr, QObject::tr("Hibernation Detected"),
-        QObject::tr("Your system is in hibernate mode. Therefore the registry cannot be edited. "
-                    "Please restart your system and exit the hibernate mode or contact Zenta "
-                    "Support"),
-        QMessageBox::Ok, QMessageBox::NoButton);
+    QMessageBox::critical(nullptr, QObject::tr("Hibernation Detected"),
+                          QObject::tr("Your system is in hibernate mode. Therefore the registry cannot be edited. "
+                                      "Please restart your system and exit the hibernate mode or contact Zenta "
+                                      "Support"),
+                          QMessageBox::Ok, QMessageBox::NoButton);
 }
 
-} // namespace
+}  // namespace
 
 int main(int argc, char** argv) {
     install_terminate_handler();

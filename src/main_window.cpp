@@ -33,7 +33,7 @@ int depth_of(const QModelIndex& index) {
     return depth;
 }
 
-} // namespace
+}  // namespace
 
 MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
     : QMainWindow(parent, flags), key_delegate(this), value_delegate(this),
@@ -97,9 +97,9 @@ void MainWindow::make_menus() {
     QMenu* new_menu = edit_menu->addMenu(tr("&New", "menu title"));
     new_menu->addAction(actions.new_key_action);
     new_menu->addSeparator();
-    for (QAction* action : {actions.new_string_action, actions.new_binary_action, actions.new_dword_action,
-                            actions.new_qword_action, actions.new_multi_string_action,
-                            actions.new_expand_string_action}) {
+    for (QAction* action :
+         {actions.new_string_action, actions.new_binary_action, actions.new_dword_action, actions.new_qword_action,
+          actions.new_multi_string_action, actions.new_expand_string_action}) {
         new_menu->addAction(action);
     }
     edit_menu->addSeparator();
@@ -165,9 +165,7 @@ void MainWindow::reload_values(const QModelIndex& current) {
             qOverload<const QModelIndex&, const QModelIndex&>(&MainWindow::value_selected));
 }
 
-void MainWindow::reload_values(const QModelIndex& current, const QModelIndex& /*previous*/) {
-    reload_values(current);
-}
+void MainWindow::reload_values(const QModelIndex& current, const QModelIndex& /*previous*/) { reload_values(current); }
 
 // A key whose values cannot be read is told, and shows an empty table: the window must not go on asking it.
 void MainWindow::show_values_of(const QModelIndex& key) {

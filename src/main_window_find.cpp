@@ -33,7 +33,7 @@ QString failure_of(QFuture<RegModel::FindResult> future) {
     return {};
 }
 
-} // namespace
+}  // namespace
 
 void MainWindow::show_find_dialog() {
     FindRequest request{find_term, find_mode, find_flags};
@@ -108,8 +108,7 @@ void MainWindow::show_find_result() {
         return;
     }
     can_find_next = false;
-    QMessageBox::information(this, QCoreApplication::applicationName(), tr("Finished searching."),
-                             QMessageBox::Ok);
+    QMessageBox::information(this, QCoreApplication::applicationName(), tr("Finished searching."), QMessageBox::Ok);
 }
 
 void MainWindow::show_hit(const RegModel::FindResult& hit) {

@@ -49,8 +49,8 @@ public:
     // Bytes of the hive file.
     qint64 file_size() const { return file_.size(); }
 
-    // The engine handle of a key of this hive; opened and cached when it is not there. Valid only while the caller holds
-    // both locks, see Dialogue. std::runtime_error("ROpenSubKey failed").
+    // The engine handle of a key of this hive; opened and cached when it is not there. Valid only while the caller
+    // holds both locks, see Dialogue. std::runtime_error("ROpenSubKey failed").
     RegistryKey* key_handle(const RegKey* key);
     // The same for a key that its parent does not list yet.
     RegistryKey* open_child_handle(const RegKey* key, const RegKey* parent, int index);

@@ -241,8 +241,7 @@ bool RegKey::delete_key(int index) {
     uint32_t size = name_room;
     // Only the key at this position is meant: a name that leads to another one deletes nothing.
     if (index < 0 ||
-        REnumKeyExA(handle, static_cast<uint32_t>(index), name.data(), &size, nullptr, nullptr, nullptr) !=
-            R_SUCCESS ||
+        REnumKeyExA(handle, static_cast<uint32_t>(index), name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
         position_by_path(handle, name.data()) != index || RDeleteKey(handle, name.data()) != R_SUCCESS)
         return false;
     const auto slot = children_.begin() + index;

@@ -25,8 +25,8 @@ public:
 
     // The child in a slot; the base neither checks nor creates.
     virtual AbstractRegKey* child(int i);
-    // The same for a row that is shown: where the child cannot be opened, an object without subkeys stands for it, which
-    // throws when it is asked for anything, so that one damaged record does not hide its siblings.
+    // The same for a row that is shown: where the child cannot be opened, an object without subkeys stands for it,
+    // which throws when it is asked for anything, so that one damaged record does not hide its siblings.
     virtual AbstractRegKey* shown_child(int i) { return child(i); }
     virtual QString name() = 0;
 
@@ -84,8 +84,8 @@ public:
     bool delete_key(int index);
     // Whether the index-th subkey can be deleted with all below it. Changes nothing.
     bool can_delete_tree(int index);
-    // Renames the index-th subkey; returns its new position. -1: refused by the engine (a sibling has the name, or 8 bits
-    // cannot carry it); -2: renamed, but not found afterwards; -3: longer than 255 characters.
+    // Renames the index-th subkey; returns its new position. -1: refused by the engine (a sibling has the name, or 8
+    // bits cannot carry it); -2: renamed, but not found afterwards; -3: longer than 255 characters.
     int rename_key(int index, const QString& new_name);
 
     // ---- values, by their position in the key's value list ----

@@ -60,8 +60,7 @@ template <typename T>
 bool read_number(RegistryKey* handle, int index, T& number) {
     uint32_t size = sizeof number;
     std::array<uchar, sizeof number> bytes = {};
-    if (REnumValueW(handle, static_cast<uint32_t>(index), nullptr, nullptr, nullptr, bytes.data(), &size) !=
-        R_SUCCESS)
+    if (REnumValueW(handle, static_cast<uint32_t>(index), nullptr, nullptr, nullptr, bytes.data(), &size) != R_SUCCESS)
         return false;
     number = qFromLittleEndian<T>(bytes.data());
     return true;
@@ -183,8 +182,8 @@ bool RegKey::store_value(const QString& name, uint type, const QByteArray& data,
     // Only the value at the index is meant: a name that leads to another one writes nothing.
     if (index != any_value && RFindValueA(handle, stored.bytes.constData()) != index)
         return false;
-    return RSetValueExW(handle, stored.bytes.constData(), type, data.constData(),
-                        static_cast<uint32_t>(data.size())) == R_SUCCESS;
+    return RSetValueExW(handle, stored.bytes.constData(), type, data.constData(), static_cast<uint32_t>(data.size())) ==
+           R_SUCCESS;
 }
 
 bool RegKey::set_string_value(const QString& name, const QString& text, uint type, int index) {

@@ -34,8 +34,8 @@ void RegModel::add_hive(const QString& name, const QString& file) {
     const QStringList parts = split_mount_name(name);
     if (parts.size() < 2)
         throw std::out_of_range("a mount name has the form TOP/HIVE");
-    const auto found = std::find_if(top_level_.begin(), top_level_.end(),
-                                    [&](const auto& key) { return key->name() == parts[0]; });
+    const auto found =
+        std::find_if(top_level_.begin(), top_level_.end(), [&](const auto& key) { return key->name() == parts[0]; });
     AbstractRegKey* top = found != top_level_.end() ? found->get() : nullptr;
     if (top == nullptr) {
         top_level_.push_back(std::make_unique<DummyRegKey>(parts[0]));
@@ -52,8 +52,8 @@ AbstractRegKey* RegModel::key_of(const QModelIndex& index) {
 int RegModel::row_of(const AbstractRegKey* key) const {
     if (key->parent() != nullptr)
         return key->child_number();
-    const auto found = std::find_if(top_level_.begin(), top_level_.end(),
-                                    [&](const auto& top) { return top.get() == key; });
+    const auto found =
+        std::find_if(top_level_.begin(), top_level_.end(), [&](const auto& top) { return top.get() == key; });
     return static_cast<int>(found - top_level_.begin());
 }
 

@@ -104,8 +104,8 @@ RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mod
     const QString text = term.toString();
     const int kind = static_cast<int>(flags) & 0xF;
     CurrentNames names;
-    // The stack is the worker's from here on and goes back at the end. The pool orders the two ends already, but in code
-    // that the thread sanitizer cannot see.
+    // The stack is the worker's from here on and goes back at the end. The pool orders the two ends already, but in
+    // code that the thread sanitizer cannot see.
     const HandOver hand_over(&mutex_);
     int counter = 1;
     while (!search_.empty()) {

@@ -14,10 +14,8 @@ SharedActions make_actions() {
     set.new_action_group = new QActionGroup(nullptr);
     QActionGroup& group = *set.new_action_group;
     set.new_key_action = group.addAction(QCoreApplication::translate("MainWindow", "Key", "menu item"));
-    set.new_string_action =
-        group.addAction(QCoreApplication::translate("MainWindow", "String Value", "menu item"));
-    set.new_binary_action =
-        group.addAction(QCoreApplication::translate("MainWindow", "Binary Value", "menu item"));
+    set.new_string_action = group.addAction(QCoreApplication::translate("MainWindow", "String Value", "menu item"));
+    set.new_binary_action = group.addAction(QCoreApplication::translate("MainWindow", "Binary Value", "menu item"));
     set.new_dword_action =
         group.addAction(QCoreApplication::translate("MainWindow", "DWORD (32-bit) Value", "menu item"));
     set.new_qword_action =
@@ -26,11 +24,9 @@ SharedActions make_actions() {
         group.addAction(QCoreApplication::translate("MainWindow", "Multi-String Value", "menu item"));
     set.new_expand_string_action =
         group.addAction(QCoreApplication::translate("MainWindow", "Expandable String Value", "menu item"));
-    set.delete_action =
-        new QAction(QCoreApplication::translate("MainWindow", "Delete", "menu item"), nullptr);
+    set.delete_action = new QAction(QCoreApplication::translate("MainWindow", "Delete", "menu item"), nullptr);
     set.delete_action->setShortcut(QKeySequence::Delete);
-    set.rename_action =
-        new QAction(QCoreApplication::translate("MainWindow", "Rename", "menu item"), nullptr);
+    set.rename_action = new QAction(QCoreApplication::translate("MainWindow", "Rename", "menu item"), nullptr);
 
     group.setEnabled(false);
     set.delete_action->setEnabled(false);
@@ -38,7 +34,7 @@ SharedActions make_actions() {
     return set;
 }
 
-} // namespace
+}  // namespace
 
 const SharedActions& shared_actions() {
     static const SharedActions the_actions = make_actions();

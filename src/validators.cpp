@@ -26,7 +26,7 @@ QValidator::State judge(const QString& input, Number bottom, Number top, Parse p
     return number > top ? QValidator::Invalid : QValidator::Acceptable;
 }
 
-} // namespace
+}  // namespace
 
 UintValidator::UintValidator(quint32 bottom, quint32 top, QObject* parent)
     : QValidator(parent), m_bottom(bottom), m_top(top) {}

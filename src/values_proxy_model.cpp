@@ -81,8 +81,7 @@ QModelIndex ValuesProxyModel::mapFromSource(const QModelIndex& source_index) con
     if (!source_index.isValid())
         return QModelIndex();
     const auto found = std::find(mapping_.begin(), mapping_.end(), source_index.row());
-    const int position =
-        found != mapping_.end() ? static_cast<int>(found - mapping_.begin()) : source_index.row();
+    const int position = found != mapping_.end() ? static_cast<int>(found - mapping_.begin()) : source_index.row();
     return index(position + offset(), source_index.column());
 }
 
@@ -141,8 +140,8 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
     return true;
 }
 
-// After a rename: the source has the value at its end now, and those behind it one row higher. The shown row stays where
-// the user sees it until the next sort.
+// After a rename: the source has the value at its end now, and those behind it one row higher. The shown row stays
+// where the user sees it until the next sort.
 void ValuesProxyModel::move_to_end(int row) {
     const auto position = static_cast<size_t>(row - offset());
     if (position >= mapping_.size())
@@ -239,8 +238,8 @@ bool ValuesProxyModel::add_value(int type) {
     return added;
 }
 
-// With the source's row numbers as they are, without the offset: the rows are announced where they always were, and what
-// matters to a view, their number, is right.
+// With the source's row numbers as they are, without the offset: the rows are announced where they always were, and
+// what matters to a view, their number, is right.
 void ValuesProxyModel::on_rows_inserted(const QModelIndex&, int first, int last) {
     beginInsertRows(QModelIndex(), first, last);
     endInsertRows();

@@ -10,8 +10,8 @@
 
 class RegKey;
 
-// When the key has no unnamed value, row 0 is made up for it; every other row maps to a source row. Positions behind the
-// sorted ones (values added since) map to themselves, which keeps a new value at the bottom until the next sort.
+// When the key has no unnamed value, row 0 is made up for it; every other row maps to a source row. Positions behind
+// the sorted ones (values added since) map to themselves, which keeps a new value at the bottom until the next sort.
 class ValuesProxyModel : public QAbstractProxyModel {
     Q_OBJECT
 

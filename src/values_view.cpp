@@ -49,7 +49,7 @@ int type_created_by(const QAction* action) {
     return -1;
 }
 
-} // namespace
+}  // namespace
 
 ValuesView::ValuesView(QWidget* parent) : QTableView(parent) {
     const SharedActions& actions = shared_actions();
@@ -156,9 +156,9 @@ void ValuesView::show_values_context_menu(QPoint point) {
     QMenu* new_menu = menu.addMenu(tr("New", "menu title"));
     new_menu->addAction(actions.new_key_action);
     new_menu->addSeparator();
-    for (QAction* action : {actions.new_string_action, actions.new_binary_action, actions.new_dword_action,
-                            actions.new_qword_action, actions.new_multi_string_action,
-                            actions.new_expand_string_action}) {
+    for (QAction* action :
+         {actions.new_string_action, actions.new_binary_action, actions.new_dword_action, actions.new_qword_action,
+          actions.new_multi_string_action, actions.new_expand_string_action}) {
         new_menu->addAction(action);
     }
     menu.exec(viewport()->mapToGlobal(point));
@@ -184,8 +184,7 @@ void ValuesView::run_delete_value_action(bool /*checked*/) {
     if (!hasFocus() || !model() || !currentIndex().isValid()) {
         return;
     }
-    if (QMessageBox::question(this, tr("Confirm Value Removal"),
-                              tr("Are you sure you want to delete this value?"),
+    if (QMessageBox::question(this, tr("Confirm Value Removal"), tr("Are you sure you want to delete this value?"),
                               QMessageBox::Yes | QMessageBox::No) != QMessageBox::Yes) {
         return;
     }

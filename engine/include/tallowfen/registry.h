@@ -47,10 +47,10 @@ enum RegistryStatus : int32_t {
 
 // What a handle stands for (the first field of a key handle).
 enum RegistryHandleFlag : uint32_t {
-    R_HANDLE_UTF16_NAME = 4,   // the key's name is stored in UTF-16
-    R_HANDLE_HIVE = 8,         // the root handle, which owns the hive
-    R_HANDLE_LINK = 16,        // the key is a symbolic link
-    R_HANDLE_KEY = 32,         // an ordinary key: neither a link nor flagged as a hive's root
+    R_HANDLE_UTF16_NAME = 4,  // the key's name is stored in UTF-16
+    R_HANDLE_HIVE = 8,        // the root handle, which owns the hive
+    R_HANDLE_LINK = 16,       // the key is a symbolic link
+    R_HANDLE_KEY = 32,        // an ordinary key: neither a link nor flagged as a hive's root
 };
 
 // An open key. Made by ROpenHive, ROpenSubKey, ROpenKey, ROpenKeyEx and RCreateKey; released by RCloseKey alone.
