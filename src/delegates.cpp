@@ -8,14 +8,13 @@
 #include <QItemEditorFactory>
 #include <QMessageBox>
 #include <QMetaProperty>
+#include <QScopedValueRollback>
 
 #include <algorithm>
 #include <cstdio>
-#include <limits>
 
 namespace {
 
-constexpr qsizetype no_limit = std::numeric_limits<qsizetype>::max();
 // A cell shows no more letters than half its width in pixels; a row that is measured before it has a width is measured
 // by this many.
 constexpr qsizetype shortest_cut = 256;
@@ -47,7 +46,7 @@ QString joined(const QStringList& strings, qsizetype limit) {
 QString rendered(const QVariant& value, qsizetype limit) {
     switch (value.typeId()) {
     case QMetaType::QString:
-        return limit == no_limit ? value.toString() : value.toString().left(limit);
+        return value.toString().left(limit);
     case QMetaType::UInt: {
         char text[32];
         std::snprintf(text, sizeof text, "0x%08x (%u)", value.toUInt(), value.toUInt());
@@ -73,30 +72,6 @@ QString rendered(const QVariant& value, qsizetype limit) {
     }
     std::printf("fallback: rendering '%s' as string\n", value.typeName());
     return value.toString();
-}
-
-// Whether rendering all of the datum costs more than showing `limit` characters of it.
-bool is_longer(const QVariant& value, qsizetype limit) {
-    switch (value.typeId()) {
-    case QMetaType::QString:
-        return value.toString().size() > limit;
-    case QMetaType::QByteArray:
-        return value.toByteArray().size() > limit / 3;
-    case QMetaType::QStringList: {
-        // const, or the loop would copy the list first.
-        const QStringList strings = value.toStringList();
-        qsizetype length = 0;
-        for (const QString& text : strings) {
-            length += text.size() + 1;
-            if (length > limit) {
-                return true;
-            }
-        }
-        return false;
-    }
-    default:
-        return false;
-    }
 }
 
 // Writes the editor's text back when it was changed; false when the model refused it.
@@ -134,7 +109,7 @@ void report_key_failure(const QModelIndex& index, const std::exception& failure)
 ValueDelegate::ValueDelegate(QWidget* main_window) : m_main_window(main_window) {}
 
 QString ValueDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
-    return rendered(value, no_limit);
+    return rendered(value, m_limit);
 }
 
 void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
@@ -163,16 +138,9 @@ QSize ValueDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIn
 void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
     try {
         const qsizetype limit = std::max<qsizetype>(shortest_cut, option->rect.width() / 2);
-        const QVariant value = index.data(Qt::DisplayRole);
-        if (!is_longer(value, limit)) {
-            QStyledItemDelegate::initStyleOption(option, index);
-            return;
-        }
-        // An index without data takes the base class through all but the text.
-        QStyledItemDelegate::initStyleOption(option, QModelIndex());
-        option->index = index;
-        option->features |= QStyleOptionViewItem::HasDisplay;
-        option->text = rendered(value, limit);
+        // The base class asks displayText for the text, and takes font, icon and colours from the same index.
+        const QScopedValueRollback<qsizetype> cut(m_limit, limit);
+        QStyledItemDelegate::initStyleOption(option, index);
     } catch (const std::exception& failure) {
         report_value_failure(failure);
     }

@@ -7,6 +7,8 @@
 
 #include <QStyledItemDelegate>
 
+#include <limits>
+
 class ValueDelegate : public QStyledItemDelegate {
     Q_OBJECT
 
@@ -27,6 +29,8 @@ protected:
 
 private:
     QWidget* m_main_window;
+    // How many characters displayText need give; fewer than all only while a cell is laid out.
+    mutable qsizetype m_limit = std::numeric_limits<qsizetype>::max();
 };
 
 class KeyDelegate : public QStyledItemDelegate {

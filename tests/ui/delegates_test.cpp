@@ -106,6 +106,7 @@ private slots:
     void a_megabyte_paints_like_a_kilobyte();
     void what_a_cell_shows_is_the_beginning_of_the_text_data();
     void what_a_cell_shows_is_the_beginning_of_the_text();
+    void each_cell_has_its_own_icon();
 };
 
 void DelegatesTest::text_by_type_data() {
@@ -315,6 +316,38 @@ void DelegatesTest::what_a_cell_shows_is_the_beginning_of_the_text() {
         return image;
     };
     QCOMPARE(painted(ValueDelegate(nullptr)), painted(PlainDelegate()));
+}
+
+// One delegate paints all cells in turn, and what it takes from one must not stay for the next.
+void DelegatesTest::each_cell_has_its_own_icon() {
+    QPixmap red(16, 16);
+    red.fill(Qt::red);
+    QStandardItemModel model(1, 2);
+    model.setData(model.index(0, 0), QString(300, QLatin1Char('n')), Qt::DisplayRole);
+    model.setData(model.index(0, 0), QIcon(red), Qt::DecorationRole);
+    model.setData(model.index(0, 1), QString(300, QLatin1Char('d')), Qt::DisplayRole);
+    const ValueDelegate delegate(nullptr);
+    const auto red_pixels = [&](int column) {
+        QImage image(300, 20, QImage::Format_RGB32);
+        image.fill(Qt::white);
+        QPainter painter(&image);
+        QStyleOptionViewItem option;
+        option.rect = image.rect();
+        option.state = QStyle::State_Enabled;
+        option.decorationSize = red.size();
+        delegate.paint(&painter, option, model.index(0, column));
+        painter.end();
+        int count = 0;
+        for (int y = 0; y < image.height(); ++y) {
+            for (int x = 0; x < image.width(); ++x) {
+                count += image.pixelColor(x, y) == Qt::red ? 1 : 0;
+            }
+        }
+        return count;
+    };
+    QCOMPARE(red_pixels(0), 16 * 16);
+    QCOMPARE(red_pixels(1), 0);
+    QCOMPARE(red_pixels(0), 16 * 16);
 }
 
 UI_TEST_MAIN(DelegatesTest)
