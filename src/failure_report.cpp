@@ -58,8 +58,11 @@ void FailureReport::show_pending() {
             lines.append(tr("More keys cannot be read: %1").arg(m_pending.size() - max_lines));
         }
         m_pending.clear();
-        QMessageBox::critical(QApplication::activeWindow(), QCoreApplication::applicationName(),
-                              lines.join(QLatin1Char('\n')), QMessageBox::Ok);
+        QMessageBox box(QMessageBox::Critical, QCoreApplication::applicationName(), lines.join(QLatin1Char('\n')),
+                        QMessageBox::Ok, QApplication::activeWindow());
+        // A key's name may look like markup.
+        box.setTextFormat(Qt::PlainText);
+        box.exec();
     }
     m_scheduled = false;
 }

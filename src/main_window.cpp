@@ -138,7 +138,8 @@ void MainWindow::set_model(RegModel* model) {
 void MainWindow::show_status(const QModelIndex& key) {
     const QString path = key_path_of(key);
     status_label->setText(path);
-    status_label->setToolTip(path.toHtmlEscaped());
+    // Made into a paragraph here, so that the tip takes no name for markup.
+    status_label->setToolTip(path.isEmpty() ? path : Qt::convertFromPlainText(path));
     FailureReport::instance().set_current_key(path);
 }
 

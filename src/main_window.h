@@ -70,9 +70,9 @@ private:
     QLabel* status_label = nullptr;
     KeyDelegate key_delegate;
     ValueDelegate value_delegate;
-    // The source before the proxy, which is therefore destroyed first and never sees a source that is gone.
-    std::unique_ptr<ValuesModel> values_source;
+    // Destroyed from the last one on: the source model, then the proxy over it.
     std::unique_ptr<ValuesProxyModel> values_proxy;
+    std::unique_ptr<ValuesModel> values_source;
     QDialog* search_dialog = nullptr;
     QString find_term;
     RegModel::FindMode find_mode;

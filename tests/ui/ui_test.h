@@ -51,6 +51,7 @@ public:
             icon = box->icon();
             title = box->windowTitle();
             text = box->text();
+            format = box->textFormat();
             parent = box->parentWidget();
             buttons = box->standardButtons();
             QTest::mouseClick(box->button(button), Qt::LeftButton);
@@ -63,6 +64,7 @@ public:
     QMessageBox::Icon icon = QMessageBox::NoIcon;
     QString title;
     QString text;
+    Qt::TextFormat format = Qt::AutoText;
     QWidget* parent = nullptr;
     QMessageBox::StandardButtons buttons;
 
