@@ -10,6 +10,13 @@ namespace {
 
 constexpr int most_cached_rows = 100;
 
+// Whether an editor hands back what it was given. A text without lines becomes a list of one empty string in it.
+bool is_same_data(const QVariant& old, const QVariant& given) {
+    if (old.typeId() == QMetaType::QStringList && old.toStringList().isEmpty())
+        return given.toStringList().join(QString()).isEmpty();
+    return old == given;
+}
+
 }  // namespace
 
 ValuesModel::ValuesModel(RegKey* key, QObject* parent)
@@ -107,6 +114,10 @@ bool ValuesModel::store(int row, const QVariant& value) {
     const RegValue old = *lookup(row);
     if (!old.data.isValid())
         return false;
+    // The bytes may say more than the data that is made of them: text behind a zero, an odd byte, a number too short.
+    // They go only when the user puts other data in their place.
+    if (is_same_data(old.data, value))
+        return true;
     switch (old.type) {
     case REG_SZ:
     case REG_EXPAND_SZ:
