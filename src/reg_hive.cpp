@@ -79,8 +79,8 @@ RegHive::RegHive(const QString& name, const QString& path, AbstractRegKey* paren
     : name_(name), file_(path), handle_cache_(most_handles), io_(std::make_unique<RegistryIo>()) {
     open_file();
     try {
-        warn_if_dirty();
         load();
+        warn_if_dirty();
         root_ = std::make_unique<RegKey>(this, parent);
         root_->reload();
     } catch (...) {
@@ -123,7 +123,6 @@ void RegHive::warn_if_dirty() {
         memcmp(numbers, numbers + 4, 4) != 0)
         std::fprintf(stderr, "warning: %s was not closed properly; Windows may replay its logs over changes\n",
                      qPrintable(file_.fileName()));
-    file_.seek(0);
 }
 
 void RegHive::load() {

@@ -76,6 +76,7 @@ private slots:
     void a_name_without_two_parts_mounts_nothing_data();
     void a_name_without_two_parts_mounts_nothing();
     void pairs_are_mounted_in_order();
+    void a_hive_that_was_not_closed_properly_is_told();
     void the_event_loop_s_result_is_the_exit_status();
     void the_translation_line();
     void a_file_that_is_no_hive_ends_the_program_data();
@@ -159,6 +160,22 @@ void EntryTest::pairs_are_mounted_in_order() {
                                        "style: QStatusBar::item { border: 0px solid black }\n"));
 }
 
+void EntryTest::a_hive_that_was_not_closed_properly_is_told() {
+    const Scene scene;
+    QFile file(scene.file());
+    constexpr qint64 second_sequence = 8;
+    QVERIFY(file.open(QIODevice::ReadWrite) && file.seek(second_sequence));
+    QCOMPARE(file.write("\x7f", 1), qint64(1));
+    file.close();
+    const QByteArray before = scene.bytes();
+    const Ended ended = run({tops, scene.file()}, {{QStringLiteral("PRESSER_EXIT"), QStringLiteral("0")}});
+    QCOMPARE(ended.status, 0);
+    QCOMPARE(told(ended),
+             QStringLiteral("warning: %1 was not closed properly; Windows may replay its logs over changes\n")
+                 .arg(scene.file()));
+    QCOMPARE(scene.bytes(), before);
+}
+
 void EntryTest::the_event_loop_s_result_is_the_exit_status() {
     const Scene scene;
     const Ended ended = run({tops, scene.file()}, {{QStringLiteral("PRESSER_EXIT"), QStringLiteral("7")}});
@@ -202,7 +219,7 @@ void EntryTest::a_file_that_is_no_hive_ends_the_program() {
         QVERIFY(file.open(QIODevice::WriteOnly));
         file.write(kind == QStringLiteral("cut")
                        ? sound.bytes().left(4000)
-                       : QByteArray(kind == QStringLiteral("text") ? "no hive\n" : ""));
+                       : QByteArray(kind == QStringLiteral("text") ? "no hive\n" : "").repeated(1000));
         file.close();
     } else if (kind == QStringLiteral("locked")) {
         QVERIFY(file.open(QIODevice::ReadWrite));
