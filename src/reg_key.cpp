@@ -26,6 +26,14 @@ int32_t subkey_name(RegistryKey* handle, uint32_t index, NameBuffer& name) {
     return REnumKeyInfoA(handle, index, name.data(), &size, nullptr, nullptr, nullptr, nullptr);
 }
 
+uint32_t subkey_count(RegistryKey* handle) {
+    uint32_t count = 0;
+    if (RQueryInfoKeyW(handle, nullptr, nullptr, nullptr, nullptr, &count, nullptr, nullptr, nullptr, nullptr, nullptr,
+                       nullptr, nullptr) != R_SUCCESS)
+        throw std::runtime_error("RQueryInfoKeyW failed");
+    return count;
+}
+
 // The position that the engine's own look-up finds a name at, -1 when it finds none.
 int position_by_path(RegistryKey* handle, const char* name) {
     RegistryKey* found = nullptr;
@@ -58,13 +66,15 @@ int AbstractRegKey::child_number() const {
     const auto locker = parent_->lock_children();
     const auto& siblings = parent_->children_;
     // Views ask for this over and over; a key with 50,000 siblings is not to be searched for each time.
-    if (number_hint_ < siblings.size() && siblings[number_hint_] == this)
-        return static_cast<int>(number_hint_);
+    const size_t hint = number_hint_;
+    if (hint < siblings.size() && siblings[hint] == this)
+        return static_cast<int>(hint);
     const auto found = std::find(siblings.begin(), siblings.end(), this);
     if (found == siblings.end())
         return -1;
-    number_hint_ = static_cast<size_t>(found - siblings.begin());
-    return static_cast<int>(number_hint_);
+    const auto number = static_cast<int>(found - siblings.begin());
+    number_hint_ = static_cast<size_t>(number);
+    return number;
 }
 
 void AbstractRegKey::add_child(AbstractRegKey* key) {
@@ -121,6 +131,18 @@ AbstractRegKey* RegKey::shown_child(int i) {
     }
 }
 
+bool RegKey::is_below_itself() const {
+    const RegHive::Dialogue dialogue(hive_);
+    if (offset_ == UINT32_MAX)
+        return false;
+    for (const RegKey* key = this; key != hive_->root_key();) {
+        key = static_cast<const RegKey*>(key->parent());
+        if (key->offset_ == offset_)
+            return true;
+    }
+    return false;
+}
+
 QString RegKey::name() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
@@ -140,12 +162,11 @@ QString RegKey::name() {
 }
 
 void RegKey::refresh_children(RegistryKey* handle) {
-    uint32_t count = 0;
-    if (RQueryInfoKeyW(handle, nullptr, nullptr, nullptr, nullptr, &count, nullptr, nullptr, nullptr, nullptr, nullptr,
-                       nullptr, nullptr) != R_SUCCESS)
-        throw std::runtime_error("RQueryInfoKeyW failed");
-    children_.resize(count, nullptr);
+    children_.resize(subkey_count(handle), nullptr);
+    offset_ = RKeyOffset(handle);
 }
+
+bool RegKey::slots_agree(RegistryKey* handle) const { return children_.size() == subkey_count(handle); }
 
 void RegKey::reload() {
     const RegHive::Dialogue dialogue(hive_);
@@ -168,7 +189,7 @@ int RegKey::value_count() {
     return values;
 }
 
-bool RegKey::has_default_value() {
+int RegKey::default_value_position() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
     std::array<uint16_t, 512> name;
@@ -176,9 +197,9 @@ bool RegKey::has_default_value() {
         auto size = static_cast<uint32_t>(sizeof name);
         const int32_t status = REnumValueW(handle, i, name.data(), &size, nullptr, nullptr, nullptr);
         if (status == R_NO_MORE_ITEMS)
-            return false;
+            return -1;
         if (size == 0)
-            return true;
+            return static_cast<int>(i);
     }
 }
 
@@ -212,6 +233,9 @@ int RegKey::find_child_position(RegistryKey* handle, const QByteArray& name) {
 int RegKey::new_key() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
+    // A key that could not be opened when it was first shown has no slots for what it turns out to hold.
+    if (!slots_agree(handle))
+        return -1;
     char name[32];
     for (int i = 1;; i++) {
         std::snprintf(name, sizeof name, "New Key #%i", i);
@@ -224,13 +248,14 @@ int RegKey::new_key() {
             break;
     }
     const int position = find_child_position(handle, name);
-    if (position < 0)
+    if (position < 0) {
+        // What cannot be shown must not be there.
+        RDeleteKey(handle, name);
         return position;
-    const auto slot = static_cast<size_t>(position);
+    }
     children_.insert(children_.begin() + position, nullptr);
-    auto child = std::make_unique<RegKey>(hive_, this, position);
-    child->number_hint(slot);
-    children_[slot] = child.release();
+    // The key is there, so it gets its row, even where it cannot be opened.
+    shown_child(position);
     return position;
 }
 
@@ -240,7 +265,7 @@ bool RegKey::delete_key(int index) {
     NameBuffer name = {};
     uint32_t size = name_room;
     // Only the key at this position is meant: a name that leads to another one deletes nothing.
-    if (index < 0 ||
+    if (index < 0 || !slots_agree(handle) ||
         REnumKeyExA(handle, static_cast<uint32_t>(index), name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
         position_by_path(handle, name.data()) != index || RDeleteKey(handle, name.data()) != R_SUCCESS)
         return false;
@@ -265,12 +290,14 @@ int RegKey::rename_key(int index, const QString& new_name) {
     // The key gets another record and the list another order: handles from before are of no use.
     hive_->clear_handle_cache();
     RegistryKey* handle = hive_->key_handle(this);
-    if (RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
+    if (!slots_agree(handle) || RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
         return -1;
     const int position = find_child_position(handle, name.bytes);
     if (position < 0)
         return -2;
     AbstractRegKey* renamed = children_[static_cast<size_t>(index)];
+    if (renamed != nullptr)
+        static_cast<RegKey*>(renamed)->offset_ = UINT32_MAX;
     children_.erase(children_.begin() + index);
     children_.insert(children_.begin() + position, renamed);
     return position;

@@ -8,6 +8,7 @@
 
 #include <QString>
 
+#include <atomic>
 #include <memory>
 #include <mutex>
 #include <optional>
@@ -25,10 +26,12 @@ public:
 
     // The child in a slot; the base neither checks nor creates.
     virtual AbstractRegKey* child(int i);
-    // The same for a row that is shown: where the child cannot be opened, an object without subkeys stands for it,
-    // which throws when it is asked for anything, so that one damaged record does not hide its siblings.
-    virtual AbstractRegKey* shown_child(int i) { return child(i); }
     virtual QString name() = 0;
+    // The child in a slot, for a row that is shown: where it cannot be opened, an object without subkeys stands for
+    // it, which throws when it is asked for anything, so that one damaged record does not hide its siblings.
+    virtual AbstractRegKey* shown_child(int i) { return child(i); }
+    // Whether a damaged hive lists this key below itself: one of the keys above it is the same.
+    virtual bool is_below_itself() const { return false; }
 
     AbstractRegKey* parent() const { return parent_; }
     int child_count() const;
@@ -50,8 +53,8 @@ private:
     // The lock that guards the children: the hive's, null for a group.
     virtual std::recursive_mutex* children_lock() const { return nullptr; }
 
-    // Where the parent listed this key last; checked before it is believed.
-    mutable size_t number_hint_ = 0;
+    // Where the parent listed this key last; checked before it is believed. Written by the search's thread too.
+    mutable std::atomic<size_t> number_hint_ = 0;
 };
 
 // A key of a hive. Holds no engine handle: every operation asks the hive for it anew, under the hive's locks.
@@ -69,14 +72,17 @@ public:
 
     // The i-th subkey, made when it is first asked for. std::out_of_range("vector::_M_range_check") outside the list.
     AbstractRegKey* child(int i) override;
-    AbstractRegKey* shown_child(int i) override;
     // std::runtime_error("RQueryInfoKeyW failed") when the engine cannot say.
     QString name() override;
+    AbstractRegKey* shown_child(int i) override;
+    bool is_below_itself() const override;
 
     // Brings the number of slots up to the engine's count. Surplus objects are dropped from the list, not deleted.
     void reload();
     int value_count();
-    bool has_default_value();
+    // The position of the unnamed value, -1 when there is none.
+    int default_value_position();
+    bool has_default_value() { return default_value_position() >= 0; }
 
     // Makes a subkey "New Key #%i" with the lowest free number; returns its position, negative on failure.
     int new_key();
@@ -118,10 +124,14 @@ private:
 
     std::recursive_mutex* children_lock() const override;
     void refresh_children(RegistryKey* handle);
+    // Whether there is a slot for each subkey that the engine counts, so that its positions are those of the slots.
+    bool slots_agree(RegistryKey* handle) const;
     int find_child_position(RegistryKey* handle, const QByteArray& name);
     bool store_value(const QString& name, uint type, const QByteArray& data, int index);
 
     RegHive* hive_;  // not owned
+    // Where the engine found the key, UINT32_MAX when it has not been asked since the key was made or renamed.
+    uint32_t offset_ = UINT32_MAX;
 };
 
 // A named group with no hive behind it: the first part of a mount name.

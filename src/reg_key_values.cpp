@@ -175,7 +175,8 @@ std::unique_ptr<RegValue> RegKey::read_value(int index) {
 
 bool RegKey::store_value(const QString& name, uint type, const QByteArray& data, int index) {
     const StoredText stored = stored_text(name);
-    if (!stored.fits || stored.bytes.size() > longest_value_name)
+    // A longer name that is there already stays usable.
+    if (!stored.fits || (index == any_value && stored.bytes.size() > longest_value_name))
         return false;
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);

@@ -7,6 +7,7 @@
 #include <QAbstractItemModel>
 #include <QMutex>
 
+#include <map>
 #include <memory>
 #include <vector>
 
@@ -87,9 +88,9 @@ private:
     std::vector<Frame> search_;  // the last one is visited next
     QMutex mutex_;               // guards stop_ alone
     bool stop_ = false;
-    // Keys that the search may still go down to. A damaged hive can list a key more often than the file has room for
-    // keys; what the files' sizes allow bounds the walk.
-    qint64 keys_left_ = 0;
+    // How many keys of each hive the search may still visit. A damaged hive can list a key more often than the file
+    // has room for keys; twice what its size allows bounds the walk, the second half of it without going further down.
+    std::map<const RegHive*, qint64> keys_left_;
 };
 
 Q_DECLARE_OPERATORS_FOR_FLAGS(RegModel::FindMode)

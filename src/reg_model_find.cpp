@@ -19,6 +19,8 @@ constexpr int frames_between_stop_checks = 10;
 // A key takes at least its record and its cell's size word in the file.
 constexpr qint64 smallest_key = 80;
 
+qint64 most_keys(const RegHive& hive) { return 1 + hive.file_size() / smallest_key; }
+
 // Every kind of match ignores case. The low four bits of the flags say which kind.
 bool matches(const QString& text, const QString& term, int kind) {
     if (kind == Qt::MatchWildcard)
@@ -62,9 +64,9 @@ void RegModel::begin_find(const QModelIndex& start) {
     search_.clear();
     if (start.isValid())
         search_.push_back({start, -1});
-    keys_left_ = static_cast<qint64>(top_level_.size() + hives_.size());
+    keys_left_.clear();
     for (const auto& hive : hives_)
-        keys_left_ += hive->file_size() / smallest_key;
+        keys_left_[hive.get()] = 2 * most_keys(*hive);
     // Last, so that the lock hands the stack over to the worker as well.
     const QMutexLocker locker(&mutex_);
     stop_ = false;
@@ -82,16 +84,23 @@ bool RegModel::is_stopped() {
 
 // What a key leads to, so that its values come first, then its subkeys, then its later siblings.
 void RegModel::push_key_frames(const Frame& frame, FindMode mode) {
-    const QModelIndex sibling = index(frame.key.row() + 1, 0, parent(frame.key));
+    const AbstractRegKey* const visited = key_of(frame.key);
+    const auto* const in_hive = dynamic_cast<const RegKey*>(visited);
+    bool goes_on = true;
+    bool goes_down = !visited->is_below_itself();
+    if (in_hive != nullptr) {
+        qint64& left = keys_left_[in_hive->hive()];
+        left--;
+        // A hive's root is listed in its group, whose other hives have nothing to do with it.
+        goes_on = left > 0 || in_hive == in_hive->hive()->root_key();
+        goes_down = goes_down && left > most_keys(*in_hive->hive());
+    }
+    const QModelIndex sibling = goes_on ? index(frame.key.row() + 1, 0, parent(frame.key)) : QModelIndex();
     if (sibling.isValid())
         search_.push_back({sibling, -1});
-    if (keys_left_-- > 0) {
-        const QModelIndex child = index(0, 0, frame.key);
-        if (child.isValid())
-            search_.push_back({child, -1});
-    } else {
-        search_.clear();
-    }
+    const QModelIndex child = goes_down ? index(0, 0, frame.key) : QModelIndex();
+    if (child.isValid())
+        search_.push_back({child, -1});
     RegKey* const key = mode.testFlag(FindValues) ? editable_key(frame.key) : nullptr;
     if (key == nullptr)
         return;

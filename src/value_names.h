@@ -10,9 +10,10 @@
 
 class RegKey;
 
-// Source rows in the order of their shown names, default_name being the one that comes first. Names that differ only in
-// case keep no defined order among themselves, but the same names always come out the same.
-std::vector<int> rows_by_name(const std::vector<QString>& names, const QString& default_name);
+// Source rows in the order of their shown names, default_name being the one that comes first. Names that differ only
+// in case keep no defined order among themselves, but the same names always come out the same. The row of the unnamed
+// value (-1: none) is the first in any case.
+std::vector<int> rows_by_name(const std::vector<QString>& names, const QString& default_name, int unnamed);
 
 // The names of a key's values as the table shows them from row 0 on, with default_name for the unnamed value, whether
 // the key has one or the table makes one up.

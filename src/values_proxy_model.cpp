@@ -22,7 +22,8 @@ bool ValuesProxyModel::has_key() const { return key() != nullptr; }
 // Asked of the key after each change: what happened to a row does not say whether an unnamed value is left.
 void ValuesProxyModel::ask_for_default() {
     RegKey* const shown = key();
-    synthetic_default_ = shown != nullptr && !shown->has_default_value();
+    unnamed_ = shown != nullptr ? shown->default_value_position() : -1;
+    synthetic_default_ = shown != nullptr && unnamed_ < 0;
 }
 
 void ValuesProxyModel::setSourceModel(QAbstractItemModel* source) {
@@ -34,6 +35,7 @@ void ValuesProxyModel::setSourceModel(QAbstractItemModel* source) {
         connect(source, &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
     mapping_.clear();
     synthetic_default_ = false;
+    unnamed_ = -1;
     try {
         ask_for_default();
     } catch (...) {
@@ -134,8 +136,10 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
     }
     if (!sourceModel()->setData(mapToSource(index), value, role))
         return false;
-    if (index.column() == ValuesModel::NameColumn)
+    if (index.column() == ValuesModel::NameColumn) {
         move_to_end(index.row());
+        ask_for_default();
+    }
     emit dataChanged(index, index);
     return true;
 }
@@ -222,7 +226,7 @@ void ValuesProxyModel::sort(int, Qt::SortOrder) {
         emit layoutChanged();
         throw;
     }
-    mapping_ = rows_by_name(names, default_name_);
+    mapping_ = rows_by_name(names, default_name_, unnamed_);
     emit layoutChanged();
 }
 

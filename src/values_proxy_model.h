@@ -56,5 +56,6 @@ private:
 
     std::vector<int> mapping_;  // source row by position; empty until the first sort
     bool synthetic_default_ = false;
+    int unnamed_ = -1;  // source row of the unnamed value
     QString default_name_;
 };

@@ -3,7 +3,10 @@
 #include "hive_on_disk.h"
 #include "real_hives.h"
 
+#include "reg_key.h"
 #include "reg_model.h"
+#include "values_model.h"
+#include "values_proxy_model.h"
 
 #include <QTest>
 
@@ -186,6 +189,64 @@ private slots:
             laid.put32(laid.at("Loop").index, entry, loop);
         Searched searched(laid.bytes);
         QVERIFY(searched.all(QStringLiteral("absent"), RegModel::FindKeys | RegModel::FindValues).isEmpty());
+    }
+
+    void behind_a_loop_the_walk_goes_on() {
+        testkit::HiveLayout looped;
+        testkit::KeyLayout& key = looped.root.add("Loop");
+        key.add("a");
+        key.add("b");
+        looped.root.add("Target");
+        testkit::LaidHive laid = testkit::lay_out(looped);
+        for (const uint32_t entry : {4U, 12U})
+            laid.put32(laid.at("Loop").index, entry, laid.at("Loop").record);
+        Searched searched(laid.bytes);
+        QCOMPARE(searched.all(QStringLiteral("target"), RegModel::FindKeys), list({"TOP/HIVE/Target"}));
+    }
+
+    // Every key lists the next one twice: without a loop, but with more ways down than any file has keys.
+    void a_hive_with_too_many_ways_down_takes_nothing_from_the_next_one() {
+        constexpr int levels = 40;
+        testkit::HiveLayout ladder;
+        testkit::KeyLayout* step = &ladder.root;
+        std::string path;
+        for (int i = 0; i < levels; i++) {
+            step->add("twin");
+            step = &step->add("step");
+        }
+        testkit::LaidHive laid = testkit::lay_out(ladder);
+        for (int i = 0; i < levels; i++) {
+            const uint32_t index = laid.at(path).index;
+            laid.put32(index, 12, laid.get32(index, 4));
+            path += path.empty() ? "step" : "\\step";
+        }
+        Searched searched(laid.bytes);
+        const HiveOnDisk second(layout());
+        searched.model.add_hive(QStringLiteral("TOP/SECOND"), second.path());
+        QCOMPARE(searched.all(QStringLiteral("RunOnce"), RegModel::FindKeys), list({"TOP/SECOND/Software/RunOnce"}));
+    }
+
+    // A damaged UTF-16 name of one byte reads as no name, but its value is not the unnamed one.
+    void the_row_is_the_table_s_beside_a_name_without_letters() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        key.set("alpha", 4, testkit::pattern(4));
+        key.set("x", 4, testkit::pattern(4)).wide_name = true;
+        key.set("zed", 4, testkit::pattern(4));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        laid.put16(laid.at("Key").values[1].record, 2, 1);
+        Searched searched(laid.bytes);
+        const QStringList hits = searched.all(QStringLiteral("zed"), RegModel::FindValues);
+        RegKey* shown = searched.model.editable_key(searched.model.index(
+            0, 0, searched.model.index(0, 0, searched.model.index(0, 0))));
+        ValuesModel source(shown);
+        ValuesProxyModel table;
+        table.setSourceModel(&source);
+        table.sort(0, Qt::AscendingOrder);
+        int row = 0;
+        while (row < table.rowCount() && table.index(row, 0).data().toString() != QStringLiteral("zed"))
+            row++;
+        QCOMPARE(hits, QStringList{QStringLiteral("TOP/HIVE/Key : %1").arg(row)});
     }
 
     void a_real_hive_gives_every_name_once_and_in_order() {

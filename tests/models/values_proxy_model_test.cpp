@@ -74,6 +74,32 @@ private slots:
         QVERIFY(shown.proxy.removeRows(2, 1));
     }
 
+    // Whichever of the two stands first in the key's list.
+    void a_value_named_like_the_unnamed_one_stays_apart_from_it() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        key.set("(Default)", 4, testkit::pattern(4));
+        key.set("", 1, testkit::text_data("set"));
+        key.set("b", 4, testkit::pattern(4));
+        const HiveOnDisk file(hive);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        ValuesModel source(static_cast<RegKey*>(opened.root_key()->child(0)));
+        ValuesProxyModel proxy;
+        proxy.setSourceModel(&source);
+        proxy.sort(0, Qt::AscendingOrder);
+        QCOMPARE(proxy.index(0, 1).data().toString(), QStringLiteral("REG_SZ"));
+        QVERIFY(!proxy.flags(proxy.index(0, 0)).testFlag(Qt::ItemIsEditable));
+        QVERIFY(proxy.flags(proxy.index(1, 0)).testFlag(Qt::ItemIsEditable));
+        QVERIFY(proxy.setData(proxy.index(1, 0), QStringLiteral("renamed"), Qt::EditRole));
+        QCOMPARE(file.stored("Key", ""), QByteArray("s\0e\0t\0\0\0", 8));
+        QCOMPARE(file.stored_type("Key", "renamed"), 4);
+        QCOMPARE(proxy.rowCount(), 3);
+        proxy.sort(0, Qt::AscendingOrder);
+        QCOMPARE(proxy.index(0, 1).data().toString(), QStringLiteral("REG_SZ"));
+        QCOMPARE(proxy.index(0, 2).data().toString(), QStringLiteral("set"));
+    }
+
     void a_key_without_an_unnamed_value_gets_a_row_for_it() {
         Shown shown(Bare);
         QCOMPARE(shown.proxy.rowCount(), 4);

@@ -89,6 +89,53 @@ private slots:
         QCOMPARE(first->child_count(), 1);
     }
 
+    // The file is mended behind the program's back: the row that was shown without subkeys stays without.
+    void a_key_that_could_not_be_opened_takes_no_new_subkey() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& bad = hive.root.add("Bad");
+        bad.add("one");
+        bad.add("two");
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        const uint64_t signature = testkit::LaidHive::position(laid.at("Bad").record);
+        const testkit::Bytes sound = laid.bytes;
+        laid.bytes[signature] = 'x';
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        auto* shown = static_cast<RegKey*>(opened.root_key()->shown_child(0));
+        QCOMPARE(shown->child_count(), 0);
+        QFile mended(file.path());
+        QVERIFY(mended.open(QIODevice::ReadWrite) && mended.seek(static_cast<qint64>(signature)));
+        QCOMPARE(mended.write("n", 1), qint64(1));
+        mended.close();
+        // The engine's window still has the old byte until it is loaded anew.
+        QVERIFY(opened.root_key()->set_dword_value(QStringLiteral("any"), 1, little_endian_order));
+        QCOMPARE(shown->name(), QStringLiteral("Bad"));
+        const testkit::Bytes before = file.bytes();
+        QVERIFY(shown->new_key() < 0);
+        QVERIFY(!shown->delete_key(0));
+        QVERIFY(shown->rename_key(0, QStringLiteral("other")) < 0);
+        QVERIFY(file.bytes() == before);
+    }
+
+    void a_key_that_is_listed_below_itself_is_told() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& outer = hive.root.add("Outer");
+        outer.add("Inner").add("leaf");
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        laid.put32(laid.at("Outer\\Inner").index, 4, laid.at("Outer").record);
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        AbstractRegKey* outer_key = opened.root_key()->child(0);
+        AbstractRegKey* inner = outer_key->child(0);
+        QVERIFY(!opened.root_key()->is_below_itself());
+        QVERIFY(!outer_key->is_below_itself());
+        QVERIFY(!inner->is_below_itself());
+        QCOMPARE(inner->child(0)->name(), QStringLiteral("Outer"));
+        QVERIFY(inner->child(0)->is_below_itself());
+    }
+
     void a_child_outside_the_list_is_out_of_range() {
         Opened opened;
         RegKey* parent = opened.key(QStringLiteral("Parent"));

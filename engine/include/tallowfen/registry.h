@@ -188,5 +188,8 @@ int32_t RDeleteKey(RegistryKey* key, const char* path);
 // What RDeleteKey would say to the index-th subkey and to each key below it, leaves first; writes nothing. 0: the whole
 // subtree can be deleted key by key.
 int32_t RCheckDeleteTree(RegistryKey* key, uint32_t index);
+// Where the key's cell lies, in bytes from the first bin: the same for every handle of one key, so that a key which a
+// damaged hive lists below itself can be told. UINT32_MAX: not a key. A rename gives the key another cell.
+uint32_t RKeyOffset(const RegistryKey* key);
 
 }  // extern "C"
