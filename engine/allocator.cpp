@@ -38,6 +38,7 @@ const Bin* choose_bin(const Store& store, uint32_t size) {
 }
 
 CellOffset find_free(Store& store, uint32_t size, uint32_t& found_size) {
+    refresh_unread_bins(store);
     const Bin* bin = choose_bin(store, size);
     if (bin == nullptr)
         return CellOffset::none;
@@ -137,7 +138,7 @@ bool append_bin(Store& store, uint32_t size) {
     if (size > highest_end - 2 * bin_alignment)
         return false;
     const uint32_t bin_size = (size + bin_header_size + cell_head_size + bin_alignment - 1) & ~(bin_alignment - 1);
-    const Bin bin = {static_cast<uint32_t>(store.bins_size), bin_size, bin_size - bin_header_size};
+    const Bin bin = {static_cast<uint32_t>(store.bins_size), bin_size, bin_size - bin_header_size, false};
     const int64_t end = int64_t{base_block_size} + bin.offset + bin.size;
     // Room in the table comes first: a bin that counts in the file but not in the table could be laid over.
     if (end > highest_end || !reserve_bin(store, append_growth) || !lengthen_file(store, end) || !lay_bin(store, bin))
@@ -147,12 +148,11 @@ bool append_bin(Store& store, uint32_t size) {
         return false;
     const bool noted = note_in_first_bin(store, bins_size);
     // The bin counts in the file now, so it must be in the table whatever became of the note.
-    Bin scanned = {};
-    if (scan_bin(store, bin.offset, scanned) < 0)
-        scanned = {bin.offset, bin.size, 0};
-    store.bins[store.bin_count++] = scanned;
+    Bin& counted = store.bins[store.bin_count++];
+    counted = bin;
+    refresh_bin(store, counted);
     store.bins_size = static_cast<int32_t>(bins_size);
-    return noted && scanned.largest_free != 0;
+    return noted && counted.largest_free != 0;
 }
 
 }  // namespace

@@ -55,8 +55,10 @@ KeyInfo* copy_key(Store& store, const KeyView& key, bool& damaged) {
 
 // Reads what the key's record says of its values. The first offsets come along, while the window is there.
 void take_values(RegistryKey& handle, Store& store, const KeyRecord& record) {
+    const uint32_t failed = store.failed_reads;
     handle.values = find_value_list(store, record);
-    handle.values_generation = store.generation;
+    // What the device has failed to deliver is asked for again.
+    handle.values_generation = store.failed_reads == failed ? store.generation : store.generation - 1;
     handle.recent_position = UINT32_MAX;
     handle.value_offsets.first = 0;
     handle.value_offsets.count = values_at(store, handle.values, 0, handle.value_offsets.offsets, OffsetBatch::most);
@@ -65,8 +67,11 @@ void take_values(RegistryKey& handle, Store& store, const KeyRecord& record) {
 // The same of its subkeys. false when memory ran out.
 bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record) {
     handle.subkeys.count = 0;
+    const uint32_t failed = store.failed_reads;
     if (!load_key_index(store, record, handle.index))
         return false;
+    if (store.failed_reads != failed)
+        handle.index.generation--;
     handle.subkeys.first = 0;
     handle.subkeys.count = subkeys_at(store, handle.index, 0, handle.subkeys.offsets, OffsetBatch::most);
     return true;
@@ -84,6 +89,7 @@ uint32_t handle_flags(const KeyInfo& info) {
 }
 
 int32_t fill_handle(RegistryKey& handle, Store& store, CellOffset offset, uint32_t depth) {
+    const uint32_t failed = store.failed_reads;
     KeyView key;
     if (!read_key(store, offset, key))
         return R_FAILED;
@@ -91,15 +97,19 @@ int32_t fill_handle(RegistryKey& handle, Store& store, CellOffset offset, uint32
     handle.info = copy_key(store, key, damaged);
     if (handle.info == nullptr)
         return damaged ? R_FAILED : R_NOT_ENOUGH_MEMORY;
-    if (!take_index(handle, store, key.record)) {
+    const bool indexed = take_index(handle, store, key.record);
+    if (indexed)
+        take_values(handle, store, key.record);
+    // Lists that the device did not deliver would pass for empty ones.
+    if (!indexed || store.failed_reads != failed) {
+        free_index(handle.index);
         free(handle.info);
         handle.info = nullptr;
         handle.index = {};
-        return R_NOT_ENOUGH_MEMORY;
+        return indexed ? R_FAILED : R_NOT_ENOUGH_MEMORY;
     }
     handle.store = &store;
     handle.depth = depth;
-    take_values(handle, store, key.record);
     take_counts(handle, key.record);
     return R_SUCCESS;
 }
@@ -187,6 +197,8 @@ void take_counts(RegistryKey& handle, const KeyRecord& record) {
 }
 
 bool reread_counts(RegistryKey& handle) {
+    handle.counts_are_old = true;
+    const uint32_t failed = handle.store->failed_reads;
     KeyView key;
     if (!read_key(*handle.store, handle.info->own, key))
         return false;
@@ -194,7 +206,10 @@ bool reread_counts(RegistryKey& handle) {
     if (!take_index(handle, *handle.store, key.record))
         return false;
     take_values(handle, *handle.store, key.record);
+    if (handle.store->failed_reads != failed)
+        return false;
     take_counts(handle, key.record);
+    handle.counts_are_old = false;
     return true;
 }
 

@@ -61,11 +61,11 @@ struct RegistryKey {
     engine::ValueView recent_value;  // the value asked for last: its name and its data are asked for in turn
     uint32_t recent_position;        // UINT32_MAX when there is none
     uint32_t values_generation;
+    // The record could not be read after a change through this handle: the counts are brought up to it at the next call.
+    bool counts_are_old;
 };
 
 namespace engine {
-
-inline bool is_key(const RegistryKey* key) { return key != nullptr && key->info != nullptr; }
 
 // Fills a zeroed handle from the record at an offset. 0, -1 for a damaged record, 8 without memory.
 int32_t fill_handle(RegistryKey& handle, Store& store, CellOffset offset, uint32_t depth);
@@ -85,8 +85,16 @@ CellOffset listed_subkey(RegistryKey& handle, uint32_t position);
 const ValueView* listed_value(RegistryKey& handle, uint32_t position);
 // Brings counts, offsets and maxima of a handle up to its key's record.
 void take_counts(RegistryKey& handle, const KeyRecord& record);
-// The same, reading the record.
+// The same, reading the record. Where that fails, the next call on the handle tries again.
 bool reread_counts(RegistryKey& handle);
+// Whether it is a key's handle: what every call asks first.
+inline bool is_key(RegistryKey* key) {
+    if (key == nullptr || key->info == nullptr)
+        return false;
+    if (key->counts_are_old)
+        reread_counts(*key);
+    return true;
+}
 
 // Where a path leads.
 struct PathEnd {

@@ -20,14 +20,28 @@ bool seek_to(const Store& store, int64_t position) {
     return store.io.seek(store.io.device, wanted, seek_start) == wanted;
 }
 
-// Reads at a position, past the window. A callback that claims more than was asked for is not believed.
-uint32_t read_through(const Store& store, int64_t position, void* buffer, uint32_t length) {
-    if (length > INT32_MAX || !seek_to(store, position))
+// Reads at a position, past the window. A device may deliver the bytes in several pieces; one that claims more than was
+// asked for is not believed.
+uint32_t read_through(Store& store, int64_t position, void* buffer, uint32_t length) {
+    if (length > INT32_MAX)
         return 0;
-    const int32_t count = store.io.read(store.io.device, buffer, static_cast<int32_t>(length));
-    if (count < 0 || static_cast<uint32_t>(count) > length)
+    if (!seek_to(store, position)) {
+        store.failed_reads++;
         return 0;
-    return static_cast<uint32_t>(count);
+    }
+    uint32_t done = 0;
+    while (done < length) {
+        const uint32_t rest = length - done;
+        const int32_t count = store.io.read(store.io.device, static_cast<uint8_t*>(buffer) + done, static_cast<int32_t>(rest));
+        if (count < 0 || static_cast<uint32_t>(count) > rest) {
+            store.failed_reads++;
+            return 0;
+        }
+        if (count == 0)  // the file's end
+            break;
+        done += static_cast<uint32_t>(count);
+    }
+    return done;
 }
 
 bool load_window(Store& store, int64_t position) {
@@ -41,7 +55,7 @@ bool load_window(Store& store, int64_t position) {
 }
 
 bool window_serves(const ReadWindow& window, int64_t position, uint32_t length) {
-    return window.valid && position >= window.start && position + length <= window.start + window_size;
+    return window.valid && position >= window.start && position + length <= window.start + window.length;
 }
 
 bool begins_with(uint32_t signature, const void* buffer, uint32_t length) {
@@ -76,7 +90,7 @@ uint32_t proper_length(uint32_t signature, const void* buffer, uint32_t length) 
 
 // After a write: the bin that holds the place gets its largest free cell afresh. A place on the border of two bins
 // counts for the first, as its end.
-void refresh_bin(Store& store, int64_t position) {
+void refresh_bin_at(Store& store, int64_t position) {
     const int64_t place = position - base_block_size;
     int32_t low = 0;
     int32_t high = store.bin_count;
@@ -89,10 +103,7 @@ void refresh_bin(Store& store, int64_t position) {
     }
     if (low == store.bin_count || store.bins[low].offset > place)
         return;
-    Bin& bin = store.bins[low];
-    Bin fresh = {};
-    // A bin that cannot be walked any more offers nothing to the allocator.
-    bin.largest_free = scan_bin(store, bin.offset, fresh) < 0 ? 0 : fresh.largest_free;
+    refresh_bin(store, store.bins[low]);
 }
 
 bool choose_leaf_kind(Store& store, const KeyRecord& root) {
@@ -202,7 +213,7 @@ uint32_t write_at(Store& store, uint32_t signature, int64_t position, const void
     const int32_t count = store.io.write(store.io.device, buffer, static_cast<int32_t>(length));
     // A write that fell short may have reached a size word all the same.
     if (position >= base_block_size)
-        refresh_bin(store, position);
+        refresh_bin_at(store, position);
     return count >= 0 && static_cast<uint32_t>(count) == length ? length : 0;
 }
 
@@ -231,7 +242,7 @@ int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin) {
     const uint32_t size = header.size;
     if (size == 0 || size % bin_alignment != 0 || size > highest_end - start)
         return -1;
-    bin = {bin_offset, size, 0};
+    bin = {bin_offset, size, 0, false};
     uint32_t walked = bin_header_size;
     while (walked < size) {
         int32_t cell;
@@ -243,6 +254,21 @@ int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin) {
         walked += absolute;
     }
     return int64_t{bin_offset} + walked;
+}
+
+void refresh_bin(Store& store, Bin& bin) {
+    store.unread_bins -= bin.unread ? 1 : 0;
+    Bin fresh = {};
+    bin.unread = scan_bin(store, bin.offset, fresh) < 0;
+    bin.largest_free = bin.unread ? 0 : fresh.largest_free;
+    store.unread_bins += bin.unread ? 1 : 0;
+}
+
+void refresh_unread_bins(Store& store) {
+    for (int32_t i = 0; store.unread_bins > 0 && i < store.bin_count; i++) {
+        if (store.bins[i].unread)
+            refresh_bin(store, store.bins[i]);
+    }
 }
 
 bool reserve_bin(Store& store, int32_t growth) {

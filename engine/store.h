@@ -22,6 +22,7 @@ struct Bin {
     uint32_t offset;        // from the first bin
     uint32_t size;          // bytes, header included
     uint32_t largest_free;  // size of the largest free cell, 0 when there is none
+    bool unread;            // it could not be walked when that was to be found out; 0 is written there meanwhile
 };
 
 struct ReadWindow {
@@ -46,6 +47,8 @@ struct Store {
     int32_t open_handles;
     ReadWindow window;
 
+    int32_t unread_bins;    // how many bins are unread
+    uint32_t failed_reads;  // raised when the device fails, which tells what could not be read from what is not there
     int32_t recent_bin;   // where the last look-up of a cell ended: the next is mostly near
     uint32_t generation;  // raised by every write, so that what was derived from the file can be known for stale
     // The key whose index was last found to be in upper-cased order throughout; none when unknown. Its insertions keep
@@ -126,6 +129,11 @@ inline bool is_cell_size(int32_t size, uint32_t room, uint32_t& absolute) {
     absolute = size < 0 ? 0U - static_cast<uint32_t>(size) : static_cast<uint32_t>(size);
     return absolute != 0 && absolute % cell_alignment == 0 && absolute <= room;
 }
+
+// Finds out a bin's largest free cell. A bin that cannot be walked offers nothing to the allocator.
+void refresh_bin(Store& store, Bin& bin);
+// The same for the bins that could not be walked the last time.
+void refresh_unread_bins(Store& store);
 
 // Makes room for one more entry in the bin table; false when memory ran out, the table then being as before.
 bool reserve_bin(Store& store, int32_t growth);

@@ -1,7 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// The file as it stands after each single write of a change: it opens, and nothing that the change did not name differs.
+// The file as it stands after each single write of a change: it opens, and nothing that the change did not
+// name differs.
 #include "operations.h"
 
 #include <gtest/gtest.h>
@@ -12,13 +13,12 @@ using namespace testkit;
 
 class Cuts : public testing::TestWithParam<Leaf> {};
 
-TEST_P(Cuts, EveryStateBetweenTwoWritesIsWhole) {
-    const Bytes start = lay_out(operation_layout(GetParam())).bytes;
+void check_every_state(const Bytes& start, const std::vector<Operation>& operations) {
     std::string why;
     const Contents before = contents(start, why);
     ASSERT_EQ(why, "");
-    for (const Operation& operation : operations()) {
-        SCOPED_TRACE(operation.name);
+    for (const Operation& operation : operations) {
+        SCOPED_TRACE(operation.name + " in " + operation.key);
         Scene scene(start);
         scene.file().keep_cuts = true;
         ASSERT_EQ(operation.run(scene.root()), R_SUCCESS);
@@ -28,7 +28,19 @@ TEST_P(Cuts, EveryStateBetweenTwoWritesIsWhole) {
         ASSERT_EQ(why, "");
         ASSERT_NE(before, after);
         for (size_t i = 0; i < cuts.size(); i++)
-            EXPECT_EQ(harm(operation, before, &after, cuts[i]), "") << "after write " << i + 1 << " of " << cuts.size();
+            EXPECT_EQ(harm(operation, before, &after, cuts[i]), "")
+                << "after write " << i + 1 << " of " << cuts.size();
+    }
+}
+
+TEST_P(Cuts, EveryStateBetweenTwoWritesIsWhole) {
+    check_every_state(lay_out(operation_layout(GetParam())).bytes, operations());
+}
+
+TEST(RealHiveCuts, EveryStateBetweenTwoWritesIsWhole) {
+    for (const auto& [name, bytes] : small_real_hives()) {
+        SCOPED_TRACE(name);
+        check_every_state(bytes, operations_on(bytes));
     }
 }
 

@@ -2,7 +2,11 @@
 // SPDX-License-Identifier: MIT
 #include "operations.h"
 
+#include "hive_reader.h"
+#include "real_hives.h"
+
 #include <algorithm>
+#include <cstdio>
 
 namespace testkit {
 
@@ -10,45 +14,53 @@ namespace {
 
 using Change = std::function<int32_t(RegistryKey*)>;
 
-// The change made on the key at a path.
-Change in(const std::string& path, Change change) {
-    return [path, change = std::move(change)](RegistryKey* root) {
-        Handle key;
-        const int32_t status = ROpenKey(root, path.c_str(), key.out());
-        return status == R_SUCCESS ? change(key.get()) : status;
-    };
+std::string below(const std::string& path, const std::string& name) {
+    return path.empty() ? name : path + "\\" + name;
 }
 
-Change create(const std::string& path, const std::string& name) {
-    return in(path, [name](RegistryKey* key) {
+std::string first_component(const std::string& path) {
+    return path.substr(0, path.find('\\'));
+}
+
+Operation create(const std::string& what, const std::string& path, const std::string& name) {
+    const Change change = [name](RegistryKey* key) {
         Handle made;
         return RCreateKey(key, name.c_str(), made.out(), nullptr);
-    });
+    };
+    return {what, path, change, {below(path, first_component(name))}};
 }
 
-Change set(const std::string& path, const std::string& name, uint32_t type, size_t size) {
-    return in(path, [=](RegistryKey* key) {
+Operation set(const std::string& what, const std::string& path, const std::string& name, uint32_t type,
+              size_t size) {
+    const Change change = [=](RegistryKey* key) {
         const Bytes data = pattern(size, 77);
         return RSetValueExW(key, name.c_str(), type, data.data(), static_cast<uint32_t>(data.size()));
-    });
+    };
+    return {what, path, change, {path + "|" + name}};
 }
 
-Change remove_value(const std::string& path, const std::string& name) {
-    return in(path, [name](RegistryKey* key) { return RDeleteValue(key, name.c_str()); });
+Operation remove_value(const std::string& what, const std::string& path, const std::string& name) {
+    return {what,
+            path,
+            [name](RegistryKey* key) { return RDeleteValue(key, name.c_str()); },
+            {path + "|" + name}};
 }
 
-Change remove_key(const std::string& path, const std::string& name) {
-    return in(path, [name](RegistryKey* key) { return RDeleteKey(key, name.c_str()); });
+Operation remove_key(const std::string& what, const std::string& path, const std::string& name) {
+    return {
+        what, path, [name](RegistryKey* key) { return RDeleteKey(key, name.c_str()); }, {below(path, name)}};
 }
 
-Change rename(const std::string& path, const std::string& old_name, const std::string& name) {
-    return in(path, [=](RegistryKey* key) {
+Operation rename(const std::string& what, const std::string& path, const std::string& old_name,
+                 const std::string& name) {
+    const Change change = [=](RegistryKey* key) {
         Handle subkey;
         uint32_t position = 0;
         const int32_t status = ROpenKeyEx(key, old_name.c_str(), subkey.out(), &position);
         subkey.reset();
         return status == R_SUCCESS ? RRenameKey(key, position, name.c_str()) : status;
-    });
+    };
+    return {what, path, change, {below(path, old_name), below(path, name)}};
 }
 
 void fill(KeyLayout& key) {
@@ -81,102 +93,146 @@ HiveLayout operation_layout(Leaf leaf) {
     plain.leaf = Leaf::plain;
     for (const char* name : {"p1", "p2", "p3"})
         plain.add(name);
+    KeyLayout& segments = layout.root.add("Segments");
+    segments.set("big", 3, pattern(40000)).storage = Storage::big;
+    segments.set("small", 3, pattern(30));
     return layout;
+}
+
+int32_t Operation::run(RegistryKey* root) const {
+    Handle handle;
+    const int32_t status = ROpenKey(root, key.c_str(), handle.out());
+    return status == R_SUCCESS ? change(handle.get()) : status;
 }
 
 std::vector<Operation> operations() {
     return {
-        {"first subkey of a key", create("Flat\\alpha", "new"), {"Flat\\alpha\\new"}},
-        {"subkey into a full leaf", create("Flat", "betb"), {"Flat\\betb"}},
-        {"subkey ahead of all", create("Parent\\branch", "a"), {"Parent\\branch\\a"}},
-        {"subkey below an index root", create("Rooted", "m25"), {"Rooted\\m25"}},
-        {"subkey in an index leaf", create("Simple", "p25"), {"Simple\\p25"}},
-        {"path of three", create("Flat\\beta", "x\\y\\z"), {"Flat\\beta\\x"}},
-        {"new inline value", set("Flat\\alpha", "new", 4, 4), {"Flat\\alpha|new"}},
-        {"new value with a cell", set("Flat\\alpha", "new", 3, 200), {"Flat\\alpha|new"}},
-        {"first value of a key", set("Flat", "new", 3, 60), {"Flat|new"}},
-        {"new value that needs a bin", set("Flat\\alpha", "new", 3, 20000), {"Flat\\alpha|new"}},
-        {"value made larger", set("Flat\\alpha", "middle", 3, 300), {"Flat\\alpha|middle"}},
-        {"value made smaller", set("Flat\\alpha", "large", 3, 50), {"Flat\\alpha|large"}},
-        {"value of the same size", set("Flat\\alpha", "large", 3, 120), {"Flat\\alpha|large"}},
-        {"value of another type", set("Flat\\alpha", "large", 1, 120), {"Flat\\alpha|large"}},
-        {"value made inline", set("Flat\\alpha", "large", 4, 4), {"Flat\\alpha|large"}},
-        {"inline value made larger", set("Flat\\alpha", "inline", 3, 64), {"Flat\\alpha|inline"}},
-        {"first value removed", remove_value("Flat\\alpha", "inline"), {"Flat\\alpha|inline"}},
-        {"middle value removed", remove_value("Flat\\alpha", "middle"), {"Flat\\alpha|middle"}},
-        {"last value removed", remove_value("Flat\\alpha", "last"), {"Flat\\alpha|last"}},
-        {"only value removed", remove_value("Parent\\other", "v"), {"Parent\\other|v"}},
-        {"key deleted", remove_key("Flat", "beta"), {"Flat\\beta"}},
-        {"last key of a leaf deleted", remove_key("Flat", "gamma"), {"Flat\\gamma"}},
-        {"key in an index leaf deleted", remove_key("Simple", "p2"), {"Simple\\p2"}},
-        {"key renamed down", rename("Flat", "alpha", "zeta"), {"Flat\\alpha", "Flat\\zeta"}},
-        {"key renamed up", rename("Flat", "gamma", "aaa"), {"Flat\\gamma", "Flat\\aaa"}},
-        {"key with subkeys renamed", rename("Parent", "branch", "zweig"), {"Parent\\branch", "Parent\\zweig"}},
-        {"renamed into another leaf", rename("Rooted", "a2", "m15"), {"Rooted\\a2", "Rooted\\m15"}},
-        {"renamed out of a leaf of one", rename("Rooted", "z1", "a15"), {"Rooted\\z1", "Rooted\\a15"}},
+        create("first subkey of a key", "Flat\\alpha", "new"),
+        create("subkey into a full leaf", "Flat", "betb"),
+        create("subkey ahead of all", "Parent\\branch", "a"),
+        create("subkey below an index root", "Rooted", "m25"),
+        create("subkey in an index leaf", "Simple", "p25"),
+        create("path of three", "Flat\\beta", "x\\y\\z"),
+        set("new inline value", "Flat\\alpha", "new", 4, 4),
+        set("new value with a cell", "Flat\\alpha", "new", 3, 200),
+        set("first value of a key", "Flat", "new", 3, 60),
+        set("new value that needs a bin", "Flat\\alpha", "new", 3, 20000),
+        set("value made larger", "Flat\\alpha", "middle", 3, 300),
+        set("value made smaller", "Flat\\alpha", "large", 3, 50),
+        set("value of the same size", "Flat\\alpha", "large", 3, 120),
+        set("value of another type", "Flat\\alpha", "large", 1, 120),
+        set("value made inline", "Flat\\alpha", "large", 4, 4),
+        set("inline value made larger", "Flat\\alpha", "inline", 3, 64),
+        set("value in segments replaced", "Segments", "big", 3, 900),
+        set("value in segments replaced by a larger one", "Segments", "big", 3, 50000),
+        remove_value("value in segments removed", "Segments", "big"),
+        remove_value("first value removed", "Flat\\alpha", "inline"),
+        remove_value("middle value removed", "Flat\\alpha", "middle"),
+        remove_value("last value removed", "Flat\\alpha", "last"),
+        remove_value("only value removed", "Parent\\other", "v"),
+        remove_key("key deleted", "Flat", "beta"),
+        remove_key("last key of a leaf deleted", "Flat", "gamma"),
+        remove_key("key in an index leaf deleted", "Simple", "p2"),
+        rename("key renamed down", "Flat", "alpha", "zeta"),
+        rename("key renamed up", "Flat", "gamma", "aaa"),
+        rename("key with subkeys renamed", "Parent", "branch", "zweig"),
+        rename("renamed into another leaf", "Rooted", "a2", "m15"),
+        rename("renamed out of a leaf of one", "Rooted", "z1", "a15"),
     };
 }
 
 namespace {
 
-constexpr uint32_t name_room = 600;
+// Names that the calls take as they are shown.
+bool is_plain(const std::u16string& name) {
+    return !name.empty() &&
+           std::all_of(name.begin(), name.end(), [](char16_t c) { return c > 0x20 && c < 0x7F; });
+}
 
-class Reading {
+std::string narrow(const std::u16string& text) {
+    return std::string(text.begin(), text.end());
+}
+
+bool is_plain_key(const Key& key) {
+    return key.name_8bit && is_plain(key.name);
+}
+
+// Chooses what the changes are made on: for each kind the first that will do.
+class Choice {
 public:
-    explicit Reading(Contents& out) : out_(out) {}
-
-    void key(RegistryKey* handle, const std::string& path) {
-        put(path, "key");
-        uint32_t subkeys = 0;
-        uint32_t values = 0;
-        if (RQueryInfoKeyA(handle, nullptr, nullptr, nullptr, nullptr, &subkeys, nullptr, nullptr, &values, nullptr,
-                           nullptr, nullptr, nullptr) != R_SUCCESS)
-            why += path + ": cannot be queried\n";
-        for (uint32_t i = 0; i < values; i++)
-            value(handle, path, i);
-        for (uint32_t i = 0; i < subkeys; i++) {
-            std::string name(name_room, '\0');
-            uint32_t size = name_room;
-            Handle child;
-            if (REnumKeyExA(handle, i, name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
-                ROpenSubKey(handle, i, child.out()) != R_SUCCESS)
-                why += path + ": subkey " + std::to_string(i) + " cannot be opened\n";
-            else
-                key(child.get(), path.empty() ? name.c_str() : path + "\\" + name.c_str());
-        }
+    explicit Choice(const Hive& hive) {
+        for (const Key& child : hive.root.children)
+            walk(child, "");
     }
 
-    std::string why;
+    std::vector<Operation> operations;
 
 private:
-    void value(RegistryKey* handle, const std::string& path, uint32_t i) {
-        std::string name(name_room, '\0');
-        uint32_t name_size = name_room;
-        uint32_t type = 0;
-        uint32_t size = 0;
-        if (REnumValueA(handle, i, name.data(), &name_size, &type, nullptr, &size) != R_SUCCESS) {
-            why += path + ": value " + std::to_string(i) + " cannot be read\n";
+    void walk(const Key& key, const std::string& parent) {
+        if (!is_plain_key(key))
             return;
+        const std::string path = below(parent, narrow(key.name));
+        take_values(key, path);
+        take_subkeys(key, path);
+        for (const Key& child : key.children)
+            walk(child, path);
+    }
+
+    bool is_new(const std::string& what) {
+        return std::none_of(operations.begin(), operations.end(),
+                            [&](const Operation& made) { return made.name == what; });
+    }
+
+    template <typename Make, typename... Arguments>
+    void add(Make make, const std::string& what, const Arguments&... arguments) {
+        if (is_new(what))
+            operations.push_back(make(what, arguments...));
+    }
+
+    void take_values(const Key& key, const std::string& path) {
+        if (key.values.empty())
+            add(set, "first value of a key", path, "first", 3U, size_t{40});
+        if (key.values.size() > 1) {
+            add(set, "new inline value", path, "added", 4U, size_t{4});
+            add(set, "new value that needs a bin", path, "added", 3U, size_t{20000});
         }
-        std::string data(size + 1, '\0');
-        uint32_t room = size;
-        if (REnumValueW(handle, i, nullptr, nullptr, nullptr, data.data(), &room) != R_SUCCESS)
-            why += path + "|" + name.c_str() + ": its data cannot be read\n";
-        data.resize(size);
-        put(path + "|" + name.c_str(), std::to_string(type) + ":" + data);
+        for (const Value& value : key.values) {
+            if (!value.name_8bit || !is_plain(value.name) || !value.readable)
+                continue;
+            const std::string name = narrow(value.name);
+            const bool segmented = value.size > 16344;
+            const std::string kind = segmented ? "long value " : value.is_inline ? "inline value " : "value ";
+            add(set, kind + "made larger", path, name, 3U, value.data.size() + 200);
+            add(set, kind + "made inline", path, name, 4U, size_t{4});
+            add(set, kind + "of the same size", path, name, value.type, value.data.size());
+            add(remove_value, kind + "removed", path, name);
+        }
     }
 
-    void put(const std::string& place, const std::string& what) {
-        if (!out_.emplace(place, what).second)
-            why += place + " is there twice\n";
+    void take_subkeys(const Key& key, const std::string& path) {
+        add(create, key.children.empty() ? "first subkey" : "another subkey", path, "m new");
+        for (const Key& child : key.children) {
+            if (!is_plain_key(child))
+                continue;
+            const std::string name = narrow(child.name);
+            const bool is_leaf = child.children.empty();
+            add(rename, is_leaf ? "key renamed" : "key with subkeys renamed", path, name, "m other");
+            if (is_leaf)
+                add(remove_key, child.values.empty() ? "empty key deleted" : "key with values deleted", path,
+                    name);
+        }
     }
-
-    Contents& out_;
 };
 
+} // namespace
+
+namespace {
+
 bool is_named(const Operation& operation, const std::string& place) {
-    return std::any_of(operation.named.begin(), operation.named.end(), [&](const std::string& prefix) {
-        return place.compare(0, prefix.size(), prefix) == 0;
+    return std::any_of(operation.named.begin(), operation.named.end(), [&](const std::string& name) {
+        const bool begins = place.compare(0, name.size(), name) == 0;
+        return begins &&
+               (place.size() == name.size() || place[name.size()] == '\\' || place[name.size()] == '|');
     });
 }
 
@@ -187,25 +243,8 @@ bool holds(const Contents& contents, const std::string& place, const std::string
 
 } // namespace
 
-Contents contents(const Bytes& bytes, std::string& why) {
-    Contents all;
-    MemoryFile file(bytes);
-    file.read_only = true;
-    const RegistryIo io = file.io();
-    RegistryKey* root = ROpenHive(&io);
-    if (root == nullptr) {
-        why = "the hive does not open";
-        return all;
-    }
-    Reading reading(all);
-    reading.key(root, "");
-    why = reading.why;
-    if (RCloseKey(root) != R_SUCCESS)
-        why += "the hive does not close";
-    return all;
-}
-
-std::string harm(const Operation& operation, const Contents& before, const Contents* after, const Bytes& bytes) {
+std::string harm(const Operation& operation, const Contents& before, const Contents* after,
+                 const Bytes& bytes) {
     std::string text;
     const Contents now = contents(bytes, text);
     for (const auto& [place, what] : before) {
@@ -221,6 +260,22 @@ std::string harm(const Operation& operation, const Contents& before, const Conte
         }
     }
     return text;
+}
+
+std::vector<Operation> operations_on(const Bytes& hive) {
+    return Choice(read_hive(hive)).operations;
+}
+
+std::vector<std::pair<std::string, Bytes>> small_real_hives() {
+    constexpr size_t wanted = 3;
+    std::vector<std::pair<std::string, Bytes>> hives;
+    for (const RealHive& hive : real_hives()) {
+        if (hive.name == "bcd" || hive.name == "sam-2016" || hive.name == "big-data")
+            hives.emplace_back(hive.name, read_file(hive.path));
+    }
+    if (hives.size() < wanted)
+        std::printf("[ LEFT OUT ] %zu of %zu small real hives\n", wanted - hives.size(), wanted);
+    return hives;
 }
 
 } // namespace testkit

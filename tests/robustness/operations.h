@@ -1,37 +1,43 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// One of every change that the engine makes, each on a hive laid out for it, and what a hive holds as the engine shows it.
+// One of every change that the engine makes, each on a hive laid out for it or chosen from a real one.
 #pragma once
 
-#include "scene.h"
+#include "contents.h"
 
 #include <functional>
-#include <map>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace testkit {
 
 struct Operation {
     std::string name;
-    std::function<int32_t(RegistryKey* root)> run;
-    // What the call names, as keys of a Contents begin: everything else must stay as it is.
+    std::string key; // path of the key that the call is made on
+    std::function<int32_t(RegistryKey* key)> change;
+    // The keys ("PATH", with all below) and values ("PATH|NAME") that the call names: all else must stay as
+    // it is.
     std::vector<std::string> named;
+
+    // Opens the key and makes the change.
+    int32_t run(RegistryKey* root) const;
 };
 
 // A hive with an index of each kind, for the operations to work on.
 HiveLayout operation_layout(Leaf leaf);
 std::vector<Operation> operations();
+// The same kinds of change where any hive has the keys and values for them.
+std::vector<Operation> operations_on(const Bytes& hive);
 
-// "PATH" for every key, "PATH|NAME" with type and data for every value.
-using Contents = std::map<std::string, std::string>;
+// Copies of the real hives that are small enough to be read some thousand times; prints by count what is left
+// out.
+std::vector<std::pair<std::string, Bytes>> small_real_hives();
 
-// Reads the whole hive through the engine. Empty, with why set, when it does not open or something in it cannot be read.
-Contents contents(const Bytes& bytes, std::string& why);
-
-// What is not as it was, among what the operation does not name; and, unless after is null, what it does name that is
-// neither as before nor as after nor absent. Empty when all is well.
-std::string harm(const Operation& operation, const Contents& before, const Contents* after, const Bytes& bytes);
+// What is not as it was, among what the operation does not name; and, unless after is null, what it does name
+// that is neither as before nor as after nor absent. Empty when all is well.
+std::string harm(const Operation& operation, const Contents& before, const Contents* after,
+                 const Bytes& bytes);
 
 } // namespace testkit
