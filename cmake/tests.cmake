@@ -8,7 +8,7 @@ function(tallowfen_add_test)
     endif()
     set_tests_properties(${T_NAME} PROPERTIES
         LABELS "${T_LABEL}" TIMEOUT ${T_TIMEOUT}
-        ENVIRONMENT "TALLOWFEN_HIVES=${TALLOWFEN_HIVES};QT_QPA_PLATFORM=offscreen;TSAN_OPTIONS=ignore_noninstrumented_modules=1 halt_on_error=1;ASAN_OPTIONS=detect_leaks=1")
+        ENVIRONMENT "TALLOWFEN_HIVES=${TALLOWFEN_HIVES};QT_QPA_PLATFORM=offscreen;TSAN_OPTIONS=ignore_noninstrumented_modules=1 halt_on_error=1;ASAN_OPTIONS=detect_leaks=1:exitcode=99")
     foreach(label IN LISTS T_LABEL)
         if(NOT TARGET tests_${label})
             add_custom_target(tests_${label})

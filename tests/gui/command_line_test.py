@@ -106,7 +106,7 @@ def hibernated(scratch):
             program.picture(os.path.join(PICTURES, "hibernated.png"), box)
             equal([each for each in ("OK", "Cancel") if has_button(program, box, each)], ["OK"], "its buttons")
             program.click(program.button(box, "OK"))
-            equal(program.status(), 2, "the status")
+            program.ended(2)
         finally:
             program.end()
 
@@ -130,6 +130,8 @@ def several_hives(scratch):
             lambda: [row.name for row in program.tree_rows(tree)] == ["B", "first", "third", "A", "second"],
             "the hives below",
         )
+        program.pick("File", "Exit")
+        program.ended()
     finally:
         program.end()
 

@@ -56,8 +56,7 @@ def browsing(scratch):
         program.keys("Right")
         session.click_key(SERVICES + ["Themes"])
         equal(program.open_titles(), [TITLE], "windows after opening the branch again")
-        program.pick("File", "Exit")
-        equal(program.status(), 0, "the exit status")
+        session.leave()
         session.unchanged("browsing")
 
 

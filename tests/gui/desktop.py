@@ -168,6 +168,12 @@ class Program:
         """The exit status, once it has ended by itself."""
         return self.process.wait(timeout)
 
+    def ended(self, wanted=0):
+        """Waits until the program has ended by itself with this status; after a sanitizer's report it is another one."""
+        status = self.status(60)
+        if status != wanted:
+            raise Failure(f"the program ended with {status}, not {wanted}: {self.output()[-8000:]}")
+
     def output(self):
         with open(self.log, errors="replace") as log:
             return log.read()

@@ -332,8 +332,7 @@ def whole_session(scratch):
         ):
             step(scene.__doc__)
             scene(session)
-        session.program.pick("File", "Exit")
-        equal(session.program.status(), 0, "the exit status")
+        session.leave()
         session.unchanged("the end")
 
 

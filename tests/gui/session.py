@@ -115,10 +115,20 @@ class Session:
         return self
 
     def __exit__(self, kind, *_):
-        if kind is not None and self.program.process.poll() is None:
-            self.picture("failure")
-            print("open windows:", self.program.open_titles(), flush=True)
-        self.program.end()
+        try:
+            if self.program.process.poll() is None:
+                if kind is None:
+                    # Left by itself, the program gives back its memory, and a sanitizer tells what it did not.
+                    self.leave()
+                else:
+                    self.picture("failure")
+                    print("open windows:", self.program.open_titles(), flush=True)
+        finally:
+            self.program.end()
+
+    def leave(self):
+        self.program.pick("File", "Exit")
+        self.program.ended()
 
     def read(self):
         return read_hive(self.path, self.known_faults)
