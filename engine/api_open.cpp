@@ -22,7 +22,9 @@ int32_t ROpenSubKey(RegistryKey* key, uint32_t index, RegistryKey** out) {
     return open_handle(*key->store, subkey, key->depth + 1, out);
 }
 
-uint32_t RKeyOffset(const RegistryKey* key) { return key != nullptr && key->info != nullptr ? raw(key->info->own) : UINT32_MAX; }
+uint32_t RKeyOffset(const RegistryKey* key) {
+    return key != nullptr && key->info != nullptr ? raw(key->info->own) : UINT32_MAX;
+}
 
 int32_t ROpenKey(RegistryKey* key, const char* path, RegistryKey** out) {
     return key == nullptr ? R_FAILED : ROpenKeyEx(key, path, out, nullptr);
