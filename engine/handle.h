@@ -61,7 +61,8 @@ struct RegistryKey {
     engine::ValueView recent_value;  // the value asked for last: its name and its data are asked for in turn
     uint32_t recent_position;        // UINT32_MAX when there is none
     uint32_t values_generation;
-    // The record could not be read after a change through this handle: the counts are brought up to it at the next call.
+    // The record could not be read after a change through this handle: the counts are brought up to it at the next
+    // call.
     bool counts_are_old;
 };
 

@@ -32,7 +32,8 @@ uint32_t read_through(Store& store, int64_t position, void* buffer, uint32_t len
     uint32_t done = 0;
     while (done < length) {
         const uint32_t rest = length - done;
-        const int32_t count = store.io.read(store.io.device, static_cast<uint8_t*>(buffer) + done, static_cast<int32_t>(rest));
+        const int32_t count =
+            store.io.read(store.io.device, static_cast<uint8_t*>(buffer) + done, static_cast<int32_t>(rest));
         if (count < 0 || static_cast<uint32_t>(count) > rest) {
             store.failed_reads++;
             return 0;

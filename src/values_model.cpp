@@ -60,9 +60,8 @@ const RegValue* ValuesModel::lookup(int row) const {
     std::unique_ptr<RegValue> value = key_->read_value(row);
     if (value == nullptr)
         value = std::make_unique<RegValue>(key_->read_value_name(row));
-    RegValue* const kept = value.get();
     cache_.insert(row, value.release(), 1);
-    return kept;
+    return cache_.object(row);
 }
 
 QVariant ValuesModel::data(const QModelIndex& index, int role) const {
