@@ -79,12 +79,13 @@ void set_checksum(BaseBlock& base) {
     base.checksum = sum;
 }
 
-// Makes the file reach to end, by zeros behind what it has now.
+// Makes the file reach to end, by zeros behind what it has now. Not where it ends inside the bins, having been cut
+// short: the zeros would stand for what was lost there.
 bool lengthen_file(Store& store, int64_t end) {
     constexpr uint32_t block_size = 512;
     const uint8_t zeros[block_size] = {};
     const int32_t length = store.io.seek(store.io.device, 0, seek_end);
-    if (length < 0)
+    if (length < int64_t{base_block_size} + store.bins_size)
         return false;
     store.window.valid = false;
     for (int64_t reached = length; reached < end; reached += block_size) {
