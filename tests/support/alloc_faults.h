@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// Makes the N-th malloc, calloc or realloc of statically linked code fail. Works in a program that links
-// tallowfen_alloc_faults; operator new is not touched.
+// Makes the N-th malloc, calloc or realloc of statically linked code fail, and measures what it takes. Works in a
+// program that links tallowfen_alloc_faults; operator new is not touched.
 #pragma once
 
 #include <cstdint>
@@ -20,6 +20,8 @@ public:
 
     uint64_t allocations() const; // asked for so far
     bool failed() const;          // whether one failed
+    uint64_t largest() const;     // bytes of the largest request
+    uint64_t peak() const;        // the most bytes that were allocated at one time since the count began
 };
 
 } // namespace testkit

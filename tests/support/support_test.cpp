@@ -206,4 +206,16 @@ TEST(Support, an_allocation_fails_when_told) {
     free(third);
 }
 
+TEST(Support, allocations_are_measured) {
+    const AllocationFaults faults(0);
+    void* first = malloc(1000);
+    free(first);
+    void* second = malloc(3000);
+    second = realloc(second, 5000);
+    EXPECT_EQ(faults.largest(), 5000U);
+    EXPECT_GE(faults.peak(), 5000U);
+    EXPECT_LT(faults.peak(), 6000U);
+    free(second);
+}
+
 } // namespace
