@@ -141,8 +141,9 @@ bool append_bin(Store& store, uint32_t size) {
     const uint32_t bin_size = (size + bin_header_size + cell_head_size + bin_alignment - 1) & ~(bin_alignment - 1);
     const Bin bin = {static_cast<uint32_t>(store.bins_size), bin_size, bin_size - bin_header_size, false};
     const int64_t end = int64_t{base_block_size} + bin.offset + bin.size;
-    // Room in the table comes first: a bin that counts in the file but not in the table could be laid over.
-    if (end > highest_end || !reserve_bin(store, append_growth) || !lengthen_file(store, end) || !lay_bin(store, bin))
+    // Room in the tables comes first: a bin that counts in the file but not in the table could be laid over.
+    if (end > highest_end || !reserve_bin(store, append_growth) ||
+        !reserve_cells(store, bin.offset + int64_t{bin.size}) || !lengthen_file(store, end) || !lay_bin(store, bin))
         return false;
     const uint32_t bins_size = bin.offset + bin.size;
     if (!count_in_base_block(store, bins_size))
@@ -186,7 +187,7 @@ CellOffset allocate(Store& store, uint32_t n) {
 // The cells tile the bin after each.
 bool free_cell(Store& store, CellOffset offset) {
     Cell cell;
-    if (!is_own_cell(store, offset) || !find_used_cell(store, offset, cell))
+    if (!find_used_cell(store, offset, cell))
         return false;
     const Bin bin = *bin_of(store, offset);
     const auto size_word = static_cast<int32_t>(cell.size);

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "allocator.h"
 #include "handle.h"
+#include "kinship.h"
 #include "security.h"
 #include "stored_name.h"
 #include "subkey_insert.h"
@@ -55,7 +56,7 @@ void free_key(Store& store, const KeyView& key) {
             free_cell(store, offset);
     }
     free_index_cell(store, key.record);
-    if (values.count > 0)
+    if (values.count > 0 && !is_record(store, values.cell))
         free_cell(store, values.cell.offset);
     drop_security_reference(store, cell_offset(key.record.security));
     if (store.sorted_key == key.offset())
@@ -83,7 +84,7 @@ int32_t delete_at(RegistryKey& handle, const PathEnd& end) {
     if (!load_key_index(store, parent.record, index))
         return R_NOT_ENOUGH_MEMORY;
     int32_t status = R_FAILED;
-    if (index.is_root || end.position >= index.total)
+    if (index.is_root || end.position >= index.total || belongs_elsewhere(store, end.parent, index, key))
         status = R_PATH_NOT_FOUND;
     else if (index.whole && index.total == parent.record.subkey_count &&
              subkey_at(store, index, end.position) == end.key)
@@ -117,7 +118,7 @@ int32_t check_entry(Store& store, const Level& parent, uint32_t position, KeyVie
     uint32_t where;
     if (find_subkey(store, parent.children, parent.key.offset(), key.searchable(), compare_signed, where, met) !=
             Lookup::found ||
-        where != position)
+        where != position || has_other_parent(store, parent.key.offset(), key))
         return R_PATH_NOT_FOUND;
     return check_lists(store, key);
 }

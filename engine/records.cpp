@@ -79,4 +79,29 @@ Named compare_value(Store& store, CellOffset offset, const Name& name, ValueView
     return compare_name(store, value, name, many.bytes);
 }
 
+bool is_record(Store& store, const Cell& cell) {
+    IndexHead head;
+    if (!read_part(store, cell, 0, &head, sizeof head))
+        return false;
+    const uint32_t rest = cell.room() - static_cast<uint32_t>(sizeof head);
+    KeyView key;
+    ValueView value;
+    switch (head.signature) {
+    case sig_key:
+        return read_key(store, cell.offset, key);
+    case sig_value:
+        return read_value(store, cell.offset, value);
+    case sig_security:
+        return cell.room() >= sizeof(SecurityRecord);
+    case sig_fast_leaf:
+    case sig_hash_leaf:
+        return head.count <= rest / sizeof(LeafEntry);
+    case sig_index_leaf:
+    case sig_index_root:
+        return head.count <= rest / sizeof(Le32);
+    default:
+        return false;
+    }
+}
+
 }  // namespace engine

@@ -61,4 +61,8 @@ struct Block {
     ~Block();
 };
 
+// Whether the cell holds a whole record of a kind that begins with a signature. Plain data can look like one; what
+// takes it for another's then merely leaves it alone.
+bool is_record(Store& store, const Cell& cell);
+
 }  // namespace engine

@@ -12,6 +12,8 @@ namespace {
 constexpr int32_t first_capacity = 256;
 constexpr int32_t open_growth = 64;
 constexpr int seek_start = 0;
+constexpr int seek_end = 2;
+constexpr uint32_t bits = 8;
 
 bool seek_to(const Store& store, int64_t position) {
     if (position < 0 || position > INT32_MAX)
@@ -107,6 +109,33 @@ void refresh_bin_at(Store& store, int64_t position) {
     refresh_bin(store, store.bins[low]);
 }
 
+void clear_bits(uint8_t* map, uint32_t from, uint32_t to) {
+    while (from < to) {
+        const uint32_t first = from % bits;
+        const uint32_t count = to - from < bits - first ? to - from : bits - first;
+        map[from / bits] = static_cast<uint8_t>(map[from / bits] & ~(((1U << count) - 1) << first));
+        from += count;
+    }
+}
+
+// Notes a cell that the walk came by, and that none begins inside it. false when memory ran out.
+bool mark_cell(Store& store, uint32_t offset, uint32_t size) {
+    // Only a file that ends before its bins do, and has since been written to behind its end, needs more room here.
+    if (!reserve_cells(store, int64_t{offset} + cell_alignment))
+        return false;
+    const uint32_t unit = offset / cell_alignment;
+    const uint32_t most = store.cell_map_size * bits;
+    const uint32_t end = unit + size / cell_alignment;
+    store.cell_map[unit / bits] = static_cast<uint8_t>(store.cell_map[unit / bits] | 1U << unit % bits);
+    clear_bits(store.cell_map, unit + 1, end < most ? end : most);
+    return true;
+}
+
+bool is_marked(const Store& store, uint32_t offset) {
+    const uint32_t unit = offset / cell_alignment;
+    return unit / bits < store.cell_map_size && (store.cell_map[unit / bits] >> unit % bits & 1) != 0;
+}
+
 bool choose_leaf_kind(Store& store, const KeyRecord& root) {
     store.root_index = cell_offset(root.subkey_index);
     if (root.subkey_count == 0) {
@@ -140,6 +169,10 @@ bool build_bin_table(Store& store) {
     if (store.bins == nullptr)
         return false;
     store.bin_capacity = first_capacity;
+    // The file's own length bounds the map: what the base block says may be anything.
+    const int64_t there = int64_t{store.io.seek(store.io.device, 0, seek_end)} - base_block_size;
+    if (there < 0 || !reserve_cells(store, there < bins_size ? there : int64_t{bins_size}))
+        return false;
     int64_t offset = 0;
     while (offset < bins_size) {
         Bin bin = {};
@@ -150,10 +183,10 @@ bool build_bin_table(Store& store) {
         offset = end;
     }
     store.bins_size = static_cast<int32_t>(bins_size);
-    // Root and index must be cells that their bins' walks come by, or the next value might be put over them.
+    // Root and index must be cells in use, or the next value might be put over them.
     Cell cell;
-    return offset == bins_size && is_own_cell(store, store.root) && find_used_cell(store, store.root, cell) &&
-           cell.room() >= sizeof root && (root.subkey_count == 0 || is_own_cell(store, store.root_index));
+    return offset == bins_size && find_used_cell(store, store.root, cell) && cell.room() >= sizeof root &&
+           (root.subkey_count == 0 || is_own_cell(store, store.root_index));
 }
 
 }  // namespace
@@ -175,6 +208,7 @@ Store* open_store(const RegistryIo& io) {
 
 void free_store(Store* store) {
     free(store->bins);
+    free(store->cell_map);
     free(store->window.bytes);
     free(store);
 }
@@ -248,7 +282,8 @@ int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin) {
     while (walked < size) {
         int32_t cell;
         uint32_t absolute;
-        if (!read_size(store, start + walked, cell) || !is_cell_size(cell, size - walked, absolute))
+        if (!read_size(store, start + walked, cell) || !is_cell_size(cell, size - walked, absolute) ||
+            !mark_cell(store, bin_offset + walked, absolute))
             return -1;
         if (cell > 0 && absolute > bin.largest_free)
             bin.largest_free = absolute;
@@ -282,6 +317,20 @@ bool reserve_bin(Store& store, int32_t growth) {
     memset(grown + store.bin_capacity, 0, static_cast<size_t>(growth) * sizeof(Bin));
     store.bins = grown;
     store.bin_capacity = capacity;
+    return true;
+}
+
+bool reserve_cells(Store& store, int64_t end) {
+    constexpr int64_t step = cell_alignment * bits;
+    const int64_t needed = (end + step - 1) / step;
+    if (needed <= store.cell_map_size)
+        return true;
+    auto* grown = static_cast<uint8_t*>(realloc(store.cell_map, static_cast<size_t>(needed)));
+    if (grown == nullptr)
+        return false;
+    memset(grown + store.cell_map_size, 0, static_cast<size_t>(needed) - store.cell_map_size);
+    store.cell_map = grown;
+    store.cell_map_size = static_cast<uint32_t>(needed);
     return true;
 }
 
@@ -319,7 +368,7 @@ int32_t cell_length(Store& store, CellOffset offset) {
 bool find_cell(Store& store, CellOffset offset, Cell& cell) {
     const Bin* bin = bin_of(store, offset);
     const uint32_t place = raw(offset);
-    if (bin == nullptr || place % cell_alignment != 0 || place - bin->offset < bin_header_size)
+    if (bin == nullptr || place % cell_alignment != 0 || !is_marked(store, place))
         return false;
     const uint32_t room = bin->size - (place - bin->offset);
     int32_t size;
@@ -334,20 +383,7 @@ bool find_used_cell(Store& store, CellOffset offset, Cell& cell) { return find_c
 
 bool is_own_cell(Store& store, CellOffset offset) {
     Cell cell;
-    if (!find_used_cell(store, offset, cell))
-        return false;
-    const Bin& bin = *bin_of(store, offset);
-    const int64_t start = int64_t{base_block_size} + bin.offset;
-    const uint32_t wanted = raw(offset) - bin.offset;
-    uint32_t walked = bin_header_size;
-    while (walked < wanted) {
-        int32_t size;
-        uint32_t absolute;
-        if (!read_size(store, start + walked, size) || !is_cell_size(size, bin.size - walked, absolute))
-            return false;
-        walked += absolute;
-    }
-    return walked == wanted;
+    return find_used_cell(store, offset, cell);
 }
 
 uint32_t read_record(Store& store, uint32_t signature, CellOffset offset, void* buffer, uint32_t length) {

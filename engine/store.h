@@ -46,6 +46,10 @@ struct Store {
     int32_t unused;  // -1 from the open on
     int32_t open_handles;
     ReadWindow window;
+    // One bit for every 8 bytes of the bins, set where the walk over a bin came by a cell. What lies elsewhere is no
+    // cell, however it looks: it is part of one, and goes with it.
+    uint8_t* cell_map;
+    uint32_t cell_map_size;  // bytes
 
     int32_t unread_bins;    // how many bins are unread
     uint32_t failed_reads;  // raised when the device fails, which tells what could not be read from what is not there
@@ -92,12 +96,11 @@ Outcome rewrite_at(Store& store, int64_t position, const void* now, const void* 
 
 // The absolute value of the cell's size word, -1 when it cannot be read or is no multiple of 8.
 int32_t cell_length(Store& store, CellOffset offset);
-// Looks up the cell at an offset: false unless its whole extent lies in one bin and its size can be a cell's.
+// Looks up the cell at an offset: false unless the walk over its bin's cells, from the first, comes by it.
 bool find_cell(Store& store, CellOffset offset, Cell& cell);
 // The same for a cell that is in use.
 bool find_used_cell(Store& store, CellOffset offset, Cell& cell);
-// Whether the walk over the bin's cells, from its first, comes by this cell and it is in use: only then may it be
-// written to, freed or replaced.
+// Whether it is a cell in use: only then may it be written to, freed or replaced.
 bool is_own_cell(Store& store, CellOffset offset);
 
 // Reads up to length bytes of the record in a cell in use, never past its end; returns how many, 0 on failure.
@@ -107,8 +110,8 @@ bool read_part(Store& store, const Cell& cell, uint32_t skip, void* buffer, uint
 
 // Finds the bin that holds an offset (not its header); null when none does.
 Bin* bin_of(Store& store, CellOffset offset);
-// Reads the bin's header and walks its cells; fills bin; returns the end of the walk, counted from the first bin, or
-// -1.
+// Reads the bin's header and walks its cells; fills bin and the bin's share of the cell map; returns the end of the
+// walk, counted from the first bin, or -1, what the walk did not reach then being as it was in the map.
 int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin);
 // Reads one size word: false when it cannot be read. The walk over a bin's cells steps with it, so the common case, a
 // word inside the window, is kept short.
@@ -137,5 +140,7 @@ void refresh_unread_bins(Store& store);
 
 // Makes room for one more entry in the bin table; false when memory ran out, the table then being as before.
 bool reserve_bin(Store& store, int32_t growth);
+// Makes room for the cells of bins up to an offset; false when memory ran out.
+bool reserve_cells(Store& store, int64_t end);
 
 }  // namespace engine

@@ -3,6 +3,7 @@
 #include "subkey_insert.h"
 
 #include "allocator.h"
+#include "kinship.h"
 #include "leaf_edit.h"
 #include "security.h"
 
@@ -78,13 +79,16 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
     return Inserted::failed;
 }
 
-// Sets the parent of the first count subkeys. Returns how many were set.
-uint32_t set_parents(Store& store, const SubkeyIndex& children, uint32_t count, CellOffset parent) {
+// Sets the parent of the first count subkeys of the key at own, but for those that it merely lists. Returns how many
+// were seen to.
+uint32_t set_parents(Store& store, CellOffset own, const SubkeyIndex& children, uint32_t count, CellOffset parent) {
     for (uint32_t i = 0; i < count; i++) {
         KeyView child;
         const CellOffset offset = subkey_at(store, children, i);
-        if (!read_key(store, offset, child) || !is_own_cell(store, offset))
+        if (!read_key(store, offset, child))
             return i;
+        if (has_other_parent(store, own, child))
+            continue;
         KeyRecord changed = child.record;
         changed.parent = raw(parent);
         if (rewrite_key(store, offset, child.record, changed) != Outcome::written)
@@ -118,7 +122,7 @@ int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, u
     const CellOffset renamed = place_key(store, record, name);
     if (renamed == CellOffset::none)
         return R_CAN_NOT_COMPLETE;
-    const uint32_t set = set_parents(store, children, children.total, renamed);
+    const uint32_t set = set_parents(store, old.offset(), children, children.total, renamed);
     int32_t status = R_CAN_NOT_COMPLETE;
     if (set == children.total)
         status = switch_records(store, parent, index, position, name, renamed);
@@ -128,7 +132,7 @@ int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, u
             store.sorted_key = renamed;
         free_cell(store, old.offset());
     } else if (status == R_CAN_NOT_COMPLETE) {
-        set_parents(store, children, set, old.offset());
+        set_parents(store, old.offset(), children, set, old.offset());
         free_cell(store, renamed);
     }
     return status == R_FAILED ? R_CAN_NOT_COMPLETE : status;
@@ -173,7 +177,8 @@ int32_t rename_subkey(Store& store, CellOffset parent_offset, uint32_t position,
         KeyView sibling;
         uint32_t sibling_position;
         if (!index.whole || index.total != parent.record.subkey_count ||
-            !read_key(store, subkey_at(store, index, position), old) || !is_own_cell(store, old.offset()) ||
+            !read_key(store, subkey_at(store, index, position), old) ||
+            belongs_elsewhere(store, parent_offset, index, old) ||
             find_subkey(store, index, parent_offset, name, compare_index, sibling_position, sibling) != Lookup::absent)
             status = R_FAILED;
         else if (load_key_index(store, old.record, children))

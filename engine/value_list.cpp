@@ -98,8 +98,8 @@ bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
     const CellOffset data = cell_offset(old.record.data);
     Cell cell;
     ValueRecord moved;
-    // An offset that leads to no cell of its own is replaced; what lies there is left alone.
-    if (old.is_inline() || old.size() == 0 || !find_used_cell(store, data, cell) || !is_own_cell(store, data))
+    // An offset that leads to no cell, or to another record, is replaced; what lies there is left alone.
+    if (old.is_inline() || old.size() == 0 || !find_used_cell(store, data, cell) || is_record(store, cell))
         return move_data(store, old, record, value, moved);
     if (cell.room() >= value.size)
         return rewrite_data(store, old, record, value);
@@ -107,6 +107,23 @@ bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
         return false;
     free_cell(store, data);
     return true;
+}
+
+// Whether one of the list's first count slots leads to a value.
+bool is_listed(Store& store, const ValueList& list, uint32_t count, CellOffset value) {
+    CellOffset offsets[256];
+    constexpr uint32_t most = sizeof offsets / sizeof offsets[0];
+    for (uint32_t i = 0; i < count;) {
+        const uint32_t read = values_at(store, list, i, offsets, most < count - i ? most : count - i);
+        if (read == 0)
+            return true;  // nobody knows
+        for (uint32_t slot = 0; slot < read; slot++) {
+            if (offsets[slot] == value)
+                return true;
+        }
+        i += read;
+    }
+    return false;
 }
 
 // A new value's record, not yet in any list; none on failure, nothing then being left allocated.
@@ -295,7 +312,8 @@ Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const Ne
 // In turn, and what a stop after each leaves:
 //   the list with the value moved behind the others: every value still there;
 //   the key's record with a count one lower: the value gone;
-//   the last slot, now spare, as a shift of the list leaves it; the value's record freed. Its data stays allocated.
+//   the last slot, now spare, as a shift of the list leaves it; the value's record freed, unless it stands in the list
+//   a second time. Its data stays allocated.
 int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t position) {
     const ValueList list = find_value_list(store, key);
     if (!list.whole || position >= list.count || !is_own_cell(store, key_offset) ||
@@ -331,7 +349,7 @@ int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32
     Le32 offset;
     memcpy(&offset, removed, sizeof offset);
     ValueView value;
-    if (read_value(store, cell_offset(offset), value))
+    if (!is_listed(store, list, list.count - 1, cell_offset(offset)) && read_value(store, cell_offset(offset), value))
         free_cell(store, cell_offset(offset));
     return R_SUCCESS;
 }

@@ -179,11 +179,12 @@ int32_t RSetValueExA(RegistryKey* key, const char* name, uint32_t type, const vo
 // Removes the value of that name. 1013: read-only. 6: not a key. 1003: no such value, or a failed write. -1: damaged.
 int32_t RDeleteValue(RegistryKey* key, const char* name);
 // Renames the index-th subkey; it stays the same key. 1013: read-only. 6: not a key. 87: null or empty name, one with
-// a backslash, or one that is too long. 3: the subkey cannot be opened. -1: a sibling has that name in any case, or a
-// step failed. 1003: a record could not be read or written. Unless 0, the key still has its old name.
+// a backslash, or one that is too long. 3: the subkey cannot be opened. -1: a sibling has that name in any case, the
+// key is listed elsewhere too, or a step failed. 1003: a record could not be read or written. Unless 0, the key still
+// has its old name.
 int32_t RRenameKey(RegistryKey* key, uint32_t index, const char* new_name);
 // Deletes the key at `path`, which must have no subkeys. 1013: read-only. 6: a handle without flag 32. 3: not found,
-// or listed below an index root. 145: it has subkeys. -1, 1003: a step failed.
+// listed below an index root, or listed elsewhere too. 145: it has subkeys. -1, 1003: a step failed.
 int32_t RDeleteKey(RegistryKey* key, const char* path);
 // What RDeleteKey would say to the index-th subkey and to each key below it, leaves first; writes nothing. 0: the whole
 // subtree can be deleted key by key.

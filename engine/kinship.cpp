@@ -1,0 +1,53 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "kinship.h"
+
+namespace engine {
+
+namespace {
+
+uint32_t times_listed(Store& store, const SubkeyIndex& index, CellOffset key) {
+    CellOffset offsets[32];
+    constexpr uint32_t most = sizeof offsets / sizeof offsets[0];
+    uint32_t times = 0;
+    for (uint32_t position = 0; position < index.total;) {
+        const uint32_t read = subkeys_at(store, index, position, offsets, most);
+        for (uint32_t i = 0; i < read; i++)
+            times += offsets[i] == key ? 1U : 0U;
+        position += read > 0 ? read : 1;  // an entry that cannot be read leads to no key
+    }
+    return times;
+}
+
+}  // namespace
+
+// A wrong parent in the record alone does no harm and is passed over: a rename that was cut short leaves some.
+bool has_other_parent(Store& store, CellOffset parent, const KeyView& key) {
+    if (key.offset() == store.root)
+        return true;
+    CellOffset below = key.offset();
+    CellOffset above = cell_offset(key.record.parent);
+    if (above == parent)
+        return false;
+    for (uint32_t level = 0; level < depth_limit; level++) {
+        KeyView upper;
+        SubkeyIndex index;
+        if (!read_key(store, above, upper))
+            return false;
+        if (!load_key_index(store, upper.record, index))
+            return true;
+        const bool lists = times_listed(store, index, below) > 0;
+        free_index(index);
+        if (!lists || above == store.root)
+            return lists;
+        below = above;
+        above = cell_offset(upper.record.parent);
+    }
+    return false;
+}
+
+bool belongs_elsewhere(Store& store, CellOffset parent, const SubkeyIndex& index, const KeyView& key) {
+    return times_listed(store, index, key.offset()) > 1 || has_other_parent(store, parent, key);
+}
+
+}  // namespace engine

@@ -1,0 +1,189 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+
+// What a change in a damaged hive once did to keys and values that nobody had named.
+#include "scene.h"
+
+#include <gtest/gtest.h>
+
+#include <cstring>
+
+using namespace testkit;
+
+namespace {
+
+HiveLayout tree() {
+    HiveLayout layout;
+    layout.free_bytes = 600;
+    KeyLayout& alpha = layout.root.add("Alpha");
+    alpha.set("Text", 1, text_data("hello"));
+    alpha.set("Raw", 3, pattern(100));
+    alpha.add("Inner");
+    alpha.add("Other");
+    layout.root.add("Beta").set("v", 3, pattern(40));
+    layout.root.add("Gamma").add("leaf");
+    return layout;
+}
+
+// Copies a used cell to another place, size word and all.
+void copy_cell(LaidHive& hive, uint32_t from, uint32_t to) {
+    memcpy(hive.bytes.data() + 4096 + to, hive.bytes.data() + 4096 + from,
+           static_cast<size_t>(-hive.cell_size(from)));
+}
+
+uint32_t last_bin(const LaidHive& hive) {
+    return get32(hive.bytes, 40) - 4096;
+}
+
+TEST(Damaged, a_record_that_stands_inside_a_free_cell_is_not_read_since_the_next_cell_goes_over_it) {
+    LaidHive hive = lay_out(tree());
+    const uint32_t inside = last_bin(hive) + 32 + 64;
+    copy_cell(hive, hive.at("Beta").record, inside);
+    hive.put32(hive.at("").index, 12, inside);
+    Scene scene(hive.bytes);
+    ASSERT_TRUE(scene.is_open());
+    EXPECT_FALSE(scene.OpenKey("Beta"));
+    EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(300)), 0);
+    EXPECT_FALSE(scene.OpenKey("Beta"));
+}
+
+TEST(Damaged, a_record_that_stands_inside_another_ones_data_is_not_read) {
+    LaidHive hive = lay_out(tree());
+    const uint32_t inside = hive.at("Alpha").values[1].data + 8;
+    copy_cell(hive, hive.at("Alpha\\Other").record, inside);
+    hive.put32(hive.at("Alpha").index, 12, inside);
+    Scene scene(hive.bytes);
+    EXPECT_FALSE(scene.OpenKey("Alpha\\Other"));
+    EXPECT_TRUE(scene.OpenKey("Alpha\\Inner"));
+}
+
+TEST(Damaged, a_bin_of_2_gigabytes_in_a_short_file_opens_and_takes_a_value) {
+    LaidHive hive = lay_out(tree());
+    const uint32_t bin = last_bin(hive);
+    set32(hive.bytes, 4096 + uint64_t{bin} + 8, 0x7FFF0000 - bin);
+    hive.set_cell_size(bin + 32, static_cast<int32_t>(0x7FFF0000 - bin - 32));
+    hive.put_base(40, 0x7FFF0000);
+    hive.fix_checksum();
+    Scene scene(hive.bytes);
+    ASSERT_TRUE(scene.is_open());
+    EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(9000)), 0);
+    ASSERT_TRUE(scene.Reopen());
+    const Hive now = scene.Read();
+    EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->size, 9000U);
+    EXPECT_LT(scene.bytes().size(), 30000U);
+}
+
+TEST(Damaged, renaming_a_subkey_that_is_the_root_is_refused_for_the_hive_would_not_open_again) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Alpha").index, 4, hive.at("").record);
+    Scene scene(hive.bytes);
+    Handle key = scene.OpenKey("Alpha");
+    EXPECT_EQ(RRenameKey(key.get(), 0, "New"), R_FAILED);
+    key.reset();
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_TRUE(scene.Reopen());
+}
+
+TEST(Damaged, a_key_that_lists_itself_is_not_renamed_out_of_its_place_from_within) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Alpha").index, 4, hive.at("Alpha").record);
+    Scene scene(hive.bytes);
+    Handle key = scene.OpenKey("Alpha");
+    EXPECT_EQ(RRenameKey(key.get(), 0, "New"), R_FAILED);
+    EXPECT_TRUE(scene.Untouched());
+    // From its place it can be.
+    EXPECT_EQ(RRenameKey(scene.root(), 0, "New"), 0);
+    EXPECT_TRUE(scene.OpenKey("New\\Other"));
+}
+
+TEST(Damaged, a_key_that_another_one_lists_too_is_deleted_from_its_own_place_alone) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Gamma").index, 4, hive.at("Alpha\\Other").record);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Delete("Gamma\\Other"), R_PATH_NOT_FOUND);
+    Handle gamma = scene.OpenKey("Gamma");
+    EXPECT_EQ(RCheckDeleteTree(gamma.get(), 0), R_PATH_NOT_FOUND);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(scene.Delete("Alpha\\Other"), 0);
+}
+
+TEST(Damaged, a_key_that_its_list_has_twice_is_neither_deleted_nor_renamed) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Alpha").index, 12, hive.at("Alpha\\Inner").record);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Delete("Alpha\\Inner"), R_PATH_NOT_FOUND);
+    EXPECT_EQ(scene.Rename("Alpha\\Inner", "New"), R_FAILED);
+    EXPECT_TRUE(scene.Untouched());
+}
+
+// A rename that was cut short leaves such.
+TEST(Damaged, a_parent_that_is_merely_wrong_keeps_no_key_from_being_renamed_and_deleted) {
+    for (const uint32_t parent : {none, 0U, 0x7FFFFFF8U}) {
+        LaidHive hive = lay_out(tree());
+        hive.put32(hive.at("Alpha\\Other").record, 16, parent);
+        Scene scene(hive.bytes);
+        EXPECT_EQ(scene.Rename("Alpha\\Other", "New"), 0);
+        EXPECT_EQ(scene.Delete("Alpha\\New"), 0);
+    }
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Alpha\\Other").record, 16, hive.at("Beta").record);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Delete("Alpha\\Other"), 0);
+}
+
+TEST(Damaged, a_rename_leaves_the_parent_of_what_the_key_merely_lists) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Gamma").index, 4, hive.at("Alpha\\Other").record);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Rename("Gamma", "New"), 0);
+    EXPECT_EQ(get32(scene.bytes(), LaidHive::position(hive.at("Alpha\\Other").record, 16)),
+              hive.at("Alpha").record);
+}
+
+TEST(Damaged, data_that_leads_to_a_key_is_moved_and_the_key_stays) {
+    for (const size_t size : {5U, 40U, 76U}) {
+        LaidHive hive = lay_out(tree());
+        hive.put32(hive.at("Alpha").values[1].record, 4, 76);
+        hive.put32(hive.at("Alpha").values[1].record, 8, hive.at("Beta").record);
+        Scene scene(hive.bytes);
+        EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(size, 5)), 0);
+        EXPECT_TRUE(scene.OpenKey("Beta"));
+        const Hive now = scene.Read();
+        EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->data, pattern(size, 5));
+    }
+}
+
+TEST(Damaged, data_that_leads_to_its_own_value_does_not_destroy_it) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Alpha").values[1].record, 4, 8);
+    hive.put32(hive.at("Alpha").values[1].record, 8, hive.at("Alpha").values[1].record);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(8, 5)), 0);
+    const Hive now = scene.Read();
+    ASSERT_NE(find_value(*now.find("Alpha"), "Raw"), nullptr);
+    EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->data, pattern(8, 5));
+}
+
+TEST(Damaged, a_value_that_its_list_has_twice_keeps_its_record_until_both_are_gone) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Alpha").value_list, 4, hive.at("Alpha").values[0].record);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.DeleteValue("Alpha", "Text"), 0);
+    Handle key = scene.OpenKey("Alpha");
+    EXPECT_EQ(RFindValueA(key.get(), "Text"), 0);
+    EXPECT_EQ(RDeleteValue(key.get(), "Text"), 0);
+    EXPECT_EQ(RFindValueA(key.get(), "Text"), -1);
+}
+
+TEST(Damaged, deleting_a_key_whose_list_of_values_is_another_key_leaves_that_key) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Gamma\\leaf").record, 36, 1);
+    hive.put32(hive.at("Gamma\\leaf").record, 40, hive.at("Beta").record);
+    Scene scene(hive.bytes);
+    scene.Delete("Gamma\\leaf");
+    EXPECT_TRUE(scene.OpenKey("Beta"));
+    const Hive now = scene.Read();
+    EXPECT_EQ(find_value(*now.find("Beta"), "v")->data, pattern(40));
+}
+
+} // namespace
