@@ -1,0 +1,95 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "catalogue.h"
+
+namespace hostile {
+
+using testkit::pattern;
+using testkit::Storage;
+using testkit::ValuePlaces;
+
+namespace {
+
+constexpr uint32_t data_bytes = 40000; // three segments, the last one in part
+
+HiveLayout with_segments() {
+    HiveLayout layout;
+    layout.free_bytes = 600;
+    testkit::KeyLayout& key = layout.root.add("Alpha");
+    key.set("Before", 1, testkit::text_data("b"));
+    key.set("Big", 3, pattern(data_bytes)).storage = Storage::big;
+    key.set("Sound", 3, pattern(20000, 3)).storage = Storage::big;
+    key.add("Inner").set("v", 4, pattern(4));
+    return layout;
+}
+
+} // namespace
+
+void add_big_data(List& list) {
+    const auto damaged = [&](const std::string& name,
+                             const std::function<void(Damage&, const ValuePlaces&)>& damage,
+                             Readable readable = Readable::partly) {
+        list.add_on(with_segments, "big_data_" + name, readable, {"Alpha|Big"}, [damage](Damage& d) {
+            const ValuePlaces places = d.at("Alpha").values[1];
+            for (const uint32_t segment : places.segments)
+                d.keep(segment);
+            damage(d, places);
+        });
+    };
+    for (const uint16_t count : {uint16_t{0}, uint16_t{1}, uint16_t{2}, uint16_t{65535}}) {
+        damaged("of_" + std::to_string(count) + "_segments",
+                [count](Damage& d, const ValuePlaces& p) { d.hive.put16(p.data, 2, count); });
+    }
+    damaged("list_shorter_than_the_count", [](Damage& d, const ValuePlaces& p) {
+        d.keep(p.segment_list);
+        d.cut_cell(p.segment_list, 8);
+    });
+    damaged("record_cut_by_its_cell", [](Damage& d, const ValuePlaces& p) { d.cut_cell(p.data, 8); });
+    damaged("record_of_another_signature",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put16(p.data, 0, 0x6262); });
+    damaged("record_free", [](Damage& d, const ValuePlaces& p) {
+        d.result.unsettled = d.result.affected;
+        d.hive.mark_free(p.data);
+    });
+    damaged("list_free", [](Damage& d, const ValuePlaces& p) {
+        d.result.unsettled = d.result.affected;
+        d.hive.mark_free(p.segment_list);
+    });
+    damaged("list_not_there", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.data, 4, none); });
+    damaged("list_is_the_record", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.data, 4, p.data); });
+    damaged("list_in_the_middle_of_a_segment",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.data, 4, p.segments[0] + 256); });
+    list.add_on(with_segments, "big_data_first_segment_free", Readable::partly, {"Alpha|Big"}, [](Damage& d) {
+        d.result.unsettled = d.result.affected;
+        d.hive.mark_free(d.at("Alpha").values[1].segments[0]);
+    });
+    list.add_on(with_segments, "big_data_middle_segment_free", Readable::partly, {"Alpha|Big"},
+                [](Damage& d) {
+                    d.result.unsettled = d.result.affected;
+                    d.hive.mark_free(d.at("Alpha").values[1].segments[1]);
+                });
+    damaged("segment_not_there",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.segment_list, 4, none); });
+    damaged("segment_is_the_list",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.segment_list, 4, p.segment_list); });
+    damaged("segment_short", [](Damage& d, const ValuePlaces& p) { d.cut_cell(p.segments[1], 4096); });
+    damaged("last_segment_short", [](Damage& d, const ValuePlaces& p) { d.cut_cell(p.segments[2], 64); });
+    // Another value's bytes, or the same ones again: what the list says is what is read.
+    damaged("segment_repeated",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.segment_list, 4, p.segments[0]); });
+    damaged("total_above_the_size",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 20000); });
+    damaged("total_one_byte_above_the_size",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, data_bytes - 1); });
+    damaged("total_below_the_size",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 3 * 16344 + 1); });
+    damaged("size_far_above_the_file",
+            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 0x7FFFFFFF); });
+    list.add_on(with_segments, "big_data_that_shares_a_segment_with_another", Readable::partly, {"Alpha|Big"},
+                [](Damage& d) {
+                    d.hive.put32(d.at("Alpha").values[1].segment_list, 0,
+                                 d.at("Alpha").values[2].segments[0]);
+                });
+}
+
+} // namespace hostile

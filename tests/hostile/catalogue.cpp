@@ -1,0 +1,148 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "catalogue.h"
+
+#include <stdexcept>
+
+namespace hostile {
+
+using testkit::base_block_bytes;
+using testkit::KeyLayout;
+using testkit::pattern;
+using testkit::text_data;
+
+namespace {
+
+void fill_alpha(KeyLayout& alpha) {
+    alpha.class_name = u"Klass";
+    alpha.set("", 1, text_data("the default"));
+    alpha.set("Text", 1, text_data("hello"));
+    alpha.set("Number", 4, {1, 2, 3, 4});
+    alpha.set("Raw", 3, pattern(100));
+    alpha.set("Same", 3, pattern(100, 9));
+    KeyLayout& inner = alpha.add("Inner");
+    inner.set("Deep", 4, {9, 8, 7, 6});
+    inner.add("Deeper").set("v", 1, text_data("x"));
+    alpha.add("Other").security = 1;
+    alpha.add("Third");
+}
+
+} // namespace
+
+HiveLayout stage() {
+    HiveLayout layout;
+    layout.security_records = 3;
+    layout.free_bytes = 600;
+    fill_alpha(layout.root.add("Alpha"));
+    KeyLayout& beta = layout.root.add("Beta");
+    beta.per_leaf = 2;
+    for (const char* name : {"b1", "b2", "b3", "b4", "b5"})
+        beta.add(name);
+    beta.children[2].set("v", 3, pattern(20));
+    KeyLayout& gamma = layout.root.add("Gamma");
+    gamma.set("List", 7, {'a', 0, 0, 0, 'b', 0, 0, 0, 0, 0});
+    gamma.set("Eight", 11, pattern(8));
+    gamma.add("leaf");
+    gamma.add("moon").security = 2;
+    gamma.add("_under");
+    layout.root.add("Zeta");
+    return layout;
+}
+
+void Damage::keep(uint32_t cell) {
+    const uint64_t begin = base_block_bytes + uint64_t{cell};
+    result.untouchable.push_back({begin, begin + static_cast<uint32_t>(-hive.cell_size(cell))});
+}
+
+uint32_t Damage::free_space() const {
+    const uint32_t end = testkit::get32(hive.bytes, 40);
+    uint32_t best = none;
+    for (uint32_t bin = 0; bin < end;
+         bin += testkit::get32(hive.bytes, base_block_bytes + uint64_t{bin} + 8)) {
+        const uint32_t bin_end = bin + testkit::get32(hive.bytes, base_block_bytes + uint64_t{bin} + 8);
+        for (uint32_t cell = bin + 32; cell < bin_end;
+             cell += static_cast<uint32_t>(std::abs(hive.cell_size(cell)))) {
+            if (hive.cell_size(cell) > 0 && (best == none || hive.cell_size(cell) > hive.cell_size(best)))
+                best = cell;
+        }
+    }
+    if (best == none)
+        throw std::out_of_range("the hive has no free cell");
+    return best;
+}
+
+uint32_t Damage::add_cell(uint32_t record_bytes) {
+    const uint32_t cell = free_space();
+    const int32_t size = static_cast<int32_t>((record_bytes + 4 + 7) & ~7U);
+    const int32_t rest = hive.cell_size(cell) - size;
+    if (rest < 0)
+        throw std::out_of_range("the free cell is too small");
+    if (rest > 0)
+        hive.set_cell_size(cell + static_cast<uint32_t>(size), rest);
+    hive.set_cell_size(cell, -size);
+    return cell;
+}
+
+void Damage::cut_cell(uint32_t cell, uint32_t new_size) {
+    const auto old_size = static_cast<uint32_t>(-hive.cell_size(cell));
+    const uint32_t rest = old_size - new_size;
+    hive.set_cell_size(cell, -static_cast<int32_t>(new_size));
+    for (uint32_t i = 4; i < rest; i++)
+        hive.bytes.at(base_block_bytes + uint64_t{cell} + new_size + i) = 0xEE;
+    hive.set_cell_size(cell + new_size, -static_cast<int32_t>(rest));
+}
+
+void List::add(const std::string& name, Readable readable, const Places& affected, const Change& damage,
+               const Places& shared) {
+    add_on(stage, name, readable, affected, damage, shared);
+}
+
+void List::add_on(const std::function<HiveLayout()>& layout, const std::string& name, Readable readable,
+                  const Places& affected, const Change& damage, const Places& shared, bool large) {
+    entries.push_back({name, readable, large, [=] {
+                           Damage work;
+                           work.hive = lay_out(layout());
+                           work.result.intact = work.hive.bytes;
+                           work.result.affected = affected;
+                           work.result.shared = shared;
+                           damage(work);
+                           work.result.bytes = std::move(work.hive.bytes);
+                           return std::move(work.result);
+                       }});
+}
+
+void List::add_bytes(const std::string& name, Readable readable, const std::function<Bytes()>& make,
+                     bool large) {
+    entries.push_back({name, readable, large, [make] {
+                           Case made;
+                           made.bytes = make();
+                           return made;
+                       }});
+}
+
+const std::vector<Entry>& catalogue() {
+    static const std::vector<Entry> all = [] {
+        List list;
+        add_file_and_base_block(list);
+        add_bins(list);
+        add_cells(list);
+        add_keys(list);
+        add_depths(list);
+        add_subkey_indexes(list);
+        add_values(list);
+        add_big_data(list);
+        add_security(list);
+        return list.entries;
+    }();
+    return all;
+}
+
+Case case_of(const std::string& name) {
+    for (const Entry& entry : catalogue()) {
+        if (entry.name == name)
+            return entry.make();
+    }
+    throw std::out_of_range("no hive is named " + name);
+}
+
+} // namespace hostile

@@ -1,0 +1,368 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "changes.h"
+
+#include "hive_checker.h"
+#include "scene.h"
+
+#include <algorithm>
+#include <cstring>
+
+namespace hostile {
+
+using testkit::base_block_bytes;
+using testkit::covers;
+using testkit::FoundKey;
+using testkit::Handle;
+using testkit::Item;
+using testkit::MemoryFile;
+using testkit::pattern;
+using testkit::Snapshot;
+
+namespace {
+
+constexpr uint32_t data_type = 3;
+constexpr uint8_t data_seed = 77;
+const std::string new_name = "Made here";
+const std::string new_key_name = "New name";
+constexpr uint32_t base_head_bytes = 512; // what a change may write of the base block
+constexpr uint32_t bin_header_bytes = 32;
+constexpr uint64_t most_writes = 400;
+
+// Text in UTF-8 as the 8-bit text that a call takes, ended at the first zero; false when 8 bits do not carry
+// it.
+bool as_8bit(const std::string& text, std::string& narrow) {
+    narrow.clear();
+    for (size_t i = 0; i < text.size(); i++) {
+        const auto byte = static_cast<uint8_t>(text[i]);
+        if (byte == 0)
+            return true;
+        if (byte < 0x80) {
+            narrow += text[i];
+        } else if ((byte & 0xFC) == 0xC0 && i + 1 < text.size()) {
+            narrow += static_cast<char>((byte & 3) << 6 | (static_cast<uint8_t>(text[++i]) & 0x3F));
+        } else {
+            return false;
+        }
+    }
+    return true;
+}
+
+std::string below(const std::string& place, const std::string& name) {
+    return place.empty() ? name : place + "\\" + name;
+}
+
+std::string upper_cased(std::string text) {
+    for (char& c : text)
+        c = c >= 'a' && c <= 'z' ? static_cast<char>(c - 32) : c;
+    return text;
+}
+
+bool any_covers(const std::vector<std::string>& places, const std::string& other) {
+    return std::any_of(places.begin(), places.end(), [&](const std::string& place) {
+        return covers(upper_cased(place), upper_cased(other));
+    });
+}
+
+// ---- what is written where
+// ----------------------------------------------------------------------------------------
+
+// Sees each write as it happens and holds it against the cells as they were before it.
+class Watch {
+public:
+    Watch(MemoryFile& file, const std::vector<Range>& untouchable)
+        : file_(file), untouchable_(untouchable), shadow_(file.bytes) {
+        file_.on_write = [this](uint64_t position, uint64_t length) { see(position, length); };
+    }
+    ~Watch() { file_.on_write = nullptr; }
+    Watch(const Watch&) = delete;
+    Watch& operator=(const Watch&) = delete;
+
+    const std::string& problems() const { return problems_; }
+
+private:
+    void see(uint64_t position, uint64_t length) {
+        const uint64_t end = position + length;
+        for (const Range& range : untouchable_) {
+            if (position < range.end && end > range.begin)
+                tell("a damaged structure was written to", position, length);
+        }
+        if (!is_one_unit(position, end))
+            tell("a write is not within one cell or header", position, length);
+        if (end > shadow_.size())
+            shadow_.resize(end);
+        memcpy(shadow_.data() + position, file_.bytes.data() + position, length);
+    }
+
+    bool is_one_unit(uint64_t position, uint64_t end) const {
+        if (position < base_block_bytes)
+            return end <= base_head_bytes;
+        const uint64_t bins_end = base_block_bytes + uint64_t{testkit::get32(shadow_, 40)};
+        if (position >= bins_end || position >= shadow_.size())
+            return true; // where a bin is being appended, or a file that was cut short made longer
+        uint64_t bin = base_block_bytes;
+        while (bin + testkit::get32(shadow_, bin + 8) <= position)
+            bin += testkit::get32(shadow_, bin + 8);
+        if (position < bin + bin_header_bytes)
+            return end <= bin + bin_header_bytes;
+        for (uint64_t cell = bin + bin_header_bytes;;) {
+            const auto word = static_cast<int32_t>(testkit::get32(shadow_, cell));
+            const uint64_t next = cell + static_cast<uint64_t>(std::abs(int64_t{word}));
+            if (position < next)
+                return end <= next;
+            if (word == 0)
+                return false;
+            cell = next;
+        }
+    }
+
+    void tell(const char* what, uint64_t position, uint64_t length) {
+        problems_ += std::string(what) + ": " + std::to_string(length) + " bytes at " +
+                     std::to_string(position) + "\n";
+    }
+
+    MemoryFile& file_;
+    const std::vector<Range>& untouchable_;
+    Bytes shadow_;
+    std::string problems_;
+};
+
+// ---- making a change
+// ----------------------------------------------------------------------------------------------
+
+// Opens the key at the end of a way; the root itself stays in the caller's hands.
+RegistryKey* follow(RegistryKey* root, const std::vector<uint32_t>& way, Handle& holder) {
+    RegistryKey* here = root;
+    for (const uint32_t position : way) {
+        Handle next;
+        if (ROpenSubKey(here, position, next.out()) != R_SUCCESS)
+            return nullptr;
+        holder = std::move(next);
+        here = holder.get();
+    }
+    return here;
+}
+
+int32_t call(RegistryKey* key, const Change& change) {
+    Handle made;
+    const Bytes data = pattern(change.size, data_seed);
+    switch (change.kind) {
+    case Kind::create_key:
+        return RCreateKey(key, change.name.c_str(), made.out(), nullptr);
+    case Kind::set_value:
+        return RSetValueExW(key, change.name.c_str(), data_type, data.data(), change.size);
+    case Kind::delete_value:
+        return RDeleteValue(key, change.name.c_str());
+    case Kind::rename_key:
+    case Kind::rename_damaged_key:
+        return RRenameKey(key, change.position, change.name.c_str());
+    case Kind::delete_key:
+        return RDeleteKey(key, change.name.c_str());
+    }
+    return R_FAILED;
+}
+
+// ---- judging it
+// ---------------------------------------------------------------------------------------------------
+
+std::vector<Item> others(const Snapshot& snapshot, const std::vector<std::string>& exempt) {
+    std::vector<Item> kept;
+    for (const Item& item : snapshot.items) {
+        if (!any_covers(exempt, item.place))
+            kept.push_back(item);
+    }
+    return kept;
+}
+
+std::string differences(const std::vector<Item>& before, const std::vector<Item>& after) {
+    std::string text;
+    std::vector<Item> only;
+    std::set_difference(before.begin(), before.end(), after.begin(), after.end(), std::back_inserter(only));
+    for (const Item& item : only)
+        text += "gone or changed: " + item.place + " (" + item.what.substr(0, 60) + ")\n";
+    only.clear();
+    std::set_difference(after.begin(), after.end(), before.begin(), before.end(), std::back_inserter(only));
+    for (const Item& item : only)
+        text += "new or changed: " + item.place + " (" + item.what.substr(0, 60) + ")\n";
+    return text;
+}
+
+int64_t times(const Snapshot& snapshot, const std::string& place) {
+    return std::count_if(snapshot.items.begin(), snapshot.items.end(),
+                         [&](const Item& item) { return upper_cased(item.place) == upper_cased(place); });
+}
+
+// Whether a call that said that it succeeded did what it says.
+std::string effect(const Change& change, const Snapshot& before, const Snapshot& after) {
+    const auto more = [&](const std::string& place) { return times(after, place) - times(before, place); };
+    const std::string& place = change.named.front();
+    switch (change.kind) {
+    case Kind::create_key:
+        return change.way.size() >= judged_depth || more(place) == 1 ? "" : "the key is not there\n";
+    case Kind::set_value: {
+        const Bytes data = pattern(change.size, data_seed);
+        const std::string what =
+            "type 3 size " + std::to_string(change.size) + ": " + std::string(data.begin(), data.end());
+        const bool there = std::any_of(after.items.begin(), after.items.end(), [&](const Item& item) {
+            return upper_cased(item.place) == upper_cased(place) && item.what == what;
+        });
+        return there ? "" : "the value does not read back\n";
+    }
+    case Kind::delete_value:
+    case Kind::delete_key:
+        return more(place) == -1 ? "" : "not one item less, but " + std::to_string(more(place)) + " more\n";
+    case Kind::rename_key:
+        return more(place) == -1 && more(change.named.back()) == 1 ? "" : "the name did not change\n";
+    case Kind::rename_damaged_key:
+        return "a key that cannot be opened was renamed\n";
+    }
+    return "";
+}
+
+std::string structure(const Bytes& before, const Bytes& after) {
+    std::string text;
+    for (const testkit::Fault& fault : new_faults(testkit::check_hive(before), testkit::check_hive(after))) {
+        if (fault.rule == "bins" || fault.rule == "cells" || fault.rule == "base" || fault.rule == "checksum")
+            text += fault.rule + ": " + fault.text + "\n";
+    }
+    return text;
+}
+
+std::string judge(const Case& hive, const Snapshot& before, const Change& change, int32_t status,
+                  MemoryFile& file) {
+    file.rewind();
+    const RegistryIo io = file.io();
+    RegistryKey* root = ROpenHive(&io);
+    if (root == nullptr)
+        return "the hive does not open any more\n";
+    const Snapshot after = take_snapshot(root, judged_limits(file.bytes.size()));
+    std::string text = RCloseKey(root) == R_SUCCESS ? "" : "the hive does not close\n";
+    const bool shares =
+        status == R_SUCCESS && std::any_of(hive.shared.begin(), hive.shared.end(), [&](const auto& place) {
+            return any_covers({place}, change.named.front()) || any_covers({change.named.front()}, place);
+        });
+    std::vector<std::string> exempt = hive.unsettled;
+    if (status == R_SUCCESS)
+        exempt.insert(exempt.end(), change.named.begin(), change.named.end());
+    if (shares)
+        exempt.insert(exempt.end(), hive.shared.begin(), hive.shared.end());
+    text += differences(others(before, exempt), others(after, exempt));
+    const bool settled = !shares && !any_covers(hive.unsettled, change.named.front());
+    if (status == R_SUCCESS && settled)
+        text += effect(change, before, after);
+    return text + structure(hive.bytes, file.bytes);
+}
+
+} // namespace
+
+std::string Change::text() const {
+    static const char* const kinds[] = {"create",         "set",          "delete value", "rename",
+                                        "rename damaged", "delete subkey"};
+    std::string all =
+        std::string(kinds[static_cast<size_t>(kind)]) + " \"" + name + "\" in \"" + place + "\"";
+    if (kind == Kind::set_value)
+        all += ", " + std::to_string(size) + " bytes";
+    if (kind == Kind::rename_key || kind == Kind::rename_damaged_key)
+        all += ", subkey " + std::to_string(position);
+    return all;
+}
+
+testkit::WalkLimits judged_limits(size_t file_size) {
+    testkit::WalkLimits limits = testkit::limits_for(file_size);
+    limits.depth = judged_depth;
+    limits.keys *= 20; // a ring is walked a few times over before the depth ends it
+    return limits;
+}
+
+namespace {
+
+void add_values_of(const FoundKey& key, std::vector<Change>& all) {
+    std::vector<std::string> names = {new_name};
+    for (const std::string& value : key.values) {
+        std::string narrow;
+        if (value != "?" && as_8bit(value, narrow) &&
+            std::find(names.begin(), names.end(), narrow) == names.end())
+            names.push_back(narrow);
+    }
+    for (const std::string& name : names) {
+        const std::vector<std::string> named = {key.place + "|" + testkit::utf8(testkit::widen(name))};
+        for (const uint32_t size : {0U, 4U, 5U, 100U, 16344U})
+            all.push_back({Kind::set_value, key.way, key.place, name, 0, size, named});
+        if (name != new_name)
+            all.push_back({Kind::delete_value, key.way, key.place, name, 0, 0, named});
+    }
+}
+
+// The calls on the key's parent that are about the key itself.
+void add_key_itself(const FoundKey& key, const FoundKey& parent, std::vector<Change>& all) {
+    const uint32_t position = key.way.back();
+    all.push_back({Kind::rename_key,
+                   parent.way,
+                   parent.place,
+                   new_key_name,
+                   position,
+                   0,
+                   {key.place, below(parent.place, new_key_name)}});
+    std::string narrow;
+    const std::string name = key.place.substr(parent.place.empty() ? 0 : parent.place.size() + 1);
+    if (as_8bit(name, narrow) && !narrow.empty())
+        all.push_back({Kind::delete_key,
+                       parent.way,
+                       parent.place,
+                       narrow,
+                       0,
+                       0,
+                       {below(parent.place, testkit::utf8(testkit::widen(narrow)))}});
+}
+
+} // namespace
+
+std::vector<Change> changes_to(const Snapshot& snapshot) {
+    std::vector<Change> all;
+    std::vector<const FoundKey*> parents; // of the key at hand, from the root down
+    for (const FoundKey& key : snapshot.keys) {
+        parents.resize(key.way.size());
+        all.push_back({Kind::create_key, key.way, key.place, new_name, 0, 0, {below(key.place, new_name)}});
+        add_values_of(key, all);
+        for (const uint32_t position : key.damaged)
+            all.push_back({Kind::rename_damaged_key,
+                           key.way,
+                           key.place,
+                           new_key_name,
+                           position,
+                           0,
+                           {below(key.place, new_key_name)}});
+        if (!parents.empty())
+            add_key_itself(key, *parents.back(), all);
+        parents.push_back(&key);
+    }
+    return all;
+}
+
+std::string try_change(const Case& hive, const Snapshot& before, const Change& change) {
+    MemoryFile file(hive.bytes);
+    const RegistryIo io = file.io();
+    RegistryKey* root = ROpenHive(&io);
+    if (root == nullptr)
+        return "the hive does not open\n";
+    int32_t status = R_FAILED;
+    std::string text;
+    {
+        Handle holder;
+        RegistryKey* key = follow(root, change.way, holder);
+        if (key == nullptr) {
+            text = "the key cannot be reached\n";
+        } else {
+            const Watch watch(file, hive.untouchable);
+            status = call(key, change);
+            text = watch.problems();
+        }
+    }
+    if (file.counts().writes > most_writes + file.bytes.size() / 512)
+        text += std::to_string(file.counts().writes) + " writes\n";
+    if (RCloseKey(root) != R_SUCCESS)
+        return text + "the hive does not close\n";
+    return text + judge(hive, before, change, status, file);
+}
+
+} // namespace hostile
