@@ -27,13 +27,10 @@ HiveLayout tree() {
 
 // Copies a used cell to another place, size word and all.
 void copy_cell(LaidHive& hive, uint32_t from, uint32_t to) {
-    memcpy(hive.bytes.data() + 4096 + to, hive.bytes.data() + 4096 + from,
-           static_cast<size_t>(-hive.cell_size(from)));
+    memcpy(hive.bytes.data() + 4096 + to, hive.bytes.data() + 4096 + from, static_cast<size_t>(-hive.cell_size(from)));
 }
 
-uint32_t last_bin(const LaidHive& hive) {
-    return get32(hive.bytes, 40) - 4096;
-}
+uint32_t last_bin(const LaidHive& hive) { return get32(hive.bytes, 40) - 4096; }
 
 TEST(Damaged, a_record_that_stands_inside_a_free_cell_is_not_read_since_the_next_cell_goes_over_it) {
     LaidHive hive = lay_out(tree());
@@ -136,8 +133,7 @@ TEST(Damaged, a_rename_leaves_the_parent_of_what_the_key_merely_lists) {
     hive.put32(hive.at("Gamma").index, 4, hive.at("Alpha\\Other").record);
     Scene scene(hive.bytes);
     EXPECT_EQ(scene.Rename("Gamma", "New"), 0);
-    EXPECT_EQ(get32(scene.bytes(), LaidHive::position(hive.at("Alpha\\Other").record, 16)),
-              hive.at("Alpha").record);
+    EXPECT_EQ(get32(scene.bytes(), LaidHive::position(hive.at("Alpha\\Other").record, 16)), hive.at("Alpha").record);
 }
 
 TEST(Damaged, data_that_leads_to_a_key_is_moved_and_the_key_stays) {
@@ -186,4 +182,4 @@ TEST(Damaged, deleting_a_key_whose_list_of_values_is_another_key_leaves_that_key
     EXPECT_EQ(find_value(*now.find("Beta"), "v")->data, pattern(40));
 }
 
-} // namespace
+}  // namespace

@@ -10,7 +10,7 @@ using testkit::ValuePlaces;
 
 namespace {
 
-constexpr uint32_t data_bytes = 40000; // three segments, the last one in part
+constexpr uint32_t data_bytes = 40000;  // three segments, the last one in part
 
 HiveLayout with_segments() {
     HiveLayout layout;
@@ -23,11 +23,10 @@ HiveLayout with_segments() {
     return layout;
 }
 
-} // namespace
+}  // namespace
 
 void add_big_data(List& list) {
-    const auto damaged = [&](const std::string& name,
-                             const std::function<void(Damage&, const ValuePlaces&)>& damage,
+    const auto damaged = [&](const std::string& name, const std::function<void(Damage&, const ValuePlaces&)>& damage,
                              Readable readable = Readable::partly) {
         list.add_on(with_segments, "big_data_" + name, readable, {"Alpha|Big"}, [damage](Damage& d) {
             const ValuePlaces places = d.at("Alpha").values[1];
@@ -45,8 +44,7 @@ void add_big_data(List& list) {
         d.cut_cell(p.segment_list, 8);
     });
     damaged("record_cut_by_its_cell", [](Damage& d, const ValuePlaces& p) { d.cut_cell(p.data, 8); });
-    damaged("record_of_another_signature",
-            [](Damage& d, const ValuePlaces& p) { d.hive.put16(p.data, 0, 0x6262); });
+    damaged("record_of_another_signature", [](Damage& d, const ValuePlaces& p) { d.hive.put16(p.data, 0, 0x6262); });
     damaged("record_free", [](Damage& d, const ValuePlaces& p) {
         d.result.unsettled = d.result.affected;
         d.hive.mark_free(p.data);
@@ -63,13 +61,11 @@ void add_big_data(List& list) {
         d.result.unsettled = d.result.affected;
         d.hive.mark_free(d.at("Alpha").values[1].segments[0]);
     });
-    list.add_on(with_segments, "big_data_middle_segment_free", Readable::partly, {"Alpha|Big"},
-                [](Damage& d) {
-                    d.result.unsettled = d.result.affected;
-                    d.hive.mark_free(d.at("Alpha").values[1].segments[1]);
-                });
-    damaged("segment_not_there",
-            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.segment_list, 4, none); });
+    list.add_on(with_segments, "big_data_middle_segment_free", Readable::partly, {"Alpha|Big"}, [](Damage& d) {
+        d.result.unsettled = d.result.affected;
+        d.hive.mark_free(d.at("Alpha").values[1].segments[1]);
+    });
+    damaged("segment_not_there", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.segment_list, 4, none); });
     damaged("segment_is_the_list",
             [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.segment_list, 4, p.segment_list); });
     damaged("segment_short", [](Damage& d, const ValuePlaces& p) { d.cut_cell(p.segments[1], 4096); });
@@ -77,19 +73,14 @@ void add_big_data(List& list) {
     // Another value's bytes, or the same ones again: what the list says is what is read.
     damaged("segment_repeated",
             [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.segment_list, 4, p.segments[0]); });
-    damaged("total_above_the_size",
-            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 20000); });
+    damaged("total_above_the_size", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 20000); });
     damaged("total_one_byte_above_the_size",
             [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, data_bytes - 1); });
-    damaged("total_below_the_size",
-            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 3 * 16344 + 1); });
-    damaged("size_far_above_the_file",
-            [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 0x7FFFFFFF); });
-    list.add_on(with_segments, "big_data_that_shares_a_segment_with_another", Readable::partly, {"Alpha|Big"},
-                [](Damage& d) {
-                    d.hive.put32(d.at("Alpha").values[1].segment_list, 0,
-                                 d.at("Alpha").values[2].segments[0]);
-                });
+    damaged("total_below_the_size", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 3 * 16344 + 1); });
+    damaged("size_far_above_the_file", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.record, 4, 0x7FFFFFFF); });
+    list.add_on(
+        with_segments, "big_data_that_shares_a_segment_with_another", Readable::partly, {"Alpha|Big"},
+        [](Damage& d) { d.hive.put32(d.at("Alpha").values[1].segment_list, 0, d.at("Alpha").values[2].segments[0]); });
 }
 
-} // namespace hostile
+}  // namespace hostile

@@ -24,7 +24,7 @@ HiveLayout two_large_bins() {
     return layout;
 }
 
-} // namespace
+}  // namespace
 
 void add_bins(List& list) {
     const auto in_header = [&](const std::string& name, uint32_t field, uint32_t n) {
@@ -38,8 +38,8 @@ void add_bins(List& list) {
     in_header("that_says_it_is_elsewhere", 4, 0x00100000);
     in_header("that_says_it_is_at_minus_one", 4, none);
     in_header("whose_offset_is_off_by_8", 4, 8);
-    for (const uint32_t size : {0U, 4U, 32U, 2048U, 4095U, 4100U, 5000U, 0x01000000U, 0x7FFFF000U,
-                                0x80000000U, 0xFFFFF000U, 0xFFFFFFFFU})
+    for (const uint32_t size :
+         {0U, 4U, 32U, 2048U, 4095U, 4100U, 5000U, 0x01000000U, 0x7FFFF000U, 0x80000000U, 0xFFFFF000U, 0xFFFFFFFFU})
         in_header("of_size_" + std::to_string(size), 8, size);
     list.add("last_bin_past_the_data_size", Readable::no, {""}, [](Damage& d) {
         testkit::set32(d.hive.bytes, d.hive.bytes.size() - 4096 + 8, 8192);
@@ -47,9 +47,8 @@ void add_bins(List& list) {
     });
     list.add("zeros_for_the_last_bin", Readable::no, {""},
              [](Damage& d) { std::fill(d.hive.bytes.end() - 4096, d.hive.bytes.end(), uint8_t{0}); });
-    list.add("zeros_for_the_first_bin", Readable::no, {""}, [](Damage& d) {
-        std::fill(d.hive.bytes.begin() + 4096, d.hive.bytes.begin() + 8192, uint8_t{0});
-    });
+    list.add("zeros_for_the_first_bin", Readable::no, {""},
+             [](Damage& d) { std::fill(d.hive.bytes.begin() + 4096, d.hive.bytes.begin() + 8192, uint8_t{0}); });
     list.add("zeros_for_a_further_bin", Readable::no, {""}, [](Damage& d) {
         d.hive.bytes.resize(d.hive.bytes.size() + 4096, 0);
         d.hive.put_base(40, testkit::get32(d.hive.bytes, 40) + 4096);
@@ -72,4 +71,4 @@ void add_bins(List& list) {
     list.add_on(two_large_bins, "two_bins_of_a_megabyte", Readable::whole, {}, [](Damage&) {});
 }
 
-} // namespace hostile
+}  // namespace hostile

@@ -27,7 +27,7 @@ void fill_alpha(KeyLayout& alpha) {
     alpha.add("Third");
 }
 
-} // namespace
+}  // namespace
 
 HiveLayout stage() {
     HiveLayout layout;
@@ -57,11 +57,9 @@ void Damage::keep(uint32_t cell) {
 uint32_t Damage::free_space() const {
     const uint32_t end = testkit::get32(hive.bytes, 40);
     uint32_t best = none;
-    for (uint32_t bin = 0; bin < end;
-         bin += testkit::get32(hive.bytes, base_block_bytes + uint64_t{bin} + 8)) {
+    for (uint32_t bin = 0; bin < end; bin += testkit::get32(hive.bytes, base_block_bytes + uint64_t{bin} + 8)) {
         const uint32_t bin_end = bin + testkit::get32(hive.bytes, base_block_bytes + uint64_t{bin} + 8);
-        for (uint32_t cell = bin + 32; cell < bin_end;
-             cell += static_cast<uint32_t>(std::abs(hive.cell_size(cell)))) {
+        for (uint32_t cell = bin + 32; cell < bin_end; cell += static_cast<uint32_t>(std::abs(hive.cell_size(cell)))) {
             if (hive.cell_size(cell) > 0 && (best == none || hive.cell_size(cell) > hive.cell_size(best)))
                 best = cell;
         }
@@ -111,8 +109,7 @@ void List::add_on(const std::function<HiveLayout()>& layout, const std::string& 
                        }});
 }
 
-void List::add_bytes(const std::string& name, Readable readable, const std::function<Bytes()>& make,
-                     bool large) {
+void List::add_bytes(const std::string& name, Readable readable, const std::function<Bytes()>& make, bool large) {
     entries.push_back({name, readable, large, [make] {
                            Case made;
                            made.bytes = make();
@@ -145,4 +142,4 @@ Case case_of(const std::string& name) {
     throw std::out_of_range("no hive is named " + name);
 }
 
-} // namespace hostile
+}  // namespace hostile

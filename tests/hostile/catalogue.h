@@ -17,19 +17,19 @@ using testkit::LaidHive;
 using testkit::none;
 
 enum class Readable {
-    whole,  // nothing that is there may be missing: the hive is odd, but legal
-    partly, // opens; what is damaged is left out or told by a status, the rest reads as ever
-    no,     // must not open
+    whole,   // nothing that is there may be missing: the hive is odd, but legal
+    partly,  // opens; what is damaged is left out or told by a status, the rest reads as ever
+    no,      // must not open
 };
 
 struct Range {
-    uint64_t begin; // positions in the file
+    uint64_t begin;  // positions in the file
     uint64_t end;
 };
 
 struct Case {
     Bytes bytes;
-    Bytes intact; // the same without the damage
+    Bytes intact;  // the same without the damage
     // Places (see Item in snapshot.h) that may read otherwise than in the intact hive; all others read alike.
     std::vector<std::string> affected;
     // Places that lead to the same cells: a change of one of them may show in all of them.
@@ -43,7 +43,7 @@ struct Case {
 struct Entry {
     std::string name;
     Readable readable;
-    bool large; // takes long to walk: few changes are tried, and the models leave it out
+    bool large;  // takes long to walk: few changes are tried, and the models leave it out
     std::function<Case()> make;
 };
 
@@ -84,8 +84,7 @@ public:
     void add_on(const std::function<HiveLayout()>& layout, const std::string& name, Readable readable,
                 const Places& affected, const Change& damage, const Places& shared = {}, bool large = false);
     // Bytes made without a layout.
-    void add_bytes(const std::string& name, Readable readable, const std::function<Bytes()>& make,
-                   bool large = false);
+    void add_bytes(const std::string& name, Readable readable, const std::function<Bytes()>& make, bool large = false);
 
     std::vector<Entry> entries;
 };
@@ -106,4 +105,4 @@ const std::vector<Entry>& catalogue();
 // The case of one entry by its name; throws std::out_of_range.
 Case case_of(const std::string& name);
 
-} // namespace hostile
+}  // namespace hostile

@@ -40,8 +40,8 @@ void add_sizes(List& list) {
 struct Reference {
     std::string name;
     List::Places affected;
-    std::function<uint64_t(Damage&)> field;  // where it stands in the file
-    std::function<uint32_t(Damage&)> holder; // the cell of the record that it stands in
+    std::function<uint64_t(Damage&)> field;   // where it stands in the file
+    std::function<uint32_t(Damage&)> holder;  // the cell of the record that it stands in
 };
 
 std::vector<Reference> references() {
@@ -81,8 +81,7 @@ std::vector<Target> targets() {
         {"inside_a_bin_header", false, number(16)},
         {"minus_1", false, number(none)},
         {"negative", false, number(0x80000020)},
-        {"past_the_end", true,
-         [](Damage& d, const Reference&) { return testkit::get32(d.hive.bytes, 40) + 32; }},
+        {"past_the_end", true, [](Damage& d, const Reference&) { return testkit::get32(d.hive.bytes, 40) + 32; }},
         {"far_past_the_end", false, number(0x7FFFFFF8)},
         {"at_a_free_cell", true, [](Damage& d, const Reference&) { return d.free_space(); }},
         {"in_the_middle_of_a_free_cell", true,
@@ -91,8 +90,7 @@ std::vector<Target> targets() {
              const uint32_t copy = d.free_space() + 128;
              const uint32_t old = testkit::get32(d.hive.bytes, reference.field(d));
              const auto size = static_cast<size_t>(-d.hive.cell_size(old));
-             memcpy(d.hive.bytes.data() + base_block_bytes + copy,
-                    d.hive.bytes.data() + base_block_bytes + old, size);
+             memcpy(d.hive.bytes.data() + base_block_bytes + copy, d.hive.bytes.data() + base_block_bytes + old, size);
              return copy;
          }},
         {"in_the_middle_of_a_used_cell", false,
@@ -100,18 +98,14 @@ std::vector<Target> targets() {
              const uint32_t copy = d.at("Alpha").values[4].data + 8;
              const uint32_t old = testkit::get32(d.hive.bytes, reference.field(d));
              const auto size = std::min<size_t>(static_cast<size_t>(-d.hive.cell_size(old)), 88);
-             memcpy(d.hive.bytes.data() + base_block_bytes + copy,
-                    d.hive.bytes.data() + base_block_bytes + old, size);
+             memcpy(d.hive.bytes.data() + base_block_bytes + copy, d.hive.bytes.data() + base_block_bytes + old, size);
              d.hive.set_cell_size(copy, -static_cast<int32_t>(size));
              d.result.affected.push_back("Alpha|Same");
              return copy;
          }},
         {"misaligned", false,
-         [](Damage& d, const Reference& reference) {
-             return testkit::get32(d.hive.bytes, reference.field(d)) + 4;
-         }},
-        {"at_its_own_record", false,
-         [](Damage& d, const Reference& reference) { return reference.holder(d); }},
+         [](Damage& d, const Reference& reference) { return testkit::get32(d.hive.bytes, reference.field(d)) + 4; }},
+        {"at_its_own_record", false, [](Damage& d, const Reference& reference) { return reference.holder(d); }},
         {"at_a_record_of_another_kind", true,
          [](Damage& d, const Reference& reference) {
              return reference.name == "security" ? d.at("Zeta").record : d.hive.security[1];
@@ -159,8 +153,8 @@ void add_references_of_a_leaf(List& list) {
             // A list of subkeys is not looked at where there are none, and a list of values that is not there
             // has none.
             const bool class_of_a_key = reference.name == "moon_class" && name == "at_another_key";
-            const bool no_values = reference.name == "moon_value_list" &&
-                                   (name == "at_a_free_cell" || name == "far_past_the_end");
+            const bool no_values =
+                reference.name == "moon_value_list" && (name == "at_a_free_cell" || name == "far_past_the_end");
             const bool unseen = reference.name == "moon_index_of_no_subkeys" || no_values ||
                                 (reference.name == "moon_class" && !class_of_a_key);
             list.add(reference.name + "_" + name, unseen ? Readable::whole : Readable::partly,
@@ -196,8 +190,7 @@ void add_shared_cells(List& list) {
              },
              {"Alpha|", "Gamma|"});
     list.add("one_index_for_two_keys", Readable::partly, {"Gamma\\"},
-             [](Damage& d) { d.hive.put32(d.at("Gamma").record, 28, d.at("Alpha").index); },
-             {"Alpha\\", "Gamma\\"});
+             [](Damage& d) { d.hive.put32(d.at("Gamma").record, 28, d.at("Alpha").index); }, {"Alpha\\", "Gamma\\"});
     list.add("one_class_for_two_keys", Readable::partly, {"Zeta"}, [](Damage& d) {
         d.hive.put16(d.at("Zeta").record, 74, 10);
         d.hive.put32(d.at("Zeta").record, 48, d.at("Alpha").class_cell);
@@ -244,21 +237,20 @@ void add_free_space(List& list) {
         return layout;
     };
     list.add_on(full, "no_free_space_at_all", Readable::whole, {}, [](Damage&) {});
-    list.add("free_cell_that_takes_in_a_used_one", Readable::partly, {"Zeta", "Beta\\b5", "Beta\\b4"},
-             [](Damage& d) {
-                 d.result.unsettled = {"Beta\\", "Zeta"};
-                 // The key before Zeta's record, freed with all that lies between them.
-                 const uint32_t from = d.at("Beta\\b4").record;
-                 const uint32_t to = d.at("Beta\\b5").record;
-                 d.hive.set_cell_size(from, static_cast<int32_t>(to - from) - d.hive.cell_size(to));
-             });
+    list.add("free_cell_that_takes_in_a_used_one", Readable::partly, {"Zeta", "Beta\\b5", "Beta\\b4"}, [](Damage& d) {
+        d.result.unsettled = {"Beta\\", "Zeta"};
+        // The key before Zeta's record, freed with all that lies between them.
+        const uint32_t from = d.at("Beta\\b4").record;
+        const uint32_t to = d.at("Beta\\b5").record;
+        d.hive.set_cell_size(from, static_cast<int32_t>(to - from) - d.hive.cell_size(to));
+    });
     list.add("key_record_marked_free", Readable::partly, {"Alpha\\Third"}, [](Damage& d) {
         d.result.unsettled = {"Alpha\\"};
         d.hive.mark_free(d.at("Alpha\\Third").record);
     });
 }
 
-} // namespace
+}  // namespace
 
 void add_cells(List& list) {
     add_sizes(list);
@@ -268,4 +260,4 @@ void add_cells(List& list) {
     add_free_space(list);
 }
 
-} // namespace hostile
+}  // namespace hostile

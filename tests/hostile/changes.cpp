@@ -25,7 +25,7 @@ constexpr uint32_t data_type = 3;
 constexpr uint8_t data_seed = 77;
 const std::string new_name = "Made here";
 const std::string new_key_name = "New name";
-constexpr uint32_t base_head_bytes = 512; // what a change may write of the base block
+constexpr uint32_t base_head_bytes = 512;  // what a change may write of the base block
 constexpr uint32_t bin_header_bytes = 32;
 constexpr uint64_t most_writes = 400;
 
@@ -59,9 +59,8 @@ std::string upper_cased(std::string text) {
 }
 
 bool any_covers(const std::vector<std::string>& places, const std::string& other) {
-    return std::any_of(places.begin(), places.end(), [&](const std::string& place) {
-        return covers(upper_cased(place), upper_cased(other));
-    });
+    return std::any_of(places.begin(), places.end(),
+                       [&](const std::string& place) { return covers(upper_cased(place), upper_cased(other)); });
 }
 
 // ---- what is written where
@@ -99,7 +98,7 @@ private:
             return end <= base_head_bytes;
         const uint64_t bins_end = base_block_bytes + uint64_t{testkit::get32(shadow_, 40)};
         if (position >= bins_end || position >= shadow_.size())
-            return true; // where a bin is being appended, or a file that was cut short made longer
+            return true;  // where a bin is being appended, or a file that was cut short made longer
         uint64_t bin = base_block_bytes;
         while (bin + testkit::get32(shadow_, bin + 8) <= position)
             bin += testkit::get32(shadow_, bin + 8);
@@ -117,8 +116,7 @@ private:
     }
 
     void tell(const char* what, uint64_t position, uint64_t length) {
-        problems_ += std::string(what) + ": " + std::to_string(length) + " bytes at " +
-                     std::to_string(position) + "\n";
+        problems_ += std::string(what) + ": " + std::to_string(length) + " bytes at " + std::to_string(position) + "\n";
     }
 
     MemoryFile& file_;
@@ -228,8 +226,7 @@ std::string structure(const Bytes& before, const Bytes& after) {
     return text;
 }
 
-std::string judge(const Case& hive, const Snapshot& before, const Change& change, int32_t status,
-                  MemoryFile& file) {
+std::string judge(const Case& hive, const Snapshot& before, const Change& change, int32_t status, MemoryFile& file) {
     file.rewind();
     const RegistryIo io = file.io();
     RegistryKey* root = ROpenHive(&io);
@@ -253,13 +250,11 @@ std::string judge(const Case& hive, const Snapshot& before, const Change& change
     return text + structure(hive.bytes, file.bytes);
 }
 
-} // namespace
+}  // namespace
 
 std::string Change::text() const {
-    static const char* const kinds[] = {"create",         "set",          "delete value", "rename",
-                                        "rename damaged", "delete subkey"};
-    std::string all =
-        std::string(kinds[static_cast<size_t>(kind)]) + " \"" + name + "\" in \"" + place + "\"";
+    static const char* const kinds[] = {"create", "set", "delete value", "rename", "rename damaged", "delete subkey"};
+    std::string all = std::string(kinds[static_cast<size_t>(kind)]) + " \"" + name + "\" in \"" + place + "\"";
     if (kind == Kind::set_value)
         all += ", " + std::to_string(size) + " bytes";
     if (kind == Kind::rename_key || kind == Kind::rename_damaged_key)
@@ -270,7 +265,7 @@ std::string Change::text() const {
 testkit::WalkLimits judged_limits(size_t file_size) {
     testkit::WalkLimits limits = testkit::limits_for(file_size);
     limits.depth = judged_depth;
-    limits.keys *= 20; // a ring is walked a few times over before the depth ends it
+    limits.keys *= 20;  // a ring is walked a few times over before the depth ends it
     return limits;
 }
 
@@ -280,8 +275,7 @@ void add_values_of(const FoundKey& key, std::vector<Change>& all) {
     std::vector<std::string> names = {new_name};
     for (const std::string& value : key.values) {
         std::string narrow;
-        if (value != "?" && as_8bit(value, narrow) &&
-            std::find(names.begin(), names.end(), narrow) == names.end())
+        if (value != "?" && as_8bit(value, narrow) && std::find(names.begin(), names.end(), narrow) == names.end())
             names.push_back(narrow);
     }
     for (const std::string& name : names) {
@@ -315,11 +309,11 @@ void add_key_itself(const FoundKey& key, const FoundKey& parent, std::vector<Cha
                        {below(parent.place, testkit::utf8(testkit::widen(narrow)))}});
 }
 
-} // namespace
+}  // namespace
 
 std::vector<Change> changes_to(const Snapshot& snapshot) {
     std::vector<Change> all;
-    std::vector<const FoundKey*> parents; // of the key at hand, from the root down
+    std::vector<const FoundKey*> parents;  // of the key at hand, from the root down
     for (const FoundKey& key : snapshot.keys) {
         parents.resize(key.way.size());
         all.push_back({Kind::create_key, key.way, key.place, new_name, 0, 0, {below(key.place, new_name)}});
@@ -365,4 +359,4 @@ std::string try_change(const Case& hive, const Snapshot& before, const Change& c
     return text + judge(hive, before, change, status, file);
 }
 
-} // namespace hostile
+}  // namespace hostile

@@ -16,12 +16,12 @@ enum class Kind { create_key, set_value, delete_value, rename_key, rename_damage
 
 struct Change {
     Kind kind;
-    std::vector<uint32_t> way;      // to the key that the call is made on
-    std::string place;              // of that key
-    std::string name;               // 8-bit, as the call takes it
-    uint32_t position = 0;          // of the subkey, in a rename
-    uint32_t size = 0;              // of the data, in a set
-    std::vector<std::string> named; // the places that the call names
+    std::vector<uint32_t> way;       // to the key that the call is made on
+    std::string place;               // of that key
+    std::string name;                // 8-bit, as the call takes it
+    uint32_t position = 0;           // of the subkey, in a rename
+    uint32_t size = 0;               // of the data, in a set
+    std::vector<std::string> named;  // the places that the call names
 
     std::string text() const;
 };
@@ -37,4 +37,4 @@ std::vector<Change> changes_to(const testkit::Snapshot& snapshot);
 // what was written where nothing may be, a success that is none; empty when all is well.
 std::string try_change(const Case& hive, const testkit::Snapshot& before, const Change& change);
 
-} // namespace hostile
+}  // namespace hostile

@@ -24,8 +24,8 @@ struct Counts {
 
 Counts counts_of(RegistryKey* key) {
     Counts counts;
-    RQueryInfoKeyW(key, nullptr, nullptr, nullptr, nullptr, &counts.subkeys, nullptr, nullptr, &counts.values,
-                   nullptr, nullptr, nullptr, nullptr);
+    RQueryInfoKeyW(key, nullptr, nullptr, nullptr, nullptr, &counts.subkeys, nullptr, nullptr, &counts.values, nullptr,
+                   nullptr, nullptr, nullptr);
     return counts;
 }
 
@@ -44,7 +44,7 @@ struct Cut {
     const char* key;
     uint32_t subkeys;
     uint32_t values;
-    bool of_subkeys; // which of the two was cut, and cannot be changed
+    bool of_subkeys;  // which of the two was cut, and cannot be changed
 };
 
 class CountCut : public testing::TestWithParam<Cut> {};
@@ -60,8 +60,7 @@ TEST_P(CountCut, to_what_the_cells_hold_and_no_change_there) {
         EXPECT_EQ(counts_of(key.get()).values, cut.values);
         RegistryKey* none_there = nullptr;
         EXPECT_EQ(ROpenSubKey(key.get(), cut.subkeys, &none_there), R_NO_MORE_ITEMS);
-        EXPECT_EQ(REnumValueW(key.get(), cut.values, nullptr, nullptr, nullptr, nullptr, nullptr),
-                  R_NO_MORE_ITEMS);
+        EXPECT_EQ(REnumValueW(key.get(), cut.values, nullptr, nullptr, nullptr, nullptr, nullptr), R_NO_MORE_ITEMS);
     }
     if (cut.of_subkeys)
         EXPECT_EQ(scene.Create(std::string(cut.key) + "\\New"), R_INVALID_PARAMETER);
@@ -72,23 +71,22 @@ TEST_P(CountCut, to_what_the_cells_hold_and_no_change_there) {
 
 INSTANTIATE_TEST_SUITE_P(
     Rows, CountCut,
-    testing::Values(
-        Cut{"value_list_shorter_than_a_count_of_6", "Alpha", 3, 5, false},
-        Cut{"value_list_shorter_than_a_count_of_1073741823", "Alpha", 3, 5, false},
-        Cut{"value_list_shorter_than_a_count_of_4294967295", "Alpha", 3, 5, false},
-        Cut{"value_list_cut_by_its_cell", "Alpha", 3, 3, false},
-        Cut{"value_count_of_4294967295_without_a_list", "Zeta", 0, 0, false},
-        Cut{"value_count_of_1073741823_without_a_list", "Zeta", 0, 0, false},
-        Cut{"subkey_count_one_above_its_list", "Alpha", 3, 5, true},
-        Cut{"subkey_count_one_below_its_list", "Alpha", 2, 5, true},
-        Cut{"subkey_count_all_ones", "Alpha", 3, 5, true},
-        Cut{"subkey_count_all_ones_over_an_index_root", "Beta", 5, 0, true},
-        Cut{"subkey_count_of_1_without_a_list", "Zeta", 0, 0, true},
-        Cut{"subkey_count_of_4294967295_without_a_list", "Zeta", 0, 0, true},
-        Cut{"index_count_0", "Alpha", 0, 5, true}, Cut{"index_count_past_its_cell", "Alpha", 3, 5, true},
-        Cut{"index_count_of_65535", "Alpha", 3, 5, true}, Cut{"index_cut_by_its_cell", "Alpha", 1, 5, true},
-        Cut{"ri_points_to_itself", "Beta", 0, 0, true}, Cut{"ri_in_an_ri", "Beta", 2, 0, true},
-        Cut{"ri_points_to_a_key", "Beta", 2, 0, true}, Cut{"ri_has_no_entries", "Beta", 0, 0, true}),
+    testing::Values(Cut{"value_list_shorter_than_a_count_of_6", "Alpha", 3, 5, false},
+                    Cut{"value_list_shorter_than_a_count_of_1073741823", "Alpha", 3, 5, false},
+                    Cut{"value_list_shorter_than_a_count_of_4294967295", "Alpha", 3, 5, false},
+                    Cut{"value_list_cut_by_its_cell", "Alpha", 3, 3, false},
+                    Cut{"value_count_of_4294967295_without_a_list", "Zeta", 0, 0, false},
+                    Cut{"value_count_of_1073741823_without_a_list", "Zeta", 0, 0, false},
+                    Cut{"subkey_count_one_above_its_list", "Alpha", 3, 5, true},
+                    Cut{"subkey_count_one_below_its_list", "Alpha", 2, 5, true},
+                    Cut{"subkey_count_all_ones", "Alpha", 3, 5, true},
+                    Cut{"subkey_count_all_ones_over_an_index_root", "Beta", 5, 0, true},
+                    Cut{"subkey_count_of_1_without_a_list", "Zeta", 0, 0, true},
+                    Cut{"subkey_count_of_4294967295_without_a_list", "Zeta", 0, 0, true},
+                    Cut{"index_count_0", "Alpha", 0, 5, true}, Cut{"index_count_past_its_cell", "Alpha", 3, 5, true},
+                    Cut{"index_count_of_65535", "Alpha", 3, 5, true}, Cut{"index_cut_by_its_cell", "Alpha", 1, 5, true},
+                    Cut{"ri_points_to_itself", "Beta", 0, 0, true}, Cut{"ri_in_an_ri", "Beta", 2, 0, true},
+                    Cut{"ri_points_to_a_key", "Beta", 2, 0, true}, Cut{"ri_has_no_entries", "Beta", 0, 0, true}),
     [](const auto& row) { return row.param.name; });
 
 // ---- depth
@@ -123,8 +121,8 @@ TEST_P(Deep, goes_down_512_levels_and_no_further) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Chains, Deep,
-                         testing::Values("keys_512_deep", "keys_513_deep", "keys_10000_deep",
-                                         "keys_1000000_deep", "key_that_lists_itself"),
+                         testing::Values("keys_512_deep", "keys_513_deep", "keys_10000_deep", "keys_1000000_deep",
+                                         "key_that_lists_itself"),
                          [](const auto& row) { return row.param; });
 
 // ---- what is odd but legal
@@ -254,9 +252,9 @@ TEST(ValueNames, of_two_default_values_each_is_removed_in_turn) {
 // -----------------------------------------------------------------------------------------------------------
 
 TEST(KeyRecords, that_cannot_be_read_give_a_status_and_hide_no_sibling) {
-    for (const char* name : {"key_record_of_4_bytes", "key_record_of_68_bytes",
-                             "key_record_of_another_signature", "key_record_that_ends_before_its_name",
-                             "key_name_of_65535_bytes_in_a_short_cell", "key_record_marked_free"}) {
+    for (const char* name : {"key_record_of_4_bytes", "key_record_of_68_bytes", "key_record_of_another_signature",
+                             "key_record_that_ends_before_its_name", "key_name_of_65535_bytes_in_a_short_cell",
+                             "key_record_marked_free"}) {
         SCOPED_TRACE(name);
         Scene scene(case_of(name).bytes);
         Handle key = scene.OpenKey("Alpha");
@@ -273,15 +271,15 @@ TEST(KeyRecords, that_cannot_be_read_give_a_status_and_hide_no_sibling) {
 }
 
 TEST(KeyRecords, whose_class_is_not_there_have_none) {
-    for (const char* name : {"class_of_14_bytes_past_its_cell", "class_of_65535_bytes_past_its_cell",
-                             "class_minus_1", "class_at_a_free_cell", "class_length_without_offset"}) {
+    for (const char* name : {"class_of_14_bytes_past_its_cell", "class_of_65535_bytes_past_its_cell", "class_minus_1",
+                             "class_at_a_free_cell", "class_length_without_offset"}) {
         SCOPED_TRACE(name);
         Scene scene(case_of(name).bytes);
         Handle key = scene.OpenKey("class_length_without_offset" == std::string(name) ? "Zeta" : "Alpha");
         uint16_t text[10] = {1, 1, 1};
         uint32_t size = sizeof text;
-        EXPECT_EQ(RQueryInfoKeyW(key.get(), nullptr, nullptr, text, &size, nullptr, nullptr, nullptr, nullptr,
-                                 nullptr, nullptr, nullptr, nullptr),
+        EXPECT_EQ(RQueryInfoKeyW(key.get(), nullptr, nullptr, text, &size, nullptr, nullptr, nullptr, nullptr, nullptr,
+                                 nullptr, nullptr, nullptr),
                   R_SUCCESS);
         EXPECT_EQ(size, 0U);
     }
@@ -289,8 +287,8 @@ TEST(KeyRecords, whose_class_is_not_there_have_none) {
 
 TEST(KeyOrder, of_whatever_rule_every_key_is_found_and_a_new_one_is_found_again) {
     for (const char* kind : {"hash_leaf_", "fast_leaf_", "plain_leaf_"}) {
-        for (const char* order : {"unsorted", "descending", "sorted_lower_cased", "sorted_by_bytes",
-                                  "sorted_by_length", "sorted_with_bytes_above_7F_first"}) {
+        for (const char* order : {"unsorted", "descending", "sorted_lower_cased", "sorted_by_bytes", "sorted_by_length",
+                                  "sorted_with_bytes_above_7F_first"}) {
             SCOPED_TRACE(std::string(kind) + order);
             Scene scene(case_of(std::string(kind) + order).bytes);
             Handle key = scene.OpenKey("Alpha");
@@ -313,10 +311,10 @@ TEST(KeyOrder, of_whatever_rule_every_key_is_found_and_a_new_one_is_found_again)
 
 // The ring is left as it is where the record's neighbours do not agree with it.
 TEST(Security, record_in_a_broken_ring_is_counted_down_and_stays) {
-    for (const char* name : {"security_next_does_not_point_back", "security_previous_does_not_point_forward",
-                             "security_next_is_far_past_the_end", "security_previous_leads_to_a_key",
-                             "security_next_leads_to_a_free_cell", "security_ring_of_one",
-                             "security_ring_of_one_that_the_others_point_into"}) {
+    for (const char* name :
+         {"security_next_does_not_point_back", "security_previous_does_not_point_forward",
+          "security_next_is_far_past_the_end", "security_previous_leads_to_a_key", "security_next_leads_to_a_free_cell",
+          "security_ring_of_one", "security_ring_of_one_that_the_others_point_into"}) {
         SCOPED_TRACE(name);
         Scene scene(case_of(name).bytes);
         const LaidHive laid = lay_out(stage());
@@ -351,8 +349,8 @@ TEST(Security, that_is_none_refuses_a_new_key_and_asks_1003) {
         Scene scene(case_of(name).bytes);
         Handle key = scene.OpenKey("Gamma\\moon");
         uint32_t size = 0;
-        EXPECT_EQ(RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                                 nullptr, nullptr, nullptr, &size, nullptr),
+        EXPECT_EQ(RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                                 nullptr, nullptr, &size, nullptr),
                   R_CAN_NOT_COMPLETE);
         key.reset();
         EXPECT_EQ(scene.Create("Gamma\\moon\\New"), R_INVALID_PARAMETER);
@@ -360,6 +358,6 @@ TEST(Security, that_is_none_refuses_a_new_key_and_asks_1003) {
     }
 }
 
-} // namespace
+}  // namespace
 
-} // namespace hostile
+}  // namespace hostile

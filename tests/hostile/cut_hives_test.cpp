@@ -29,8 +29,7 @@ void exempt_what_was_cut_off(const Snapshot& before, Case& hive) {
         if (item.what.find("status ") == std::string::npos)
             continue;
         const size_t mark = item.place.rfind('?');
-        hive.unsettled.push_back(mark + 1 == item.place.size() && mark > 0 ? item.place.substr(0, mark)
-                                                                           : item.place);
+        hive.unsettled.push_back(mark + 1 == item.place.size() && mark > 0 ? item.place.substr(0, mark) : item.place);
     }
 }
 
@@ -72,9 +71,7 @@ void cut_everywhere(const std::string& name, const Bytes& whole) {
     EXPECT_GT(tally.cuts, 4000U);
 }
 
-TEST(CutShort, a_made_hive_with_free_space_at_its_end) {
-    cut_everywhere("made", lay_out(stage()).bytes);
-}
+TEST(CutShort, a_made_hive_with_free_space_at_its_end) { cut_everywhere("made", lay_out(stage()).bytes); }
 
 TEST(CutShort, a_made_hive_that_is_full) {
     HiveLayout layout = stage();
@@ -90,6 +87,6 @@ TEST(CutShort, real_hives) {
     }
 }
 
-} // namespace
+}  // namespace
 
-} // namespace hostile
+}  // namespace hostile

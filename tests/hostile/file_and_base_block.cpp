@@ -40,8 +40,8 @@ HiveLayout three_bins() {
 }
 
 void add_sizes(List& list) {
-    for (const uint32_t size : {0U, 1U, 100U, 4000U, 4100U, 8200U, 0x7FFFF000U, 0x80000000U, 0x80001000U,
-                                0xFFFFF000U, 0xFFFFFFFFU}) {
+    for (const uint32_t size :
+         {0U, 1U, 100U, 4000U, 4100U, 8200U, 0x7FFFF000U, 0x80000000U, 0x80001000U, 0xFFFFF000U, 0xFFFFFFFFU}) {
         list.add("bins_size_" + std::to_string(size), Readable::no, {""}, [size](Damage& d) {
             d.hive.put_base(40, size);
             d.hive.fix_checksum();
@@ -55,8 +55,8 @@ void add_sizes(List& list) {
         d.hive.put_base(40, testkit::get32(d.hive.bytes, 40) - 4096);
         d.hive.fix_checksum();
     });
-    list.add_on(three_bins, "bins_size_smaller_than_the_bins_present", Readable::partly,
-                {"Wide|", "Zone", "Wide"}, [](Damage& d) {
+    list.add_on(three_bins, "bins_size_smaller_than_the_bins_present", Readable::partly, {"Wide|", "Zone", "Wide"},
+                [](Damage& d) {
                     // The list of the root's subkeys, laid last, moves to the first bin.
                     const uint32_t list_cell = d.at("").index;
                     d.result.unsettled = d.result.affected;
@@ -116,11 +116,10 @@ void add_roots(List& list) {
 // Bytes behind the last bin. What looks like a bin there is none.
 void add_bytes_behind(List& list) {
     for (const size_t count : {1U, 511U, 512U, 4095U, 4096U, 9000U}) {
-        list.add("bytes_behind_the_last_bin_" + std::to_string(count), Readable::whole, {},
-                 [count](Damage& d) {
-                     const Bytes more = pattern(count);
-                     d.hive.bytes.insert(d.hive.bytes.end(), more.begin(), more.end());
-                 });
+        list.add("bytes_behind_the_last_bin_" + std::to_string(count), Readable::whole, {}, [count](Damage& d) {
+            const Bytes more = pattern(count);
+            d.hive.bytes.insert(d.hive.bytes.end(), more.begin(), more.end());
+        });
     }
     list.add("a_whole_bin_behind_the_last_one", Readable::whole, {}, [](Damage& d) {
         const uint32_t end = testkit::get32(d.hive.bytes, 40);
@@ -130,7 +129,7 @@ void add_bytes_behind(List& list) {
     });
 }
 
-} // namespace
+}  // namespace
 
 void add_file_and_base_block(List& list) {
     list.add_bytes("empty_file", Readable::no, [] { return Bytes(); });
@@ -138,8 +137,7 @@ void add_file_and_base_block(List& list) {
         list.add_bytes("file_of_" + std::to_string(count) + "_bytes", Readable::no,
                        [count] { return first_bytes(count); });
     list.add_bytes("base_block_and_no_bin", Readable::no, [] { return first_bytes(4096); });
-    list.add_bytes("base_block_and_part_of_a_bin_header", Readable::no,
-                   [] { return first_bytes(4096 + 31); });
+    list.add_bytes("base_block_and_part_of_a_bin_header", Readable::no, [] { return first_bytes(4096 + 31); });
     list.add_bytes("base_block_that_says_that_there_is_no_bin", Readable::no, [] {
         Bytes bytes = first_bytes(4096);
         testkit::set32(bytes, 40, 0);
@@ -166,4 +164,4 @@ void add_file_and_base_block(List& list) {
     add_bytes_behind(list);
 }
 
-} // namespace hostile
+}  // namespace hostile

@@ -26,8 +26,7 @@ using testkit::Snapshot;
 
 // What reading a file may take beside what its size justifies.
 constexpr uint64_t spare_bytes = 1U << 20U;
-constexpr uint64_t passes =
-    640; // three walks; a record is 80 bytes, a window that may be loaded for it 16 KiB
+constexpr uint64_t passes = 640;  // three walks; a record is 80 bytes, a window that may be loaded for it 16 KiB
 constexpr double most_seconds = 60;
 
 double cpu_seconds() {
@@ -53,9 +52,8 @@ std::vector<Item> readable_items(const Snapshot& snapshot, const std::vector<std
     std::vector<Item> kept;
     for (const Item& item : snapshot.items) {
         const bool marker = item.place.size() > 1 && item.place.back() == '?';
-        const bool left_out = std::any_of(without.begin(), without.end(), [&](const auto& place) {
-            return testkit::covers(place, item.place);
-        });
+        const bool left_out = std::any_of(without.begin(), without.end(),
+                                          [&](const auto& place) { return testkit::covers(place, item.place); });
         if (!marker && !left_out)
             kept.push_back(item);
     }
@@ -134,14 +132,13 @@ class Changing : public Hives {};
 // one.
 TEST_P(Changing, harms_nothing_that_is_not_named) {
     if (entry().readable == Readable::no)
-        return; // what does not open is not changed: Reading sees to that
+        return;  // what does not open is not changed: Reading sees to that
     constexpr size_t sampled = 8;
     const Case hive = entry().make();
     const Snapshot before = snapshot_of(hive.bytes, judged_limits(hive.bytes.size()));
     const std::vector<Change> all = changes_to(before);
     ASSERT_FALSE(all.empty());
-    const bool sample =
-        entry().large && std::getenv("TALLOWFEN_HOSTILE_ALL") == nullptr && all.size() > sampled;
+    const bool sample = entry().large && std::getenv("TALLOWFEN_HOSTILE_ALL") == nullptr && all.size() > sampled;
     const size_t stride = sample ? all.size() / sampled : 1;
     size_t tried = 0;
     for (size_t i = 0; i < all.size(); i += stride) {
@@ -149,8 +146,7 @@ TEST_P(Changing, harms_nothing_that_is_not_named) {
         tried++;
     }
     if (tried < all.size())
-        std::printf("[ LEFT OUT ] %zu of %zu changes of %s\n", all.size() - tried, all.size(),
-                    entry().name.c_str());
+        std::printf("[ LEFT OUT ] %zu of %zu changes of %s\n", all.size() - tried, all.size(), entry().name.c_str());
 }
 
 std::string name_of(const testing::TestParamInfo<size_t>& info) {
@@ -185,6 +181,6 @@ TEST(Judge, sees_what_a_change_must_not_do) {
     EXPECT_NE(try_change(hive, before, change), "");
 }
 
-} // namespace
+}  // namespace
 
-} // namespace hostile
+}  // namespace hostile

@@ -20,11 +20,10 @@ constexpr uint32_t class_length_field = 74;
 void add_records(List& list) {
     const List::Places third{"Alpha\\Third"};
     for (const uint32_t room : {4U, 12U, 44U, 68U}) {
-        list.add("key_record_of_" + std::to_string(room) + "_bytes", Readable::partly, third,
-                 [room](Damage& d) {
-                     d.keep_record("Alpha\\Third");
-                     d.cut_cell(d.at("Alpha\\Third").record, room + 4);
-                 });
+        list.add("key_record_of_" + std::to_string(room) + "_bytes", Readable::partly, third, [room](Damage& d) {
+            d.keep_record("Alpha\\Third");
+            d.cut_cell(d.at("Alpha\\Third").record, room + 4);
+        });
     }
     list.add("key_record_that_ends_before_its_name", Readable::partly, third, [](Damage& d) {
         d.keep_record("Alpha\\Third");
@@ -34,8 +33,7 @@ void add_records(List& list) {
         d.keep_record("Alpha\\Third");
         d.hive.put16(d.at("Alpha\\Third").record, 0, 0x6B6D);
     });
-    for (const uint16_t length :
-         {uint16_t{9}, uint16_t{256}, uint16_t{4096}, uint16_t{32768}, uint16_t{65535}}) {
+    for (const uint16_t length : {uint16_t{9}, uint16_t{256}, uint16_t{4096}, uint16_t{32768}, uint16_t{65535}}) {
         list.add("key_name_of_" + std::to_string(length) + "_bytes_in_a_short_cell", Readable::partly, third,
                  [length](Damage& d) {
                      d.keep_record("Alpha\\Third");
@@ -49,11 +47,10 @@ void add_records(List& list) {
     list.add("key_that_is_a_link", Readable::whole, {},
              [](Damage& d) { d.hive.put16(d.at("Alpha\\Third").record, flags_field, 0x30); });
     for (const uint32_t count : {1U, 0x7FFFFFFFU, none}) {
-        list.add("key_with_" + std::to_string(count) + "_volatile_subkeys", Readable::whole, {},
-                 [count](Damage& d) {
-                     d.hive.put32(d.at("Alpha").record, volatile_count_field, count);
-                     d.hive.put32(d.at("Alpha").record, 32, count);
-                 });
+        list.add("key_with_" + std::to_string(count) + "_volatile_subkeys", Readable::whole, {}, [count](Damage& d) {
+            d.hive.put32(d.at("Alpha").record, volatile_count_field, count);
+            d.hive.put32(d.at("Alpha").record, 32, count);
+        });
     }
 }
 
@@ -97,16 +94,13 @@ void add_names(List& list) {
     with("of_bytes_above_7F", u"\u00C4", false);
     with("in_utf16_that_8_bits_could_carry", u"middle", true);
     with("in_utf16_beyond_8_bits", u"\u0416\u4E2D", true);
-    list.add_on(named(u"mmm", true), "key_name_of_odd_length_in_utf16", Readable::partly,
-                {"Alpha\\mmm", "Alpha\\mm"},
+    list.add_on(named(u"mmm", true), "key_name_of_odd_length_in_utf16", Readable::partly, {"Alpha\\mmm", "Alpha\\mm"},
                 [](Damage& d) { d.hive.put16(d.at("Alpha\\mmm").record, name_length_field, 5); });
-    list.add_on(named(u"mmm", true), "key_name_of_one_byte_in_utf16", Readable::partly,
-                {"Alpha\\mmm", "Alpha\\"},
+    list.add_on(named(u"mmm", true), "key_name_of_one_byte_in_utf16", Readable::partly, {"Alpha\\mmm", "Alpha\\"},
                 [](Damage& d) { d.hive.put16(d.at("Alpha\\mmm").record, name_length_field, 1); });
     list.add_on(named(u"zz", false), "two_keys_of_one_name", Readable::whole, {}, [](Damage&) {},
                 {"Alpha\\zz", "Alpha\\ZZ"});
-    list.add_on(named(u"ZZ", false), "two_keys_of_one_name_in_another_case", Readable::whole, {},
-                [](Damage&) {});
+    list.add_on(named(u"ZZ", false), "two_keys_of_one_name_in_another_case", Readable::whole, {}, [](Damage&) {});
     list.add_on(named(u"zz", true), "two_keys_of_one_name_one_in_utf16", Readable::whole, {}, [](Damage&) {},
                 {"Alpha\\zz"});
 }
@@ -117,13 +111,12 @@ void add_counts(List& list) {
             d.keep(d.at("Alpha").index);
             d.hive.put32(d.at("Alpha").record, count_field, count);
         });
-        list.add("subkey_count_" + name + "_over_an_index_root", Readable::partly, {"Beta\\"},
-                 [count](Damage& d) {
-                     d.keep(d.at("Beta").index);
-                     for (const uint32_t leaf : d.at("Beta").leaves)
-                         d.keep(leaf);
-                     d.hive.put32(d.at("Beta").record, count_field, count);
-                 });
+        list.add("subkey_count_" + name + "_over_an_index_root", Readable::partly, {"Beta\\"}, [count](Damage& d) {
+            d.keep(d.at("Beta").index);
+            for (const uint32_t leaf : d.at("Beta").leaves)
+                d.keep(leaf);
+            d.hive.put32(d.at("Beta").record, count_field, count);
+        });
     };
     counted("one_below_its_list", 2);
     for (const auto& [name, count] : std::vector<std::pair<std::string, uint32_t>>{
@@ -132,11 +125,10 @@ void add_counts(List& list) {
             d.keep(d.at("Alpha").index);
             d.hive.put32(d.at("Alpha").record, count_field, count);
         });
-        list.add("subkey_count_" + name + "_over_an_index_root", Readable::whole, {},
-                 [count = count](Damage& d) {
-                     d.keep(d.at("Beta").index);
-                     d.hive.put32(d.at("Beta").record, count_field, count == none ? none : count + 2);
-                 });
+        list.add("subkey_count_" + name + "_over_an_index_root", Readable::whole, {}, [count = count](Damage& d) {
+            d.keep(d.at("Beta").index);
+            d.hive.put32(d.at("Beta").record, count_field, count == none ? none : count + 2);
+        });
     }
     // A key that says it has none is empty, whatever list it still names.
     list.add("subkey_count_0_with_a_list", Readable::partly, {"Alpha\\"},
@@ -170,8 +162,7 @@ void add_parents(List& list) {
     const auto ring = [&](const std::string& name, const std::string& key, const std::string& top,
                           uint32_t entry_position) {
         list.add("key_that_lists_" + name, Readable::partly, {top},
-                 [=](Damage& d) { d.hive.put32(d.at(key).index, 4 + 8 * entry_position, d.at(top).record); },
-                 {top});
+                 [=](Damage& d) { d.hive.put32(d.at(key).index, 4 + 8 * entry_position, d.at(top).record); }, {top});
     };
     ring("itself", "Alpha", "Alpha", 0);
     ring("its_parent", "Alpha\\Inner", "Alpha", 0);
@@ -258,7 +249,7 @@ Bytes chain(uint32_t depth) {
     return base.bytes;
 }
 
-} // namespace
+}  // namespace
 
 void add_keys(List& list) {
     add_records(list);
@@ -275,4 +266,4 @@ void add_depths(List& list) {
             [depth] { return chain(depth); }, true);
 }
 
-} // namespace hostile
+}  // namespace hostile

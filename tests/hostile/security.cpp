@@ -11,7 +11,7 @@ constexpr uint32_t previous_field = 8;
 constexpr uint32_t count_field = 12;
 constexpr uint32_t length_field = 16;
 
-} // namespace
+}  // namespace
 
 // Gamma\moon has the third record to itself: deleting it takes the record out of its ring.
 void add_security(List& list) {
@@ -42,19 +42,15 @@ void add_security(List& list) {
     list.add("security_descriptor_of_0_bytes", Readable::partly, moons,
              [](Damage& d) { d.hive.put32(d.hive.security[2], length_field, 0); });
 
-    const auto in_record = [&](const std::string& name,
-                               const std::function<void(Damage&, uint32_t)>& damage) {
-        list.add("security_" + name, Readable::whole, {},
-                 [damage](Damage& d) { damage(d, d.hive.security[2]); });
+    const auto in_record = [&](const std::string& name, const std::function<void(Damage&, uint32_t)>& damage) {
+        list.add("security_" + name, Readable::whole, {}, [damage](Damage& d) { damage(d, d.hive.security[2]); });
     };
-    in_record("next_does_not_point_back", [](Damage& d, uint32_t) {
-        d.hive.put32(d.hive.security[0], previous_field, d.hive.security[1]);
-    });
+    in_record("next_does_not_point_back",
+              [](Damage& d, uint32_t) { d.hive.put32(d.hive.security[0], previous_field, d.hive.security[1]); });
     in_record("previous_does_not_point_forward",
               [](Damage& d, uint32_t) { d.hive.put32(d.hive.security[1], next_field, d.hive.security[0]); });
     in_record("next_leads_nowhere", [](Damage& d, uint32_t own) { d.hive.put32(own, next_field, none); });
-    in_record("next_is_far_past_the_end",
-              [](Damage& d, uint32_t own) { d.hive.put32(own, next_field, 0x7FFFFFF8); });
+    in_record("next_is_far_past_the_end", [](Damage& d, uint32_t own) { d.hive.put32(own, next_field, 0x7FFFFFF8); });
     in_record("previous_leads_to_a_key",
               [](Damage& d, uint32_t own) { d.hive.put32(own, previous_field, d.at("Zeta").record); });
     in_record("next_leads_to_a_free_cell",
@@ -77,4 +73,4 @@ void add_security(List& list) {
              [](Damage& d) { d.hive.put32(d.hive.security[0], count_field, 1); }, {"", "Alpha\\Third"});
 }
 
-} // namespace hostile
+}  // namespace hostile

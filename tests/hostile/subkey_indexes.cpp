@@ -44,8 +44,8 @@ void add_counts(List& list) {
 }
 
 void add_signatures(List& list) {
-    for (const auto& [name, signature] : std::vector<std::pair<std::string, uint16_t>>{
-             {"zz", 0x7A7A}, {"zeros", 0}, {"lg", 0x676C}, {"LF", 0x464C}}) {
+    for (const auto& [name, signature] :
+         std::vector<std::pair<std::string, uint16_t>>{{"zz", 0x7A7A}, {"zeros", 0}, {"lg", 0x676C}, {"LF", 0x464C}}) {
         list.add("index_of_unknown_signature_" + name, Readable::partly, {"Alpha\\"},
                  [signature = signature](Damage& d) {
                      d.keep(d.at("Alpha").index);
@@ -96,12 +96,11 @@ void add_orders(List& list) {
         list.add_on(ordered(names, Leaf::fast), "fast_leaf_" + name, Readable::whole, {}, [](Damage&) {});
         list.add_on(ordered(names, Leaf::plain), "plain_leaf_" + name, Readable::whole, {}, [](Damage&) {});
     }
-    list.add_on(ordered({"a", "b", "c"}, Leaf::fast), "fast_leaf_with_wrong_hints", Readable::whole, {},
-                [](Damage& d) {
-                    d.hive.put32(d.at("Alpha").index, 8, 0x7A7A7A7A);
-                    d.hive.put32(d.at("Alpha").index, 16, 0);
-                    d.hive.put32(d.at("Alpha").index, 24, none);
-                });
+    list.add_on(ordered({"a", "b", "c"}, Leaf::fast), "fast_leaf_with_wrong_hints", Readable::whole, {}, [](Damage& d) {
+        d.hive.put32(d.at("Alpha").index, 8, 0x7A7A7A7A);
+        d.hive.put32(d.at("Alpha").index, 16, 0);
+        d.hive.put32(d.at("Alpha").index, 24, none);
+    });
     list.add_on(ordered({"a", "b", "c"}, Leaf::hash), "hash_leaf_with_wrong_hashes", Readable::whole, {},
                 [](Damage& d) {
                     d.hive.put32(d.at("Alpha").index, 8, 0x12345678);
@@ -191,7 +190,7 @@ std::function<HiveLayout()> long_leaf(int count) {
     };
 }
 
-} // namespace
+}  // namespace
 
 void add_subkey_indexes(List& list) {
     add_counts(list);
@@ -212,4 +211,4 @@ void add_subkey_indexes(List& list) {
     });
 }
 
-} // namespace hostile
+}  // namespace hostile

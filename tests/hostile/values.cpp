@@ -113,8 +113,7 @@ void add_names(List& list) {
     with("in_utf16_that_8_bits_could_carry", u"wide", true);
     with("in_utf16_whose_bytes_begin_like_another", u"T", true);
     // Its bytes are those of "Text" and a zero.
-    with("in_utf16_whose_bytes_are_those_of_another", std::u16string({char16_t{0x6554}, char16_t{0x7478}}),
-         true);
+    with("in_utf16_whose_bytes_are_those_of_another", std::u16string({char16_t{0x6554}, char16_t{0x7478}}), true);
     with("in_utf16_that_is_anothers", u"Text", true, {"Alpha|Text"});
     with("in_utf16_with_half_a_pair", std::u16string({u'm', char16_t{0xD800}}), true);
     with("with_a_zero_byte", std::u16string(u"Te\0xt", 5), false);
@@ -127,8 +126,8 @@ void add_names(List& list) {
     with("empty_for_the_second_time", u"", false, {"Alpha|"});
     with("empty_in_utf16", u"", true, {"Alpha|"});
     with("of_1000_characters", std::u16string(1000, u'n'), false);
-    list.add_on(with_value(named(u"wide", true)), "value_name_of_odd_length_in_utf16", Readable::partly,
-                {"Alpha|"}, [](Damage& d) { d.hive.put16(d.at("Alpha").values[5].record, 2, 7); });
+    list.add_on(with_value(named(u"wide", true)), "value_name_of_odd_length_in_utf16", Readable::partly, {"Alpha|"},
+                [](Damage& d) { d.hive.put16(d.at("Alpha").values[5].record, 2, 7); });
 }
 
 void add_sizes(List& list) {
@@ -189,7 +188,7 @@ void add_types(List& list) {
         typed("value_of_type_" + std::to_string(type), type, pattern(9));
 }
 
-} // namespace
+}  // namespace
 
 void add_values(List& list) {
     add_lists(list);
@@ -199,4 +198,4 @@ void add_values(List& list) {
     add_types(list);
 }
 
-} // namespace hostile
+}  // namespace hostile

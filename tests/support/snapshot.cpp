@@ -10,10 +10,10 @@ namespace testkit {
 
 namespace {
 
-constexpr size_t smallest_key = 80;     // record and size word
-constexpr size_t smallest_value = 4;    // its entry in a list
-constexpr uint32_t name_units = 0x8000; // more than a record can say
-constexpr uint32_t deepest = 600;       // more than the engine goes
+constexpr size_t smallest_key = 80;      // record and size word
+constexpr size_t smallest_value = 4;     // its entry in a list
+constexpr uint32_t name_units = 0x8000;  // more than a record can say
+constexpr uint32_t deepest = 600;        // more than the engine goes
 
 std::string text_of(const std::vector<uint16_t>& units, uint32_t bytes) {
     return utf8(std::u16string(units.begin(), units.begin() + bytes / 2));
@@ -21,8 +21,7 @@ std::string text_of(const std::vector<uint16_t>& units, uint32_t bytes) {
 
 class Walk {
 public:
-    explicit Walk(const WalkLimits& limits)
-        : left_(limits), name_(2 * name_units), other_name_(2 * name_units) {}
+    explicit Walk(const WalkLimits& limits) : left_(limits), name_(2 * name_units), other_name_(2 * name_units) {}
 
     void key(RegistryKey* handle, const std::string& place, std::vector<uint32_t>& way) {
         if (left_.keys == 0) {
@@ -80,8 +79,8 @@ private:
     }
     std::string own_name(RegistryKey* handle) {
         uint32_t size = 4 * name_units;
-        const int32_t status = RQueryInfoKeyW(handle, name_.data(), &size, nullptr, nullptr, nullptr, nullptr,
-                                              nullptr, nullptr, nullptr, nullptr, nullptr, nullptr);
+        const int32_t status = RQueryInfoKeyW(handle, name_.data(), &size, nullptr, nullptr, nullptr, nullptr, nullptr,
+                                              nullptr, nullptr, nullptr, nullptr, nullptr);
         return status == R_SUCCESS ? text_of(name_, size) : "status " + std::to_string(status);
     }
 
@@ -89,13 +88,13 @@ private:
         uint32_t class_size = 2 * name_units;
         RegistryTime time = {};
         std::string text;
-        if (RQueryInfoKeyW(handle, nullptr, nullptr, name_.data(), &class_size, &subkeys, nullptr, nullptr,
-                           &values, nullptr, nullptr, nullptr, &time) == R_SUCCESS)
+        if (RQueryInfoKeyW(handle, nullptr, nullptr, name_.data(), &class_size, &subkeys, nullptr, nullptr, &values,
+                           nullptr, nullptr, nullptr, &time) == R_SUCCESS)
             text = "class " + text_of(name_, class_size) + " time " + std::to_string(time.high) + ":" +
                    std::to_string(time.low);
         uint32_t security = 0;
-        const int32_t status = RQueryInfoKeyW(handle, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                                              nullptr, nullptr, nullptr, nullptr, &security, nullptr);
+        const int32_t status = RQueryInfoKeyW(handle, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                                              nullptr, nullptr, nullptr, &security, nullptr);
         return text + " security " +
                (status == R_SUCCESS ? std::to_string(security) : "status " + std::to_string(status));
     }
@@ -147,12 +146,12 @@ public:
         uint32_t size = sizeof name - 1;
         uint32_t class_size = sizeof name - 1;
         char class_name[600];
-        RQueryInfoKeyA(handle, name, &size, class_name, &class_size, nullptr, nullptr, nullptr, nullptr,
-                       nullptr, nullptr, nullptr, nullptr);
+        RQueryInfoKeyA(handle, name, &size, class_name, &class_size, nullptr, nullptr, nullptr, nullptr, nullptr,
+                       nullptr, nullptr, nullptr);
         uint32_t subkeys = 0;
         uint32_t values = 0;
-        RQueryInfoKeyA(handle, nullptr, nullptr, nullptr, nullptr, &subkeys, nullptr, nullptr, &values,
-                       nullptr, nullptr, nullptr, nullptr);
+        RQueryInfoKeyA(handle, nullptr, nullptr, nullptr, nullptr, &subkeys, nullptr, nullptr, &values, nullptr,
+                       nullptr, nullptr, nullptr);
         for (uint32_t i = 0; i < values && left_.values > 0; i++)
             value(handle, i);
         for (uint32_t i = 0; i < subkeys && left_.keys > 0 && depth < left_.depth; i++)
@@ -206,7 +205,7 @@ private:
     Bytes data_;
 };
 
-} // namespace
+}  // namespace
 
 WalkLimits limits_for(size_t file_size) {
     return {file_size / smallest_key + 1, file_size / smallest_value + 1, 4 * uint64_t{file_size}, deepest};
@@ -219,9 +218,7 @@ Snapshot take_snapshot(RegistryKey* root, const WalkLimits& limits) {
     return walk.finish();
 }
 
-void ask_everything(RegistryKey* root, const WalkLimits& limits) {
-    Questions(limits).key(root, 0);
-}
+void ask_everything(RegistryKey* root, const WalkLimits& limits) { Questions(limits).key(root, 0); }
 
 bool covers(const std::string& place, const std::string& other) {
     if (place.empty())
@@ -234,4 +231,4 @@ bool covers(const std::string& place, const std::string& other) {
     return ends || other[place.size()] == '|' || other[place.size()] == '\\';
 }
 
-} // namespace testkit
+}  // namespace testkit

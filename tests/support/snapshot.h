@@ -15,7 +15,7 @@ namespace testkit {
 // opened or read stands at "PATH\?" or "PATH|?". Places may occur more than once.
 struct Item {
     std::string place;
-    std::string what; // class, time and security for a key; type and data, or why there are none, for a value
+    std::string what;  // class, time and security for a key; type and data, or why there are none, for a value
 
     auto operator<=>(const Item&) const = default;
 };
@@ -24,15 +24,15 @@ struct Item {
 struct FoundKey {
     std::string place;
     std::vector<uint32_t> way;
-    std::vector<std::string> values; // their names, in the order of the list; "?" for one that cannot be read
-    std::vector<uint32_t> damaged;   // positions of the subkeys that cannot be opened
+    std::vector<std::string> values;  // their names, in the order of the list; "?" for one that cannot be read
+    std::vector<uint32_t> damaged;    // positions of the subkeys that cannot be opened
 };
 
 struct Snapshot {
-    std::vector<Item> items;    // sorted
-    std::vector<FoundKey> keys; // in the order of the walk
-    size_t unreadable = 0;      // how many items could not be read
-    bool complete = true;       // false: a limit ended the walk
+    std::vector<Item> items;     // sorted
+    std::vector<FoundKey> keys;  // in the order of the walk
+    size_t unreadable = 0;       // how many items could not be read
+    bool complete = true;        // false: a limit ended the walk
 };
 
 // What ends a walk over lists that lead round in a ring.
@@ -56,4 +56,4 @@ void ask_everything(RegistryKey* root, const WalkLimits& limits);
 // alone).
 bool covers(const std::string& place, const std::string& other);
 
-} // namespace testkit
+}  // namespace testkit
