@@ -36,6 +36,8 @@ struct Case {
     std::vector<std::string> shared;
     // Places that lead to where the file has nothing yet: what a change puts there may show in them.
     std::vector<std::string> unsettled;
+    // The file ends too early: what is behind its end may be read once a change has made it longer.
+    bool cut_short = false;
     // The damaged structures, which no change may write to.
     std::vector<Range> untouchable;
 };

@@ -172,12 +172,14 @@ std::vector<Item> others(const Snapshot& snapshot, const std::vector<std::string
     return kept;
 }
 
-std::string differences(const std::vector<Item>& before, const std::vector<Item>& after) {
+std::string differences(const std::vector<Item>& before, const std::vector<Item>& after, bool new_ones_count) {
     std::string text;
     std::vector<Item> only;
     std::set_difference(before.begin(), before.end(), after.begin(), after.end(), std::back_inserter(only));
     for (const Item& item : only)
         text += "gone or changed: " + item.place + " (" + item.what.substr(0, 60) + ")\n";
+    if (!new_ones_count)
+        return text;
     only.clear();
     std::set_difference(after.begin(), after.end(), before.begin(), before.end(), std::back_inserter(only));
     for (const Item& item : only)
@@ -243,7 +245,7 @@ std::string judge(const Case& hive, const Snapshot& before, const Change& change
         exempt.insert(exempt.end(), change.named.begin(), change.named.end());
     if (shares)
         exempt.insert(exempt.end(), hive.shared.begin(), hive.shared.end());
-    text += differences(others(before, exempt), others(after, exempt));
+    text += differences(others(before, exempt), others(after, exempt), !hive.cut_short);
     const bool settled = !shares && !any_covers(hive.unsettled, change.named.front());
     if (status == R_SUCCESS && settled)
         text += effect(change, before, after);

@@ -37,6 +37,7 @@ void exempt_what_was_cut_off(const Snapshot& before, Case& hive) {
 void survive(const Bytes& whole, size_t length, Tally& tally) {
     Case hive;
     hive.bytes = Bytes(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(length));
+    hive.cut_short = true;
     tally.cuts++;
     MemoryFile file(hive.bytes);
     const RegistryIo io = file.io();

@@ -75,10 +75,17 @@ private slots:
         QCOMPARE(failure(QStringLiteral("/dev/null")), QStringLiteral("Cannot open file"));
     }
 
-    void a_read_only_file_cannot_be_opened() {
+    void a_file_without_permission_cannot_be_opened_data() {
+        QTest::addColumn<int>("permissions");
+        QTest::newRow("read-only") << static_cast<int>(QFile::ReadOwner | QFile::ReadOther);
+        QTest::newRow("write-only") << static_cast<int>(QFile::WriteOwner | QFile::WriteOther);
+        QTest::newRow("none") << 0;
+    }
+    void a_file_without_permission_cannot_be_opened() {
+        QFETCH(int, permissions);
         const HiveOnDisk hive(many_keys(1));
         QFile::setPermissions(QFileInfo(hive.path()).path(), QFile::Permissions(0x7755));
-        QFile::setPermissions(hive.path(), QFile::ReadOwner | QFile::ReadOther);
+        QFile::setPermissions(hive.path(), QFile::Permissions(permissions));
         // Nothing is forbidden to root, so the test goes on as nobody.
         constexpr uid_t nobody = 65534;
         const uid_t user = geteuid();
@@ -117,6 +124,19 @@ private slots:
         QCOMPARE(failure(hive.path()), QStringLiteral("Cannot open file"));
         other.close();
         QCOMPARE(failure(hive.path()), QString());
+    }
+
+    void a_file_that_is_cut_off_while_it_is_open_throws_and_refuses() {
+        const HiveOnDisk file(many_keys(40));
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        auto* parent = static_cast<RegKey*>(hive.root_key()->child(0));
+        QVERIFY(QFile::resize(file.path(), 4096));
+        hive.clear_handle_cache();
+        QVERIFY_EXCEPTION_THROWN(parent->name(), std::runtime_error);
+        QVERIFY_EXCEPTION_THROWN(parent->new_key(), std::runtime_error);
+        QVERIFY_EXCEPTION_THROWN(parent->set_dword_value(QStringLiteral("v"), 1, 1234), std::runtime_error);
+        QCOMPARE(QFileInfo(file.path()).size(), qint64{4096});
     }
 
     void opening_and_closing_changes_no_byte() {

@@ -1,0 +1,220 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// Every hive of the catalogue through the models, as a window uses them: the tree opened, every value read, a search
+// for what is not there brought to its end, changes tried next to the damage. What cannot be opened throws, as the
+// models do, and can be named; the rest goes on being readable.
+#include "catalogue.h"
+#include "hive_on_disk.h"
+#include "snapshot.h"
+
+#include "failure_report.h"
+#include "reg_key.h"
+#include "reg_model.h"
+#include "values_model.h"
+#include "values_proxy_model.h"
+
+#include <QTest>
+
+#include <algorithm>
+
+namespace {
+
+using hostile::Case;
+using hostile::Entry;
+using hostile::Readable;
+using testkit::Item;
+
+constexpr int deepest = 7;      // rows of the tree, the group and the mount included
+constexpr int most_keys = 400;  // in a hive that leads round in a ring
+
+// The hive in a file of its own, mounted.
+struct Mounted {
+    explicit Mounted(const testkit::Bytes& bytes) : file(bytes) {
+        model.add_hive(QStringLiteral("TOP/HIVE"), file.path());
+    }
+
+    HiveOnDisk file;
+    RegModel model;
+    int thrown = 0;   // by a model
+    int unnamed = 0;  // of these, at keys for which there was no name
+
+    // Runs what a view or an editor would, and counts what comes out of it.
+    template <typename Call>
+    void meet(const QModelIndex& key, const Call& call) {
+        try {
+            call();
+        } catch (const std::exception&) {
+            thrown++;
+            unnamed += key_path_of(key).isEmpty() ? 1 : 0;
+        }
+    }
+};
+
+void read_values(Mounted& mounted, const QModelIndex& index) {
+    mounted.meet(index, [&] {
+        RegKey* const key = RegModel::editable_key(index);
+        if (key == nullptr)
+            return;
+        ValuesModel values(key);
+        ValuesProxyModel sorted;
+        sorted.setSourceModel(&values);
+        sorted.sort(0);
+        for (int row = 0; row < sorted.rowCount(); row++) {
+            for (int column = 0; column < sorted.columnCount(); column++)
+                mounted.meet(index, [&] { sorted.index(row, column).data(Qt::DisplayRole); });
+        }
+    });
+}
+
+// All keys that the tree shows, each with its name and its values asked for.
+std::vector<QPersistentModelIndex> read_tree(Mounted& mounted) {
+    std::vector<QPersistentModelIndex> found;
+    std::vector<std::pair<QModelIndex, int>> stack{{QModelIndex(), 0}};
+    while (!stack.empty() && found.size() < most_keys) {
+        const auto [parent, depth] = stack.back();
+        stack.pop_back();
+        for (int row = 0; row < mounted.model.rowCount(parent) && found.size() < most_keys; row++) {
+            QModelIndex child;
+            mounted.meet(parent, [&] { child = mounted.model.index(row, 0, parent); });
+            if (!child.isValid())
+                continue;
+            found.emplace_back(child);
+            mounted.meet(child, [&] { mounted.model.data(child, Qt::DisplayRole); });
+            mounted.meet(child, [&] { mounted.model.flags(child); });
+            read_values(mounted, child);
+            if (depth < deepest)
+                stack.emplace_back(child, depth + 1);
+        }
+    }
+    return found;
+}
+
+// The search ends, whatever it meets; true when it found nothing.
+bool search_in_vain(Mounted& mounted) {
+    const QModelIndex top = mounted.model.index(0, 0);
+    mounted.model.begin_find(top);
+    const RegModel::FindMode mode(RegModel::FindKeys | RegModel::FindValues);
+    const qint64 most = mounted.file.bytes().size() + 100;
+    for (qint64 i = 0; i < most; i++) {
+        try {
+            return !mounted.model.find(QStringLiteral("no such name"), mode, Qt::MatchContains).key.isValid();
+        } catch (const std::exception&) {
+            mounted.thrown++;  // the search goes on behind the key that it stood at
+        }
+    }
+    return false;
+}
+
+void change_values(Mounted& mounted, const QModelIndex& index) {
+    RegKey* const key = RegModel::editable_key(index);
+    if (key == nullptr)
+        return;
+    ValuesModel values(key);
+    mounted.meet(index, [&] { values.add_value(REG_DWORD); });
+    int rows = 0;
+    mounted.meet(index, [&] { rows = std::min(values.rowCount(), 8); });
+    for (int row = rows - 1; row >= 0; row--) {
+        mounted.meet(index, [&] { values.setData(values.index(row, 2), QStringLiteral("7"), Qt::EditRole); });
+        mounted.meet(
+            index, [&] { values.setData(values.index(row, 0), QStringLiteral("Renamed %1").arg(row), Qt::EditRole); });
+        mounted.meet(index, [&] { values.removeRows(row, 1); });
+    }
+}
+
+void change_key(Mounted& mounted, const QModelIndex& index) {
+    change_values(mounted, index);
+    mounted.meet(index, [&] { mounted.model.new_key(index); });
+    mounted.meet(index, [&] { mounted.model.setData(index, QStringLiteral("Renamed"), Qt::EditRole); });
+    mounted.meet(index, [&] { mounted.model.removeRows(index.row(), 1, index.parent()); });
+}
+
+// What the engine reads of a file's bytes, but for some places.
+std::vector<Item> items_of(const testkit::Bytes& bytes, const std::vector<std::string>& without) {
+    testkit::MemoryFile file(bytes);
+    file.read_only = true;
+    const RegistryIo io = file.io();
+    RegistryKey* root = ROpenHive(&io);
+    if (root == nullptr)
+        return {};
+    testkit::WalkLimits limits = testkit::limits_for(bytes.size());
+    limits.depth = 3;
+    testkit::Snapshot snapshot = take_snapshot(root, limits);
+    RCloseKey(root);
+    std::erase_if(snapshot.items, [&](const Item& item) {
+        return std::any_of(without.begin(), without.end(),
+                           [&](const std::string& place) { return testkit::covers(place, item.place); });
+    });
+    return snapshot.items;
+}
+
+}  // namespace
+
+class HostileModelsTest : public QObject {
+    Q_OBJECT
+
+private slots:
+    void every_hive_data() {
+        QTest::addColumn<int>("number");
+        int left_out = 0;
+        const std::vector<Entry>& all = hostile::catalogue();
+        for (size_t i = 0; i < all.size(); i++) {
+            if (all[i].large)
+                left_out++;
+            else
+                QTest::newRow(all[i].name.c_str()) << static_cast<int>(i);
+        }
+        std::printf("[ LEFT OUT ] %d large hives of %zu\n", left_out, all.size());
+    }
+
+    void every_hive() {
+        QFETCH(int, number);
+        const Entry& entry = hostile::catalogue()[static_cast<size_t>(number)];
+        const Case hive = entry.make();
+        if (entry.readable == Readable::no) {
+            QVERIFY_EXCEPTION_THROWN(Mounted{hive.bytes}, std::runtime_error);
+            return;
+        }
+        Mounted mounted(hive.bytes);
+        const std::vector<QPersistentModelIndex> keys = read_tree(mounted);
+        QVERIFY(keys.size() > 2);
+        QVERIFY(search_in_vain(mounted));
+        QVERIFY(mounted.file.bytes() == hive.bytes);
+        if (entry.readable == Readable::whole)
+            QCOMPARE(mounted.thrown, 0);
+
+        // Deepest first, so that what is deleted takes none of the others along. Gamma is left alone.
+        const QModelIndex mount = mounted.model.index(0, 0, mounted.model.index(0, 0));
+        for (auto key = keys.rbegin(); key != keys.rend(); ++key) {
+            QModelIndex top = *key;
+            while (top.isValid() && top.parent() != mount)
+                top = top.parent();
+            QString name;
+            mounted.meet(top, [&] { name = top.data().toString(); });
+            if (key->isValid() && top.isValid() && name != QStringLiteral("Gamma"))
+                change_key(mounted, *key);
+        }
+        QCOMPARE(mounted.unnamed, 0);
+        compare_untouched(hive, mounted);
+        Mounted again(mounted.file.bytes());
+        QVERIFY(!read_tree(again).empty());
+    }
+
+private:
+    // Keys under which nothing was changed read as before, unless the damage is there.
+    static void compare_untouched(const Case& hive, const Mounted& mounted) {
+        std::vector<std::string> changed{"Alpha", "Beta", "Zeta", "=", "?", "\\?", "|?"};
+        changed.insert(changed.end(), hive.unsettled.begin(), hive.unsettled.end());
+        changed.insert(changed.end(), hive.shared.begin(), hive.shared.end());
+        const std::vector<Item> before = items_of(hive.bytes, changed);
+        const std::vector<Item> after = items_of(mounted.file.bytes(), changed);
+        for (const Item& item : before) {
+            if (!std::binary_search(after.begin(), after.end(), item))
+                QFAIL(("not as it was: " + item.place).c_str());
+        }
+        QCOMPARE(after.size(), before.size());
+    }
+};
+
+QTEST_MAIN(HostileModelsTest)
+#include "models_test.moc"
