@@ -45,6 +45,13 @@ CellOffset place_key(Store& store, const KeyRecord& record, const Name& name) {
     return CellOffset::none;
 }
 
+// Whether the list is another key's, which its first subkey says.
+bool is_anothers(Store& store, const KeyView& parent, const SubkeyIndex& index) {
+    KeyView first;
+    return index.total > 0 && read_key(store, subkey_at(store, index, 0), first) &&
+           has_other_parent(store, parent.offset(), first);
+}
+
 Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& index, const Name& name,
                      bool new_reference, CellOffset& key) {
     if (!index.whole || index.total != parent.record.subkey_count)
@@ -57,8 +64,8 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
         return Inserted::exists;
     }
     // Where a sibling cannot be read, the name may be there already.
-    if (lookup == Lookup::unreadable || name.length == 0 || name.length > longest_key_name ||
-        !place_for_name(store, index, name, position) || !can_grow(index, position))
+    if (lookup == Lookup::unreadable || is_anothers(store, parent, index) || name.length == 0 ||
+        name.length > longest_key_name || !place_for_name(store, index, name, position) || !can_grow(index, position))
         return Inserted::failed;
 
     const CellOffset security = cell_offset(parent.record.security);

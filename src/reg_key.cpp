@@ -230,6 +230,21 @@ int RegKey::find_child_position(RegistryKey* handle, const QByteArray& name) {
     return position >= 0 ? position : result;
 }
 
+// Whether the subkey at an index is the one that the slot's object shows. Where a damaged hive lists a key below
+// itself, two objects stand for one key, and what is made through the one moves what the other shows.
+bool RegKey::is_shown_at(RegistryKey* handle, int index) const {
+    if (index < 0 || static_cast<size_t>(index) >= children_.size())
+        return false;
+    const auto* shown = static_cast<const RegKey*>(children_[static_cast<size_t>(index)]);
+    RegistryKey* listed = nullptr;
+    if (shown == nullptr || shown->offset_ == UINT32_MAX ||
+        ROpenSubKey(handle, static_cast<uint32_t>(index), &listed) != R_SUCCESS)
+        return true;  // nothing was shown, or nothing can be harmed
+    const bool same = RKeyOffset(listed) == shown->offset_;
+    RCloseKey(listed);
+    return same;
+}
+
 int RegKey::new_key() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
@@ -253,6 +268,8 @@ int RegKey::new_key() {
         RDeleteKey(handle, name);
         return position;
     }
+    if (static_cast<size_t>(position) > children_.size())
+        children_.resize(static_cast<size_t>(position), nullptr);  // made through another object, see is_shown_at
     children_.insert(children_.begin() + position, nullptr);
     // The key is there, so it gets its row, even where it cannot be opened.
     shown_child(position);
@@ -265,7 +282,7 @@ bool RegKey::delete_key(int index) {
     NameBuffer name = {};
     uint32_t size = name_room;
     // Only the key at this position is meant: a name that leads to another one deletes nothing.
-    if (index < 0 || !slots_agree(handle) ||
+    if (!is_shown_at(handle, index) || !slots_agree(handle) ||
         REnumKeyExA(handle, static_cast<uint32_t>(index), name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
         position_by_path(handle, name.data()) != index || RDeleteKey(handle, name.data()) != R_SUCCESS)
         return false;
@@ -290,7 +307,8 @@ int RegKey::rename_key(int index, const QString& new_name) {
     // The key gets another record and the list another order: handles from before are of no use.
     hive_->clear_handle_cache();
     RegistryKey* handle = hive_->key_handle(this);
-    if (!slots_agree(handle) || RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
+    if (!slots_agree(handle) || !is_shown_at(handle, index) ||
+        RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
         return -1;
     const int position = find_child_position(handle, name.bytes);
     if (position < 0)

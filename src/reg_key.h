@@ -125,6 +125,7 @@ private:
     std::recursive_mutex* children_lock() const override;
     void refresh_children(RegistryKey* handle);
     // Whether there is a slot for each subkey that the engine counts, so that its positions are those of the slots.
+    bool is_shown_at(RegistryKey* handle, int index) const;
     bool slots_agree(RegistryKey* handle) const;
     int find_child_position(RegistryKey* handle, const QByteArray& name);
     bool store_value(const QString& name, uint type, const QByteArray& data, int index);

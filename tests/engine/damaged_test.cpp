@@ -136,6 +136,16 @@ TEST(Damaged, a_rename_leaves_the_parent_of_what_the_key_merely_lists) {
     EXPECT_EQ(get32(scene.bytes(), LaidHive::position(hive.at("Alpha\\Other").record, 16)), hive.at("Alpha").record);
 }
 
+TEST(Damaged, no_key_is_made_in_a_list_that_is_another_ones) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("Gamma").record, 20, 2);
+    hive.put32(hive.at("Gamma").record, 28, hive.at("Alpha").index);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Create("Gamma\\New"), R_INVALID_PARAMETER);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(scene.Create("Alpha\\New"), 0);
+}
+
 TEST(Damaged, data_that_leads_to_a_key_is_moved_and_the_key_stays) {
     for (const size_t size : {5U, 40U, 76U}) {
         LaidHive hive = lay_out(tree());

@@ -126,19 +126,6 @@ private slots:
         QCOMPARE(failure(hive.path()), QString());
     }
 
-    void a_file_that_is_cut_off_while_it_is_open_throws_and_refuses() {
-        const HiveOnDisk file(many_keys(40));
-        DummyRegKey top(QStringLiteral("TOP"));
-        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
-        auto* parent = static_cast<RegKey*>(hive.root_key()->child(0));
-        QVERIFY(QFile::resize(file.path(), 4096));
-        hive.clear_handle_cache();
-        QVERIFY_EXCEPTION_THROWN(parent->name(), std::runtime_error);
-        QVERIFY_EXCEPTION_THROWN(parent->new_key(), std::runtime_error);
-        QVERIFY_EXCEPTION_THROWN(parent->set_dword_value(QStringLiteral("v"), 1, 1234), std::runtime_error);
-        QCOMPARE(QFileInfo(file.path()).size(), qint64{4096});
-    }
-
     void opening_and_closing_changes_no_byte() {
         const HiveOnDisk hive(many_keys(3));
         const testkit::Bytes before = hive.bytes();

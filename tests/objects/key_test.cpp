@@ -66,6 +66,31 @@ class KeyTest : public QObject {
     Q_OBJECT
 
 private slots:
+    // Two objects then stand for one key: what is made through the one moves what the other shows.
+    void a_key_that_lists_itself_changes_no_other_subkey_than_the_one_it_shows() {
+        testkit::LaidHive laid = testkit::lay_out(layout());
+        laid.put32(laid.at("Parent").index, 4 + 8 * 4, laid.at("Parent").record); // for the last of the five
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        AbstractRegKey* const root = hive.root_key();
+        auto* outer = static_cast<RegKey*>(root->child(1));
+        QCOMPARE(outer->name(), QStringLiteral("Parent"));
+        QCOMPARE(Opened::names(outer).size(), 5);
+        auto* inner = static_cast<RegKey*>(outer->child(4));
+        QCOMPARE(inner->name(), QStringLiteral("Parent"));
+        for (int i = 0; i < 3; i++)
+            QVERIFY(inner->new_key() >= 0);
+        // The outer one still shows five, and the rows behind the new ones are others by now.
+        QCOMPARE(outer->child_count(), 5);
+        QVERIFY(!outer->delete_key(3));
+        QCOMPARE(outer->rename_key(3, QStringLiteral("new name")), -1);
+        outer->new_key();
+        const testkit::Hive read = file.read();
+        for (const char* name : {"Parent\\alpha", "Parent\\Beta", "Parent\\gamma", "Parent\\Zulu"})
+            QVERIFY2(read.find(name) != nullptr, name);
+    }
+
     void a_dummy_key_has_its_label_no_parent_and_the_children_it_was_given() {
         DummyRegKey top(QStringLiteral("TOP"));
         DummyRegKey other(QStringLiteral("other"));
