@@ -29,14 +29,17 @@ void FailureReport::report(const QString& key_path, const std::exception& failur
     if (m_told.contains(cause)) {
         return;
     }
-    m_told.insert(cause);
-    const QString line = key_path.isEmpty() ? tr("The registry cannot be read: %1").arg(reason)
-                                            : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
-    m_pending.append(line);
+    m_pending.append(told_elsewhere(key_path, reason));
     if (!m_scheduled) {
         m_scheduled = true;
         QMetaObject::invokeMethod(this, &FailureReport::show_pending, Qt::QueuedConnection);
     }
+}
+
+QString FailureReport::told_elsewhere(const QString& key_path, const QString& reason) {
+    m_told.insert({key_path, reason});
+    return key_path.isEmpty() ? tr("The registry cannot be read: %1").arg(reason)
+                              : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
 }
 
 void FailureReport::report_at_current(const std::exception& failure) {
@@ -58,13 +61,15 @@ void FailureReport::show_pending() {
             lines.append(tr("More keys cannot be read: %1").arg(m_pending.size() - max_lines));
         }
         m_pending.clear();
-        QMessageBox box(QMessageBox::Critical, QCoreApplication::applicationName(), lines.join(QLatin1Char('\n')),
-                        QMessageBox::Ok, QApplication::activeWindow());
-        // A key's name may look like markup.
-        box.setTextFormat(Qt::PlainText);
-        box.exec();
+        tell_failure(QApplication::activeWindow(), lines.join(QLatin1Char('\n')));
     }
     m_scheduled = false;
+}
+
+void tell_failure(QWidget* parent, const QString& text) {
+    QMessageBox box(QMessageBox::Critical, QCoreApplication::applicationName(), text, QMessageBox::Ok, parent);
+    box.setTextFormat(Qt::PlainText);
+    box.exec();
 }
 
 QString key_path_of(const QModelIndex& index) {

@@ -29,6 +29,9 @@ public:
     // same reason, which is then what surfaced again.
     void report_at_current(const std::exception& failure);
 
+    // The line for a key that the caller tells about itself, in a box of its own; it is not told here again.
+    QString told_elsewhere(const QString& key_path, const QString& reason);
+
     // The key that the user's last gesture was about.
     void set_current_key(const QString& key_path) { m_current_key = key_path; }
 
@@ -41,6 +44,9 @@ private:
     QStringList m_pending;
     bool m_scheduled = false;
 };
+
+// A critical box with the application's name that shows the text letter by letter: a key's name may look like markup.
+void tell_failure(QWidget* parent, const QString& text);
 
 // The names from the outermost key down to `index`, joined with backslashes. For a name that cannot be read
 // stands the key's place among its siblings, as in "TOP\HIVE\#3": this never throws.

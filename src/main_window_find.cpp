@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 // The window's search: one walk of the key model on a worker thread behind a modal dialog.
 
+#include "failure_report.h"
 #include "find_dialog.h"
 #include "keys_view.h"
 #include "main_window.h"
@@ -98,8 +99,9 @@ void MainWindow::show_find_result() {
     }
     if (!failure.isEmpty()) {
         // "Find next" goes on behind the key that threw.
-        QMessageBox::critical(this, QCoreApplication::applicationName(),
-                              tr("The search could not go on: %1").arg(failure), QMessageBox::Ok);
+        const QString key_path = key_model ? key_path_of(key_model->searched_key()) : QString();
+        const QString line = FailureReport::instance().told_elsewhere(key_path, failure);
+        tell_failure(this, tr("The search could not go on: %1").arg(line));
         return;
     }
     const RegModel::FindResult hit = find_watcher.future().result();

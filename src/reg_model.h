@@ -63,6 +63,8 @@ public:
     void stop_find();
     // Walks on to the next hit. From a worker thread, while nothing changes the tree.
     FindResult find(const QVariant& term, RegModel::FindMode mode, Qt::MatchFlags flags);
+    // The key that the search looked at last: where it threw, the one that it threw for. While no find runs.
+    QModelIndex searched_key();
 
 private:
     // A place of the search still to be visited: a key (value -1), or one row of a key's shown values.
@@ -86,6 +88,7 @@ private:
     std::vector<std::unique_ptr<AbstractRegKey>> top_level_;
     std::vector<std::unique_ptr<RegHive>> hives_;
     std::vector<Frame> search_;  // the last one is visited next
+    QModelIndex searched_;       // set by find; the tree may have changed since
     QMutex mutex_;               // guards stop_ alone
     bool stop_ = false;
     // How many keys of each hive the search may still visit. A damaged hive can list a key more often than the file

@@ -120,6 +120,7 @@ RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mod
     while (!search_.empty()) {
         const Frame frame = search_.back();
         search_.pop_back();
+        searched_ = frame.key;
         if (frame.value < 0) {
             push_key_frames(frame, mode);
             if (mode.testFlag(FindKeys) && matches(data(frame.key, Qt::DisplayRole).toString(), text, kind))
@@ -139,6 +140,11 @@ RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mod
         }
     }
     return {};
+}
+
+QModelIndex RegModel::searched_key() {
+    const HandOver hand_over(&mutex_);
+    return searched_;
 }
 
 // The stack must never lead to a key that is gone.

@@ -363,14 +363,16 @@ void SearchTest::a_key_that_throws_is_told_and_passed() {
     stage.window.show_find_dialog();
     QVERIFY(hand.is_done());
     QCOMPARE(hand.icon, QMessageBox::Critical);
-    QCOMPARE(hand.text, QStringLiteral("The search could not go on: ROpenSubKey failed"));
+    QCOMPARE(hand.text, QStringLiteral("The search could not go on: The key \"MACHINE\\SYSTEM\\Alpha\\#1\" cannot be "
+                                       "read: ROpenSubKey failed"));
+    QCOMPARE(hand.format, Qt::PlainText);
     QCOMPARE(QApplication::activeModalWidget(), nullptr);
-    // The tree that a hit opens shows the damaged key too, which is told in its turn.
-    hand.then_press(QMessageBox::Ok);
+    // The tree that a hit opens shows the damaged key too, which is not told again.
     stage.window.find_next();
-    QTRY_VERIFY(hand.is_done());
-    const QModelIndex current = stage.keys->currentIndex();
-    QCOMPARE(current.data(Qt::DisplayRole).toString(), QStringLiteral("Zeta"));
+    QTRY_COMPARE(stage.keys->currentIndex().data(Qt::DisplayRole).toString(), QStringLiteral("Zeta"));
+    stage.keys->viewport()->repaint();
+    QCoreApplication::processEvents();
+    QCOMPARE(QApplication::activeModalWidget(), nullptr);
 }
 
 void SearchTest::cancelled_and_started_again_fifty_times() {
