@@ -139,7 +139,7 @@ bool append_bin(Store& store, uint32_t size) {
     if (size > highest_end - 2 * bin_alignment)
         return false;
     const uint32_t bin_size = (size + bin_header_size + cell_head_size + bin_alignment - 1) & ~(bin_alignment - 1);
-    const Bin bin = {static_cast<uint32_t>(store.bins_size), bin_size, bin_size - bin_header_size, false};
+    const Bin bin = {static_cast<uint32_t>(store.bins_size), bin_size, bin_size - bin_header_size, false, true};
     const int64_t end = int64_t{base_block_size} + bin.offset + bin.size;
     // Room in the tables comes first: a bin that counts in the file but not in the table could be laid over.
     if (end > highest_end || !reserve_bin(store, append_growth) ||

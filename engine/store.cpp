@@ -176,7 +176,7 @@ bool build_bin_table(Store& store) {
     int64_t offset = 0;
     while (offset < bins_size) {
         Bin bin = {};
-        const int64_t end = scan_bin(store, static_cast<uint32_t>(offset), bin);
+        const int64_t end = scan_bin(store, static_cast<uint32_t>(offset), bin, false);
         if (end < 0 || end > bins_size || !reserve_bin(store, open_growth))
             return false;
         store.bins[store.bin_count++] = bin;
@@ -239,6 +239,12 @@ uint32_t write_at(Store& store, uint32_t signature, int64_t position, const void
             return 0;
         length = proper;  // a terminator behind the name is not stored
     }
+    // The bin's cells as they are now: a write that breaks one must not hide the others.
+    Bin* const bin = position < base_block_size
+                         ? nullptr
+                         : bin_of(store, cell_offset(static_cast<uint32_t>(position - base_block_size)));
+    if (bin != nullptr && !bin->mapped)
+        map_bin(store, *bin);
     ReadWindow& window = store.window;
     if (window.valid && position + length >= window.start && position <= window.start + window_size)
         window.valid = false;
@@ -269,7 +275,7 @@ Outcome rewrite_at(Store& store, int64_t position, const void* now, const void* 
     return Outcome::unchanged;
 }
 
-int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin) {
+int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin, bool map) {
     BinHeader header;
     const int64_t start = int64_t{base_block_size} + bin_offset;
     if (read_at(store, sig_bin, start, &header, sizeof header) != sizeof header || header.offset != bin_offset)
@@ -277,13 +283,13 @@ int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin) {
     const uint32_t size = header.size;
     if (size == 0 || size % bin_alignment != 0 || size > highest_end - start)
         return -1;
-    bin = {bin_offset, size, 0, false};
+    bin = {bin_offset, size, 0, false, map};
     uint32_t walked = bin_header_size;
     while (walked < size) {
         int32_t cell;
         uint32_t absolute;
         if (!read_size(store, start + walked, cell) || !is_cell_size(cell, size - walked, absolute) ||
-            !mark_cell(store, bin_offset + walked, absolute))
+            (map && !mark_cell(store, bin_offset + walked, absolute)))
             return -1;
         if (cell > 0 && absolute > bin.largest_free)
             bin.largest_free = absolute;
@@ -292,10 +298,15 @@ int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin) {
     return int64_t{bin_offset} + walked;
 }
 
+void map_bin(Store& store, Bin& bin) {
+    Bin walked = {};
+    bin.mapped = scan_bin(store, bin.offset, walked, true) >= 0;
+}
+
 void refresh_bin(Store& store, Bin& bin) {
     store.unread_bins -= bin.unread ? 1 : 0;
     Bin fresh = {};
-    bin.unread = scan_bin(store, bin.offset, fresh) < 0;
+    bin.unread = scan_bin(store, bin.offset, fresh, bin.mapped) < 0;
     bin.largest_free = bin.unread ? 0 : fresh.largest_free;
     store.unread_bins += bin.unread ? 1 : 0;
 }
@@ -366,9 +377,13 @@ int32_t cell_length(Store& store, CellOffset offset) {
 }
 
 bool find_cell(Store& store, CellOffset offset, Cell& cell) {
-    const Bin* bin = bin_of(store, offset);
+    Bin* bin = bin_of(store, offset);
     const uint32_t place = raw(offset);
-    if (bin == nullptr || place % cell_alignment != 0 || !is_marked(store, place))
+    if (bin == nullptr || place % cell_alignment != 0)
+        return false;
+    if (!bin->mapped)
+        map_bin(store, *bin);
+    if (!is_marked(store, place))
         return false;
     const uint32_t room = bin->size - (place - bin->offset);
     int32_t size;

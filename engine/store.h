@@ -23,6 +23,7 @@ struct Bin {
     uint32_t size;          // bytes, header included
     uint32_t largest_free;  // size of the largest free cell, 0 when there is none
     bool unread;            // it could not be walked when that was to be found out; 0 is written there meanwhile
+    bool mapped;            // its cells are in the cell map
 };
 
 struct ReadWindow {
@@ -47,7 +48,8 @@ struct Store {
     int32_t open_handles;
     ReadWindow window;
     // One bit for every 8 bytes of the bins, set where the walk over a bin came by a cell. What lies elsewhere is no
-    // cell, however it looks: it is part of one, and goes with it.
+    // cell, however it looks: it is part of one, and goes with it. A bin's share is filled when the bin is first asked
+    // for a cell or written to, and follows every write from then on.
     uint8_t* cell_map;
     uint32_t cell_map_size;  // bytes
 
@@ -110,9 +112,9 @@ bool read_part(Store& store, const Cell& cell, uint32_t skip, void* buffer, uint
 
 // Finds the bin that holds an offset (not its header); null when none does.
 Bin* bin_of(Store& store, CellOffset offset);
-// Reads the bin's header and walks its cells; fills bin and the bin's share of the cell map; returns the end of the
-// walk, counted from the first bin, or -1, what the walk did not reach then being as it was in the map.
-int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin);
+// Reads the bin's header and walks its cells; fills bin, and with map the bin's share of the cell map; returns the end
+// of the walk, counted from the first bin, or -1, what the walk did not reach then being as it was in the map.
+int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin, bool map);
 // Reads one size word: false when it cannot be read. The walk over a bin's cells steps with it, so the common case, a
 // word inside the window, is kept short.
 inline bool read_size(Store& store, int64_t position, int32_t& size) {
@@ -133,6 +135,8 @@ inline bool is_cell_size(int32_t size, uint32_t room, uint32_t& absolute) {
     return absolute != 0 && absolute % cell_alignment == 0 && absolute <= room;
 }
 
+// Fills the bin's share of the cell map. Where the walk stops short, the next call tries again.
+void map_bin(Store& store, Bin& bin);
 // Finds out a bin's largest free cell. A bin that cannot be walked offers nothing to the allocator.
 void refresh_bin(Store& store, Bin& bin);
 // The same for the bins that could not be walked the last time.
