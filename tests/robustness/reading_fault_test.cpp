@@ -9,6 +9,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 namespace {
 
 using namespace testkit;
@@ -80,26 +82,27 @@ void enumerate_keys(RegistryKey* key, Transcript& out) {
 
 void enumerate_values(RegistryKey* key, Transcript& out) {
     std::vector<char> data(70000);
+    const auto room = static_cast<uint32_t>(data.size()); // a call may hand back the size of what did not fit
     for (uint32_t i = 0; i < 4; i++) {
         char name[600] = {};
         uint16_t wide_name[600] = {};
         uint32_t name_size = sizeof name;
         uint32_t wide_size = sizeof wide_name;
         uint32_t type = 0;
-        auto size = static_cast<uint32_t>(data.size());
+        uint32_t size = room;
         int32_t status = REnumValueA(key, i, name, &name_size, &type, data.data(), &size);
-        out.add("REnumValueA", status, taken(name, name_size) + taken(data.data(), size));
-        size = static_cast<uint32_t>(data.size());
+        out.add("REnumValueA", status, taken(name, name_size) + taken(data.data(), std::min(size, room)));
+        size = room;
         status = REnumValueW(key, i, wide_name, &wide_size, &type, data.data(), &size);
-        out.add("REnumValueW", status, taken(wide_name, wide_size) + taken(data.data(), size));
+        out.add("REnumValueW", status, taken(wide_name, wide_size) + taken(data.data(), std::min(size, room)));
         const int32_t position = RFindValueA(key, name);
         out.add("RFindValueA", position < 0 ? -1 : 0, std::to_string(position));
-        size = static_cast<uint32_t>(data.size());
+        size = room;
         status = RQueryValueExA(key, name, &type, data.data(), &size);
-        out.add("RQueryValueExA", status, taken(data.data(), size));
-        size = static_cast<uint32_t>(data.size());
+        out.add("RQueryValueExA", status, taken(data.data(), std::min(size, room)));
+        size = room;
         status = RQueryValueExW(key, name, &type, data.data(), &size);
-        out.add("RQueryValueExW", status, taken(data.data(), size));
+        out.add("RQueryValueExW", status, taken(data.data(), std::min(size, room)));
     }
 }
 
