@@ -58,10 +58,12 @@ Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
 }
 
 bool Application::notify(QObject* receiver, QEvent* event) {
+    // Asked first: afterwards the receiver may be gone.
+    const bool is_gesture = receiver->isWidgetType() || event->type() == QEvent::Shortcut;
     try {
         return QApplication::notify(receiver, event);
     } catch (const std::exception& failure) {
-        FailureReport::instance().report_at_current(failure);
+        FailureReport::instance().report_at_current(failure, is_gesture);
         return true;
     }
 }

@@ -29,6 +29,13 @@ void FailureReport::report(const QString& key_path, const std::exception& failur
     if (m_told.contains(cause)) {
         return;
     }
+    // Rows that come into sight while the user scrolls would each bring a box. So many of one key's subkeys, damaged in
+    // one way, are named; the others say so themselves.
+    int& told = m_told_below[{key_path.left(key_path.lastIndexOf(QLatin1Char('\\'))), reason}];
+    if (told >= max_lines && m_pending.isEmpty()) {
+        return;
+    }
+    ++told;
     m_pending.append(told_elsewhere(key_path, reason));
     if (!m_scheduled) {
         m_scheduled = true;
@@ -42,11 +49,11 @@ QString FailureReport::told_elsewhere(const QString& key_path, const QString& re
                               : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
 }
 
-void FailureReport::report_at_current(const std::exception& failure) {
+void FailureReport::report_at_current(const std::exception& failure, bool from_gesture) {
     const QString reason = QString::fromLocal8Bit(failure.what());
     const QString below = m_current_key + QLatin1Char('\\');
     for (const auto& [key_path, told_reason] : std::as_const(m_told)) {
-        if (told_reason == reason && key_path.startsWith(below)) {
+        if (told_reason == reason && (!from_gesture || key_path.startsWith(below))) {
             return;
         }
     }

@@ -4,6 +4,7 @@
 
 // Tells the user what a damaged key did while the window runs: in one box, once per cause, never from inside a paint.
 
+#include <QHash>
 #include <QModelIndex>
 #include <QObject>
 #include <QPair>
@@ -26,8 +27,9 @@ public:
     void report(const QString& key_path, const std::exception& failure);
 
     // The same where nothing says which key it was: the current one is named, unless one below it was told with the
-    // same reason, which is then what surfaced again.
-    void report_at_current(const std::exception& failure);
+    // same reason, which is then what surfaced again. What did not come from a gesture, as when a screen reader asks
+    // for a row's name, need not have to do with the current key: there any key that was told with the reason counts.
+    void report_at_current(const std::exception& failure, bool from_gesture = true);
 
     // The line for a key that the caller tells about itself, in a box of its own; it is not told here again.
     QString told_elsewhere(const QString& key_path, const QString& reason);
@@ -40,7 +42,8 @@ private:
     void show_pending();
 
     QString m_current_key;
-    QSet<QPair<QString, QString>> m_told;  // key path and reason
+    QSet<QPair<QString, QString>> m_told;              // key path and reason
+    QHash<QPair<QString, QString>, int> m_told_below;  // path of the key above, and reason
     QStringList m_pending;
     bool m_scheduled = false;
 };

@@ -8,6 +8,10 @@ from session import TITLE, Session, equal, make_sample, run
 
 SERVICES = ["ControlSet001", "Services"]
 KEY_RECORD = 76  # bytes before the name
+VALUE_COUNT, VALUE_LIST = 36, 40  # fields of it
+NOWHERE = (0x7FFFFFF0).to_bytes(4, "little")
+MANY = 400
+FIRST_NUMBER = 1000000
 
 
 def record_of(content, key):
@@ -17,15 +21,46 @@ def record_of(content, key):
     return at
 
 
+def field_of(content, key, field):
+    """Where a field of the first key with this name lies in the file."""
+    return record_of(content, key) + field
+
+
+def cell(content, key, field):
+    """Where the record lies that a field of this key leads to."""
+    at = field_of(content, key, field)
+    return 4096 + int.from_bytes(content[at : at + 4], "little") + 4
+
+
 def damaged_sample(scratch):
-    """usbhub, the last of the services, is no key any more; the value list of Themes leads nowhere."""
+    """usbhub, the last of the services, is no key any more; the value list of Themes leads nowhere; Beep claims more
+    values than its list can hold; the data of the first value of Tcpip leads nowhere."""
     path = make_sample(os.path.join(scratch, "SYSTEM"))
     with open(path, "r+b") as file:
         content = file.read()
-        file.seek(record_of(content, b"usbhub"))
-        file.write(b"xx")
-        file.seek(record_of(content, b"Themes") + 40)
-        file.write((0x7FFFFFF0).to_bytes(4, "little"))
+
+        def put(at, data):
+            file.seek(at)
+            file.write(data)
+
+        put(record_of(content, b"usbhub"), b"xx")
+        put(field_of(content, b"Themes", VALUE_LIST), NOWHERE)
+        put(field_of(content, b"Beep", VALUE_COUNT), b"\xff\xff\xff\x7f")
+        values = cell(content, b"Tcpip", VALUE_LIST)
+        first = 4096 + int.from_bytes(content[values : values + 4], "little") + 4
+        equal(content[first : first + 2], b"vk", "the signature of the value to damage")
+        put(first + 4, (100).to_bytes(4, "little") + NOWHERE)
+    return path
+
+
+def half_damaged_sample(scratch):
+    """Every second key of a large group is no key any more."""
+    path = make_sample(os.path.join(scratch, "SYSTEM"), extra_keys=MANY)
+    with open(path, "r+b") as file:
+        content = file.read()
+        for number in range(0, MANY, 2):
+            file.seek(record_of(content, b"Key %d" % (FIRST_NUMBER + number)))
+            file.write(b"xx")
     return path
 
 
@@ -41,8 +76,12 @@ def browsing(scratch):
         session.picture("damaged-branch", session.main)
 
         session.click_key(SERVICES + ["Themes"])
-        equal(session.names()[:1], ["(Default)"], "a key whose values lead nowhere")
+        equal(session.names(), ["(Default)"], "a key whose values lead nowhere")
+        session.click_key(SERVICES + ["Beep"])
+        equal(len(session.names()) < 20, True, f"a key that claims too many values shows {len(session.names())}")
         session.click_key(SERVICES + ["Tcpip"])
+        unreadable = [each for each, (_, data) in session.state[tuple(SERVICES + ["Tcpip"])].items() if data is None]
+        equal([session.row(each)[2] for each in unreadable], [""], "the data that cannot be read")
         program.double_click(session.value_cell("Start"))
         dialog = program.dialog("Edit DWORD (32-bit) Value")
         program.keys("ctrl+a", "4", "Return")
@@ -60,4 +99,60 @@ def browsing(scratch):
         session.unchanged("browsing")
 
 
-run(browsing)
+def painting(scratch):
+    """Many damaged rows share a box, and scrolling over them brings no other"""
+    with Session(half_damaged_sample(scratch)) as session:
+        program = session.program
+        group = ["Many", f"Group {FIRST_NUMBER}"]
+        session.open_key(group)
+        program.keys("Right")
+        box = program.dialog(TITLE)
+        lines = program.labels(box)[0].splitlines()
+        path = "\\".join(session.root + group)
+        equal(lines[0], f'The key "{path}\\#0" cannot be read: ROpenSubKey failed', "the first line")
+        equal(lines[10:], [f"More keys cannot be read: {MANY // 2 - 10}"], "what stands behind ten lines")
+        session.picture("damaged-rows", box)
+        program.click(program.button(box, "OK"))
+        program.gone(box)
+
+        # Turned over with the wheel, each of them comes into sight; the keys go through them too.
+        for key in (f"Key {FIRST_NUMBER + MANY - 1}", f"Key {FIRST_NUMBER + 1}"):
+            session.click_key(group + [key])
+            equal(program.open_titles(), [TITLE], f"windows on the way to {key}")
+        for key, end in (("End", "Setup"), ("Home", session.root[0])):
+            program.keys(key)
+            until(lambda: program.selected_path(session.tree)[-1:] == [end], f"the row {end!r}")
+            equal(program.open_titles(), [TITLE], f"windows after {key}")
+        session.click_key(group + [f"Key {FIRST_NUMBER + 3}"])
+        equal(session.names(), ["(Default)", "Number"], "the values of a sound key among them")
+        session.unchanged("scrolling")
+
+
+def searching(scratch):
+    """A search that meets a damaged key names it once and goes on behind it"""
+    with Session(damaged_sample(scratch)) as session:
+        program = session.program
+        program.keys("ctrl+f")
+        dialog = program.dialog("Find")
+        program.keys("ctrl+a")
+        program.type("is nowhere")
+        program.click(program.button(dialog, "Find values"))
+        program.click(program.button(dialog, "OK"))
+        damaged = "\\".join(session.root + SERVICES) + "\\#11"
+        session.message(
+            TITLE,
+            f'The search could not go on: The key "{damaged}" cannot be read: ROpenSubKey failed',
+            "OK",
+            "damaged-search",
+        )
+        program.alone(TITLE)
+        program.keys("F3")
+        session.message(TITLE, "Finished searching.", "OK")
+
+        # The branch with the damaged key opens without telling it again.
+        session.open_key(SERVICES + ["Themes"])
+        equal(program.open_titles(), [TITLE], "windows after opening the branch")
+        session.unchanged("searching")
+
+
+run(browsing, painting, searching)

@@ -66,8 +66,10 @@ private slots:
     void columns_start_wide_enough();
     void a_damaged_key_is_told_once_and_its_siblings_stay();
     void an_exception_in_a_slot_is_told_and_the_program_goes_on();
+    void what_another_program_asks_for_is_not_laid_to_the_current_key();
     void a_name_like_markup_is_told_as_it_is();
     void many_failures_share_a_box();
+    void rows_that_come_into_sight_bring_no_endless_row_of_boxes();
     void the_model_may_go_before_the_window();
 };
 
@@ -445,6 +447,22 @@ void WindowTest::an_exception_in_a_slot_is_told_and_the_program_goes_on() {
     QCOMPARE(hand.text, QStringLiteral("The registry cannot be read: other"));
 }
 
+void WindowTest::what_another_program_asks_for_is_not_laid_to_the_current_key() {
+    FailureReport::instance().set_current_key(QStringLiteral("asked\\sound"));
+    DialogHand hand;
+    hand.then_press(QMessageBox::Ok);
+    FailureReport::instance().report(QStringLiteral("asked\\damaged"), std::runtime_error("as asked"));
+    QTRY_VERIFY(hand.is_done());
+    bool thrown = false;
+    QTimer::singleShot(0, qApp, [&] {
+        thrown = true;
+        throw std::runtime_error("as asked");
+    });
+    QTRY_VERIFY(thrown);
+    QCoreApplication::processEvents();
+    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+}
+
 void WindowTest::a_name_like_markup_is_told_as_it_is() {
     DialogHand hand;
     hand.then_press(QMessageBox::Ok);
@@ -464,6 +482,27 @@ void WindowTest::many_failures_share_a_box() {
     QVERIFY(hand.text.endsWith(QStringLiteral("More keys cannot be read: 990")));
     QCoreApplication::processEvents();
     QCOMPARE(QApplication::activeModalWidget(), nullptr);
+}
+
+void WindowTest::rows_that_come_into_sight_bring_no_endless_row_of_boxes() {
+    constexpr int most = 10;
+    DialogHand hand;
+    for (int i = 0; i < 100; ++i) {
+        if (i < most) {
+            hand.then_press(QMessageBox::Ok);
+        }
+        FailureReport::instance().report(QStringLiteral("scrolled\\#%1").arg(i), std::runtime_error("gone"));
+        QTRY_VERIFY(hand.is_done());
+        QCoreApplication::processEvents();
+        QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    }
+    // Another key's subkeys, and another reason, are told.
+    hand.then_press(QMessageBox::Ok);
+    FailureReport::instance().report(QStringLiteral("scrolled\\#1"), std::runtime_error("other"));
+    QTRY_VERIFY(hand.is_done());
+    hand.then_press(QMessageBox::Ok);
+    FailureReport::instance().report(QStringLiteral("elsewhere\\#1"), std::runtime_error("gone"));
+    QTRY_VERIFY(hand.is_done());
 }
 
 void WindowTest::the_model_may_go_before_the_window() {
