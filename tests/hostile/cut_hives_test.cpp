@@ -9,6 +9,9 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <cstdlib>
+
 namespace hostile {
 
 namespace {
@@ -18,6 +21,7 @@ using testkit::MemoryFile;
 using testkit::Snapshot;
 
 struct Tally {
+    size_t stride = 1;  // every so many cuts that open, one is also changed
     size_t cuts = 0;
     size_t open = 0;
     size_t changes = 0;
@@ -43,23 +47,27 @@ void survive(const Bytes& whole, size_t length, Tally& tally) {
     const RegistryIo io = file.io();
     RegistryKey* root = ROpenHive(&io);
     if (root != nullptr) {
-        ask_everything(root, testkit::limits_for(length));
         const Snapshot before = take_snapshot(root, judged_limits(length));
+        const bool changes = tally.open++ % tally.stride == 0;
+        if (changes)
+            ask_everything(root, testkit::limits_for(length));
         ASSERT_EQ(RCloseKey(root), R_SUCCESS);
-        const std::vector<Change> all = changes_to(before);
-        const Change& change = all[tally.changes * 37 % all.size()];
-        exempt_what_was_cut_off(before, hive);
-        EXPECT_EQ(try_change(hive, before, change), "") << "cut at " << length << ": " << change.text();
-        tally.open++;
-        tally.changes++;
+        if (changes) {
+            const std::vector<Change> all = changes_to(before);
+            const Change& change = all[tally.changes++ * 37 % all.size()];
+            exempt_what_was_cut_off(before, hive);
+            EXPECT_EQ(try_change(hive, before, change), "") << "cut at " << length << ": " << change.text();
+        }
     }
     EXPECT_EQ(file.counts().writes, 0U);
     EXPECT_TRUE(file.bytes == hive.bytes);
 }
 
-void cut_everywhere(const std::string& name, const Bytes& whole) {
+// A stride is for hives that take long to read; with TALLOWFEN_HOSTILE_ALL there is none.
+void cut_everywhere(const std::string& name, const Bytes& whole, size_t stride = 1) {
     SCOPED_TRACE(name);
     Tally tally;
+    tally.stride = std::getenv("TALLOWFEN_HOSTILE_ALL") == nullptr ? stride : 1;
     for (size_t length = 0; length < whole.size(); length += 512)
         survive(whole, length, tally);
     const size_t end = std::min<size_t>(whole.size(), 4096 + size_t{testkit::get32(whole, 40)});
@@ -69,6 +77,8 @@ void cut_everywhere(const std::string& name, const Bytes& whole) {
     for (size_t length = last_bin; length < end; length++)
         survive(whole, length, tally);
     std::printf("%s: cut %zu times, opens at %zu of them\n", name.c_str(), tally.cuts, tally.open);
+    if (tally.changes < tally.open)
+        std::printf("[ LEFT OUT ] a change at %zu of these\n", tally.open - tally.changes);
     EXPECT_GT(tally.cuts, 4000U);
 }
 
@@ -84,7 +94,7 @@ TEST(CutShort, a_made_hive_that_is_full) {
 TEST(CutShort, real_hives) {
     for (const testkit::RealHive& real : testkit::real_hives()) {
         if (real.name == "bcd" || real.name == "sam-2016")
-            cut_everywhere(real.name, testkit::read_file(real.path));
+            cut_everywhere(real.name, testkit::read_file(real.path), 16);
     }
 }
 

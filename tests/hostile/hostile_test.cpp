@@ -133,7 +133,7 @@ class Changing : public Hives {};
 TEST_P(Changing, harms_nothing_that_is_not_named) {
     if (entry().readable == Readable::no)
         return;  // what does not open is not changed: Reading sees to that
-    constexpr size_t sampled = 8;
+    constexpr size_t sampled = 4;
     const Case hive = entry().make();
     const Snapshot before = snapshot_of(hive.bytes, judged_limits(hive.bytes.size()));
     const std::vector<Change> all = changes_to(before);

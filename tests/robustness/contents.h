@@ -11,7 +11,7 @@
 
 namespace testkit {
 
-// "PATH" for every key, "PATH|NAME" with type and data for every value.
+// "PATH" for every key, "PATH|NAME" for every value, each with what a Snapshot says of it.
 using Contents = std::map<std::string, std::string>;
 
 // Reads a key and all below it through the engine; path is the key's. What cannot be read is told in why,
