@@ -3,14 +3,13 @@
 //
 // Times of the engine, each to be set against another of the same run: against reading the file once, or N against 2N.
 #include "hive_file.h"
+#include "sizes.h"
 #include "walk.h"
 
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
-#include <cstdio>
-#include <cstdlib>
-#include <filesystem>
+#include <memory>
 #include <random>
 #include <string>
 #include <vector>
@@ -22,21 +21,13 @@ using bench::check;
 using bench::HiveFile;
 using bench::Walk;
 
-// The hive that whole-file measures are taken on: the largest real one where there is one, else a made one.
-const std::string& large_hive() {
-    static const std::string path = [] {
-        const std::string real = std::string(TALLOWFEN_HIVES) + "/software-7";
-        return std::filesystem::exists(real) ? real : std::string();
-    }();
-    return path;
-}
-
+// The hive that whole-file measures are taken on.
 std::unique_ptr<HiveFile> open_large() {
-    if (!large_hive().empty())
-        return std::make_unique<HiveFile>(large_hive());
+    if (!bench::large_hive().empty())
+        return std::make_unique<HiveFile>(bench::large_hive());
     auto file = std::make_unique<HiveFile>();
     RegistryKey* root = file->open();
-    bench::make_branches(root, 200, 500);
+    bench::make_large(root);
     RCloseKey(root);
     return file;
 }
@@ -94,6 +85,8 @@ std::vector<int> shuffled(int count) {
     return numbers;
 }
 
+constexpr int paths_opened = 10000;
+
 std::string key_name(int i) { return "Key number " + std::to_string(i); }
 
 void create_keys(RegistryKey* parent, const std::vector<int>& numbers) {
@@ -104,25 +97,30 @@ void create_keys(RegistryKey* parent, const std::vector<int>& numbers) {
     }
 }
 
-// The time of one path, with as many siblings as the argument says.
+// The time of one of 10,000 random paths, with as many siblings as the argument says.
 void OpenPath(benchmark::State& state) {
     HiveFile file;
     RegistryKey* root = file.open();
     const auto count = static_cast<int>(state.range(0));
     create_keys(root, shuffled(count));
-    const std::vector<int> wanted = shuffled(count);
+    std::mt19937 random(2);
+    std::vector<std::string> wanted;
+    for (int i = 0; i < paths_opened; i++)
+        wanted.push_back(key_name(std::uniform_int_distribution(0, count - 1)(random)));
     file.counts = {};
     size_t next = 0;
     for (auto _ : state) {
         RegistryKey* key = nullptr;
-        check(ROpenKey(root, key_name(wanted[next]).c_str(), &key), "open");
+        check(ROpenKey(root, wanted[next++].c_str(), &key), "open");
         RCloseKey(key);
-        next = (next + 1) % wanted.size();
     }
     report(state, file.counts, static_cast<double>(state.iterations()));
     RCloseKey(root);
 }
-BENCHMARK(OpenPath)->RangeMultiplier(4)->Range(64, 16384)->Unit(benchmark::kMicrosecond);
+BENCHMARK(OpenPath)
+    ->ArgsProduct(bench::sizes({250, 1000, 4000, 16000}))
+    ->Iterations(paths_opened)
+    ->Unit(benchmark::kMicrosecond);
 
 // Creates the argument's number of keys under one key, in random order; the time is that of all.
 void CreateKeys(benchmark::State& state) {
@@ -144,7 +142,7 @@ void CreateKeys(benchmark::State& state) {
     }
     report(state, counts, static_cast<double>(numbers.size()));
 }
-BENCHMARK(CreateKeys)->Arg(2000)->Arg(4000)->Arg(8000)->Arg(16000)->Unit(benchmark::kMillisecond);
+BENCHMARK(CreateKeys)->ArgsProduct(bench::sizes({2000, 4000, 8000, 16000}))->Unit(benchmark::kMillisecond);
 
 void set_values(RegistryKey* key, const std::vector<int>& numbers) {
     const uint32_t data = 1;
@@ -171,7 +169,7 @@ void SetValues(benchmark::State& state) {
     }
     report(state, counts, static_cast<double>(numbers.size()));
 }
-BENCHMARK(SetValues)->Arg(2000)->Arg(4000)->Arg(8000)->Arg(16000)->Unit(benchmark::kMillisecond);
+BENCHMARK(SetValues)->ArgsProduct(bench::sizes({2000, 4000, 8000, 16000}))->Unit(benchmark::kMillisecond);
 
 // The walk over a key's value list for a name that is not there; the time is that of all its records.
 void FindMissingValue(benchmark::State& state) {
@@ -182,7 +180,7 @@ void FindMissingValue(benchmark::State& state) {
         benchmark::DoNotOptimize(RFindValueA(root, "not there"));
     RCloseKey(root);
 }
-BENCHMARK(FindMissingValue)->Arg(4000)->Arg(8000)->Arg(16000)->Unit(benchmark::kMicrosecond);
+BENCHMARK(FindMissingValue)->ArgsProduct(bench::sizes({4000, 8000, 16000}))->Unit(benchmark::kMicrosecond);
 
 // Creates and deletes keys in turn; grown is by how much the file became longer, in bytes.
 void CreateAndDelete(benchmark::State& state) {
@@ -193,7 +191,7 @@ void CreateAndDelete(benchmark::State& state) {
         RegistryKey* parent = nullptr;
         check(RCreateKey(root, "Parent", &parent, nullptr), "create");
         const int64_t before = file.size();
-        for (int i = 0; i < 10000; i++) {
+        for (int i = 0; i < bench::sized(10000); i++) {
             RegistryKey* key = nullptr;
             check(RCreateKey(parent, key_name(i).c_str(), &key, nullptr), "create");
             RCloseKey(key);

@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 #include "walk.h"
 
+#include "sizes.h"
+
 #include <algorithm>
 #include <cstdio>
 #include <cstdlib>
@@ -35,19 +37,33 @@ void make_keys(RegistryKey* parent, int count) {
 
 } // namespace
 
-void make_branches(RegistryKey* root, int branches, int keys) {
-    for (int i = 0; i < branches; i++) {
+void make_large(RegistryKey* root) {
+    for (int i = 0; i < 200; i++) {
         RegistryKey* branch = nullptr;
         check(RCreateKey(root, ("Branch " + std::to_string(i)).c_str(), &branch, nullptr), "create");
-        make_keys(branch, keys);
+        make_keys(branch, sized(500));
         RCloseKey(branch);
     }
 }
 
-void make_values(RegistryKey* key, int count) {
+void make_key_with_subkeys(RegistryKey* parent, const char* name, int count) {
+    RegistryKey* key = nullptr;
+    check(RCreateKey(parent, name, &key, nullptr), "create");
+    for (int i = 0; i < count; i++) {
+        RegistryKey* made = nullptr;
+        check(RCreateKey(key, ("Key number " + std::to_string(i)).c_str(), &made, nullptr), "create");
+        RCloseKey(made);
+    }
+    RCloseKey(key);
+}
+
+void make_key_with_values(RegistryKey* parent, const char* name, int count) {
+    RegistryKey* key = nullptr;
+    check(RCreateKey(parent, name, &key, nullptr), "create");
     const uint32_t data = 1;
     for (int i = 0; i < count; i++)
         check(RSetValueExW(key, ("Value number " + std::to_string(i)).c_str(), 4, &data, sizeof data), "set");
+    RCloseKey(key);
 }
 
 void Walk::key(RegistryKey* handle) {
