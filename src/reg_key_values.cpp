@@ -66,28 +66,31 @@ bool read_number(RegistryKey* handle, int index, T& number) {
     return true;
 }
 
-QString decode(const QByteArray& bytes, qsizetype from, qsizetype units) {
-    QString text(units, Qt::Uninitialized);
-    for (qsizetype i = 0; i < units; i++)
-        text[i] = QChar(qFromLittleEndian<quint16>(bytes.constData() + from + 2 * i));
+// All characters that the bytes hold; an odd last byte is none.
+QString decode(const QByteArray& bytes) {
+    QString text(bytes.size() / 2, Qt::Uninitialized);
+    // At once: a long text is read as fast as it is copied.
+    qFromLittleEndian<char16_t>(bytes.constData(), text.size(), text.data());
     return text;
 }
 
-// How many units from a byte on stand before the next zero unit or the end; an odd last byte is no character.
-qsizetype units_to_zero(const QByteArray& bytes, qsizetype from) {
-    qsizetype units = 0;
-    while (from + 2 * units + 1 < bytes.size() &&
-           (bytes[from + 2 * units] != '\0' || bytes[from + 2 * units + 1] != '\0'))
-        units++;
-    return units;
+// The characters before the first zero.
+QString decode_string(const QByteArray& bytes) {
+    QString text = decode(bytes);
+    const qsizetype zero = text.indexOf(QChar(u'\0'));
+    if (zero >= 0)
+        text.truncate(zero);
+    return text;
 }
 
 QStringList split_multi_string(const QByteArray& bytes) {
+    const QString text = decode(bytes);
     QStringList list;
-    for (qsizetype from = 0; bytes.size() - from > 1;) {
-        const qsizetype units = units_to_zero(bytes, from);
-        list.append(decode(bytes, from, units));
-        from += 2 * units + 2;
+    for (qsizetype from = 0; from < text.size();) {
+        const qsizetype zero = text.indexOf(QChar(u'\0'), from);
+        const qsizetype end = zero >= 0 ? zero : text.size();
+        list.append(text.mid(from, end - from));
+        from = end + 1;
     }
     if (!list.isEmpty() && list.last().isEmpty())
         list.removeLast();
@@ -167,7 +170,7 @@ std::unique_ptr<RegValue> RegKey::read_value(int index) {
     if (!read_bytes(hive_, handle, index, found.data_size, bytes))
         return nullptr;
     if (is_text(found.type))
-        return std::make_unique<RegValue>(found.name, decode(bytes, 0, units_to_zero(bytes, 0)), found.type);
+        return std::make_unique<RegValue>(found.name, decode_string(bytes), found.type);
     if (found.type == REG_MULTI_SZ)
         return std::make_unique<RegValue>(found.name, split_multi_string(bytes));
     return std::make_unique<RegValue>(found.name, bytes, found.type);
