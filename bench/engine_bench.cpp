@@ -184,6 +184,7 @@ BENCHMARK(FindMissingValue)->ArgsProduct(bench::sizes({4000, 8000, 16000}))->Uni
 
 // Creates and deletes keys in turn; grown is by how much the file became longer, in bytes.
 void CreateAndDelete(benchmark::State& state) {
+    const int count = bench::sized(10000);
     double grown = 0;
     for (auto _ : state) {
         HiveFile file;
@@ -191,7 +192,7 @@ void CreateAndDelete(benchmark::State& state) {
         RegistryKey* parent = nullptr;
         check(RCreateKey(root, "Parent", &parent, nullptr), "create");
         const int64_t before = file.size();
-        for (int i = 0; i < bench::sized(10000); i++) {
+        for (int i = 0; i < count; i++) {
             RegistryKey* key = nullptr;
             check(RCreateKey(parent, key_name(i).c_str(), &key, nullptr), "create");
             RCloseKey(key);
@@ -202,6 +203,7 @@ void CreateAndDelete(benchmark::State& state) {
         RCloseKey(root);
     }
     state.counters["grownB"] = grown;
+    state.counters["keys"] = count;
 }
 BENCHMARK(CreateAndDelete)->Unit(benchmark::kMillisecond)->Iterations(1);
 
