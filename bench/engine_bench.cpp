@@ -16,8 +16,8 @@
 
 namespace {
 
-using bench::Counts;
 using bench::check;
+using bench::Counts;
 using bench::HiveFile;
 using bench::Walk;
 

@@ -121,9 +121,7 @@ HiveFile::HiveFile(const std::string& path) : fd_(::open(path.c_str(), O_RDONLY 
 
 HiveFile::~HiveFile() { close(fd_); }
 
-RegistryIo HiveFile::io() {
-    return {device_.get(), seek, read, writable_ ? write : nullptr};
-}
+RegistryIo HiveFile::io() { return {device_.get(), seek, read, writable_ ? write : nullptr}; }
 
 RegistryKey* HiveFile::open() {
     lseek(fd_, 0, SEEK_SET);

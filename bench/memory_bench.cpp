@@ -60,6 +60,6 @@ void ObjectMemory(benchmark::State& state) {
 }
 BENCHMARK(ObjectMemory)->Iterations(1)->Unit(benchmark::kMillisecond);
 
-} // namespace
+}  // namespace
 
 BENCHMARK_MAIN();

@@ -23,7 +23,7 @@ std::string made_directory() {
     return directory;
 }
 
-} // namespace
+}  // namespace
 
 ScratchHive::ScratchHive(const std::string& original) : directory_(made_directory()), path_(directory_ + "/hive") {
     if (original.empty()) {
@@ -56,4 +56,4 @@ const ScratchHive& large_copy() {
     return copy;
 }
 
-} // namespace bench
+}  // namespace bench

@@ -34,4 +34,4 @@ private:
 // The copy of the large hive that a whole run shares.
 const ScratchHive& large_copy();
 
-} // namespace bench
+}  // namespace bench

@@ -71,6 +71,6 @@ void SearchInOneKey(benchmark::State& state) {
 }
 BENCHMARK(SearchInOneKey)->ArgsProduct(bench::sizes({2500, 5000, 10000, 20000}))->Unit(benchmark::kMillisecond);
 
-} // namespace
+}  // namespace
 
 BENCHMARK_MAIN();

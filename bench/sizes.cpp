@@ -9,15 +9,11 @@ namespace bench {
 
 namespace {
 
-bool is_short() {
-    return std::getenv("TALLOWFEN_BENCH_SHORT") != nullptr;
-}
+bool is_short() { return std::getenv("TALLOWFEN_BENCH_SHORT") != nullptr; }
 
-} // namespace
+}  // namespace
 
-int sized(int count) {
-    return is_short() ? count / 50 : count;
-}
+int sized(int count) { return is_short() ? count / 50 : count; }
 
 std::vector<std::vector<int64_t>> sizes(const std::vector<int>& counts) {
     std::vector<int64_t> arguments;
@@ -33,4 +29,4 @@ std::string large_hive() {
     return !is_short() && std::filesystem::exists(real) ? real : std::string();
 }
 
-} // namespace bench
+}  // namespace bench

@@ -21,4 +21,4 @@ std::vector<std::vector<int64_t>> sizes(const std::vector<int>& counts);
 // tests' real ones, which a short run leaves alone. Empty: there is none, and one is to be made.
 std::string large_hive();
 
-} // namespace bench
+}  // namespace bench

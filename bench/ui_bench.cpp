@@ -99,15 +99,13 @@ public:
 // One hive for each size: making a large one takes longer than what is measured on it.
 const ScratchHive& hive_with_subkeys(int count) {
     static std::map<int, ScratchHive> hives;
-    return hives
-        .try_emplace(count, [count](RegistryKey* root) { bench::make_key_with_subkeys(root, "Key", count); })
+    return hives.try_emplace(count, [count](RegistryKey* root) { bench::make_key_with_subkeys(root, "Key", count); })
         .first->second;
 }
 
 const ScratchHive& hive_with_values(int count) {
     static std::map<int, ScratchHive> hives;
-    return hives
-        .try_emplace(count, [count](RegistryKey* root) { bench::make_key_with_values(root, "Key", count); })
+    return hives.try_emplace(count, [count](RegistryKey* root) { bench::make_key_with_values(root, "Key", count); })
         .first->second;
 }
 
@@ -173,9 +171,9 @@ ScratchHive hive_with_long_value(int type, int64_t size) {
     return ScratchHive([&](RegistryKey* root) {
         RegistryKey* key = nullptr;
         bench::check(RCreateKey(root, "Key", &key, nullptr), "create");
-        bench::check(RSetValueExW(key, "Value", static_cast<uint32_t>(type), data.data(),
-                                  static_cast<uint32_t>(data.size())),
-                     "set");
+        bench::check(
+            RSetValueExW(key, "Value", static_cast<uint32_t>(type), data.data(), static_cast<uint32_t>(data.size())),
+            "set");
         RCloseKey(key);
     });
 }
@@ -205,7 +203,7 @@ void ShowLongValue(benchmark::State& state) {
 }
 BENCHMARK(ShowLongValue)->ArgsProduct({{1, 3, 7}, {1 << 10, 1 << 20}})->Unit(benchmark::kMicrosecond);
 
-} // namespace
+}  // namespace
 
 int main(int argc, char** argv) {
     qputenv("QT_QPA_PLATFORM", "offscreen");

@@ -35,7 +35,7 @@ void make_keys(RegistryKey* parent, int count) {
     }
 }
 
-} // namespace
+}  // namespace
 
 void make_large(RegistryKey* root) {
     for (int i = 0; i < 200; i++) {
@@ -95,4 +95,4 @@ void Walk::value(RegistryKey* handle, uint32_t i) {
     check(REnumValueW(handle, i, nullptr, nullptr, nullptr, data_.data(), &room), "value data");
 }
 
-} // namespace bench
+}  // namespace bench

@@ -38,4 +38,4 @@ private:
     std::vector<char> data_ = std::vector<char>(4096);
 };
 
-} // namespace bench
+}  // namespace bench
