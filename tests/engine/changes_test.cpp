@@ -147,8 +147,7 @@ TEST_F(Changing, new_keys_go_where_upper_cased_order_wants_them_in_every_kind_of
                 many.add(name);
             Scene other(layout);
             ASSERT_TRUE(other.is_open());
-            for (const char* name :
-                 {"a", "z", "E", "e_", "_", "[", "^x", "C", "zz", "I", "\xC4", "m`", "aa"}) {
+            for (const char* name : {"a", "z", "E", "e_", "_", "[", "^x", "C", "zz", "I", "\xC4", "m`", "aa"}) {
                 EXPECT_EQ(other.Create(std::string("many\\") + name), 0) << name;
                 EXPECT_EQ(other.Check(), "") << name;
             }
@@ -164,8 +163,8 @@ TEST_F(Changing, the_handle_sees_the_key_made_through_it) {
     EXPECT_EQ(RCreateKey(scene.root(), "A longer name", made.out(), nullptr), 0);
     EXPECT_EQ(subkey_names(scene.root()), (std::vector<std::string>{"A longer name", "Alpha", "Empty"}));
     uint32_t longest = 0;
-    RQueryInfoKeyA(scene.root(), nullptr, nullptr, nullptr, nullptr, nullptr, &longest, nullptr, nullptr,
-                   nullptr, nullptr, nullptr, nullptr);
+    RQueryInfoKeyA(scene.root(), nullptr, nullptr, nullptr, nullptr, nullptr, &longest, nullptr, nullptr, nullptr,
+                   nullptr, nullptr, nullptr);
     EXPECT_EQ(longest, 13U);
 }
 
@@ -215,11 +214,10 @@ TEST_P(DataSizes, from_one_to_another_reads_back) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Changing, DataSizes,
-                         testing::Values(std::pair{0U, 0U}, std::pair{0U, 5U}, std::pair{4U, 5U},
-                                         std::pair{4U, 100U}, std::pair{5U, 4U}, std::pair{100U, 4U},
-                                         std::pair{100U, 0U}, std::pair{100U, 50U}, std::pair{100U, 101U},
-                                         std::pair{100U, 5000U}, std::pair{20000U, 100000U},
-                                         std::pair{100000U, 3U}));
+                         testing::Values(std::pair{0U, 0U}, std::pair{0U, 5U}, std::pair{4U, 5U}, std::pair{4U, 100U},
+                                         std::pair{5U, 4U}, std::pair{100U, 4U}, std::pair{100U, 0U},
+                                         std::pair{100U, 50U}, std::pair{100U, 101U}, std::pair{100U, 5000U},
+                                         std::pair{20000U, 100000U}, std::pair{100000U, 3U}));
 
 TEST_F(Changing, setting_100_bytes_to_4_keeps_the_old_data_cell) {
     EXPECT_EQ(scene.Set("Alpha", "Hundred", 4, {9, 9, 9, 9}), 0);
@@ -292,7 +290,7 @@ TEST_F(Changing, deleting_the_only_value_sets_the_list_to_none) {
     EXPECT_EQ(scene.DeleteValue("Empty", "V"), 0);
     EXPECT_EQ(field("Empty", 36), 0U);
     EXPECT_EQ(field("Empty", 40), none);
-    EXPECT_EQ(scene.Check(1), ""); // the list's cell
+    EXPECT_EQ(scene.Check(1), "");  // the list's cell
     EXPECT_EQ(scene.Changes(), std::vector<std::string>{});
 }
 
@@ -309,4 +307,4 @@ TEST_F(Changing, deleting_a_value_that_is_not_there_gives_1003) {
     EXPECT_TRUE(scene.Untouched());
 }
 
-} // namespace
+}  // namespace

@@ -84,9 +84,7 @@ TEST(Hooks, upper_casing_decides_what_is_one_name) {
     layout.root.add("\xC4");
     Scene scene(layout);
     EXPECT_FALSE(scene.OpenKey("\xE4"));
-    toupper_ptr = [](char c) {
-        return c == '\xE4' ? '\xC4' : c >= 'a' && c <= 'z' ? static_cast<char>(c - 32) : c;
-    };
+    toupper_ptr = [](char c) { return c == '\xE4' ? '\xC4' : c >= 'a' && c <= 'z' ? static_cast<char>(c - 32) : c; };
     EXPECT_TRUE(scene.OpenKey("\xE4"));
 }
 
@@ -114,9 +112,7 @@ TEST(Hooks, text_goes_through_the_hooks_both_ways) {
     Scene scene;
     EXPECT_EQ(scene.Create("k"), 0);
     Handle key = scene.OpenKey("k");
-    mb2wc_ptr = [](char c) {
-        return static_cast<uint16_t>(c == '\x80' ? 0x20AC : static_cast<unsigned char>(c));
-    };
+    mb2wc_ptr = [](char c) { return static_cast<uint16_t>(c == '\x80' ? 0x20AC : static_cast<unsigned char>(c)); };
     wc2mb_ptr = [](uint16_t unit) { return unit == 0x20AC ? '\x80' : static_cast<char>(unit); };
     EXPECT_EQ(RSetValueExA(key.get(), "\x80", 1, "\x80z", 3), 0);
     const Hive hive = scene.Read();
@@ -138,7 +134,7 @@ TEST_P(Checksum, of_a_base_block_whose_words_give) {
     layout.no_free_space = true;
     LaidHive hive = lay_out(layout);
     const uint32_t size = get32(hive.bytes, 40);
-    uint32_t sum = size ^ (size + 4096); // what the append will change
+    uint32_t sum = size ^ (size + 4096);  // what the append will change
     for (uint32_t position = 0; position < 508; position += 4)
         sum ^= get32(hive.bytes, position);
     hive.put_base(200, sum ^ GetParam().first);
@@ -198,4 +194,4 @@ TEST(Leaf, of_65535_entries_takes_no_other) {
     EXPECT_EQ(scene.bytes(), before);
 }
 
-} // namespace
+}  // namespace

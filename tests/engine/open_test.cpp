@@ -18,9 +18,7 @@ HiveLayout tree() {
     return layout;
 }
 
-bool opens(const LaidHive& hive) {
-    return Scene(hive.bytes).is_open();
-}
+bool opens(const LaidHive& hive) { return Scene(hive.bytes).is_open(); }
 
 TEST(OpenHive, a_descriptor_that_lacks_what_reading_needs_gives_null) {
     Scene scene;
@@ -273,4 +271,4 @@ TEST(OpenKey, keys_below_an_index_root_are_found_in_every_leaf_kind) {
     }
 }
 
-} // namespace
+}  // namespace

@@ -49,7 +49,7 @@ struct Room {
     uint32_t room;
     int32_t status;
     uint32_t size;
-    const char* text; // what the buffer of '#' begins with
+    const char* text;  // what the buffer of '#' begins with
 };
 
 class KeyNameRoom : public Reading, public testing::WithParamInterface<Room> {};
@@ -67,8 +67,7 @@ TEST_P(KeyNameRoom, is_as_the_contract_says) {
 INSTANTIATE_TEST_SUITE_P(REnumKeyExA, KeyNameRoom,
                          testing::Values(Room{"none", 0, 0, 6, "#######"},
                                          Room{"one_below", 4, R_BUFFER_OVERFLOW, 4, "Alph###"},
-                                         Room{"exact", 5, 0, 5, "Alpha##"},
-                                         Room{"one_above", 6, 0, 5, "Alpha\0#"},
+                                         Room{"exact", 5, 0, 5, "Alpha##"}, Room{"one_above", 6, 0, 5, "Alpha\0#"},
                                          Room{"ample", 20, 0, 5, "Alpha\0#"}),
                          [](const auto& row) { return row.param.rule; });
 
@@ -79,8 +78,8 @@ TEST_P(OwnNameRoom, is_as_the_contract_says) {
     char name[20];
     memset(name, '#', sizeof name);
     uint32_t size = row.room;
-    EXPECT_EQ(RQueryInfoKeyA(key.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyA(key.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               row.status);
     EXPECT_EQ(size, row.size);
     EXPECT_EQ(std::string(name, 7), std::string(row.text, 7));
@@ -89,8 +88,7 @@ TEST_P(OwnNameRoom, is_as_the_contract_says) {
 INSTANTIATE_TEST_SUITE_P(RQueryInfoKeyA, OwnNameRoom,
                          testing::Values(Room{"none", 0, 0, 5, "#######"},
                                          Room{"one_below", 4, R_BUFFER_OVERFLOW, 4, "Alph###"},
-                                         Room{"exact", 5, 0, 5, "Alpha##"},
-                                         Room{"one_above", 6, 0, 5, "Alpha\0#"}),
+                                         Room{"exact", 5, 0, 5, "Alpha##"}, Room{"one_above", 6, 0, 5, "Alpha\0#"}),
                          [](const auto& row) { return row.param.rule; });
 
 class OwnWideNameRoom : public Reading, public testing::WithParamInterface<Room> {};
@@ -100,8 +98,8 @@ TEST_P(OwnWideNameRoom, is_as_the_contract_says) {
     uint16_t name[20];
     std::fill(std::begin(name), std::end(name), uint16_t{'#'});
     uint32_t size = row.room;
-    EXPECT_EQ(RQueryInfoKeyW(key.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyW(key.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               row.status);
     EXPECT_EQ(size, row.size);
     for (size_t i = 0; i < 7; ++i)
@@ -133,8 +131,7 @@ INSTANTIATE_TEST_SUITE_P(REnumValueW, ValueNameRoom,
                          testing::Values(Room{"none", 0, R_BUFFER_OVERFLOW, 10, "#######"},
                                          Room{"without_terminator", 8, R_BUFFER_OVERFLOW, 10, "#######"},
                                          Room{"one_below", 9, R_BUFFER_OVERFLOW, 10, "#######"},
-                                         Room{"exact", 10, 0, 8, "Text\0##"},
-                                         Room{"ample", 40, 0, 8, "Text\0##"}),
+                                         Room{"exact", 10, 0, 8, "Text\0##"}, Room{"ample", 40, 0, 8, "Text\0##"}),
                          [](const auto& row) { return row.param.rule; });
 
 class ValueNameRoomA : public Reading, public testing::WithParamInterface<Room> {};
@@ -151,8 +148,7 @@ TEST_P(ValueNameRoomA, is_cut_and_never_refused) {
 
 INSTANTIATE_TEST_SUITE_P(REnumValueA, ValueNameRoomA,
                          testing::Values(Room{"none", 0, 0, 4, "#######"}, Room{"one", 1, 0, 4, "\0######"},
-                                         Room{"exact", 4, 0, 4, "Tex\0###"},
-                                         Room{"one_above", 5, 0, 4, "Text\0##"}),
+                                         Room{"exact", 4, 0, 4, "Tex\0###"}, Room{"one_above", 5, 0, 4, "Text\0##"}),
                          [](const auto& row) { return row.param.rule; });
 
 struct DataRow {
@@ -183,13 +179,11 @@ TEST_P(DataRoom, is_as_the_contract_says) {
 
 INSTANTIATE_TEST_SUITE_P(
     RQueryValueExW, DataRoom,
-    testing::Values(DataRow{"text_one_below", "text", 11, R_MORE_DATA, 12},
-                    DataRow{"text_exact", "text", 12, 0, 12}, DataRow{"text_one_above", "TEXT", 13, 0, 12},
-                    DataRow{"dword_one_below", "", 3, R_MORE_DATA, 4}, DataRow{"dword_exact", "", 4, 0, 4},
-                    DataRow{"big_one_below", "Big", 39999, R_MORE_DATA, 40000},
+    testing::Values(DataRow{"text_one_below", "text", 11, R_MORE_DATA, 12}, DataRow{"text_exact", "text", 12, 0, 12},
+                    DataRow{"text_one_above", "TEXT", 13, 0, 12}, DataRow{"dword_one_below", "", 3, R_MORE_DATA, 4},
+                    DataRow{"dword_exact", "", 4, 0, 4}, DataRow{"big_one_below", "Big", 39999, R_MORE_DATA, 40000},
                     DataRow{"big_exact", "Big", 40000, 0, 40000}, DataRow{"wide_name", "wide", 100, 0, 4},
-                    DataRow{"unknown_type", "Odd", 3, 0, 3},
-                    DataRow{"missing", "None", 100, R_FILE_NOT_FOUND, 100}),
+                    DataRow{"unknown_type", "Odd", 3, 0, 3}, DataRow{"missing", "None", 100, R_FILE_NOT_FOUND, 100}),
     [](const auto& row) { return row.param.rule; });
 
 TEST_F(Reading, without_a_data_buffer_the_stored_size_comes_back) {
@@ -252,14 +246,11 @@ TEST_F(Reading, an_A_call_does_not_read_big_data) {
 
 TEST_F(Reading, an_index_at_or_past_the_end_gives_259) {
     for (uint32_t index : {7U, 8U, none}) {
-        EXPECT_EQ(REnumValueA(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr),
-                  R_NO_MORE_ITEMS);
-        EXPECT_EQ(REnumValueW(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr),
-                  R_NO_MORE_ITEMS);
+        EXPECT_EQ(REnumValueA(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr), R_NO_MORE_ITEMS);
+        EXPECT_EQ(REnumValueW(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr), R_NO_MORE_ITEMS);
     }
     for (uint32_t index : {1U, none}) {
-        EXPECT_EQ(REnumKeyExA(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr),
-                  R_NO_MORE_ITEMS);
+        EXPECT_EQ(REnumKeyExA(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr), R_NO_MORE_ITEMS);
         EXPECT_EQ(REnumKeyInfoA(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr),
                   R_NO_MORE_ITEMS);
     }
@@ -274,11 +265,11 @@ TEST_F(Reading, a_null_key_has_its_own_status_in_each_call) {
     EXPECT_EQ(RFindValueA(nullptr, "Text"), -1);
     EXPECT_EQ(RQueryValueExA(nullptr, "Text", nullptr, nullptr, nullptr), R_INVALID_HANDLE);
     EXPECT_EQ(RQueryValueExW(nullptr, "Text", nullptr, nullptr, nullptr), R_INVALID_HANDLE);
-    EXPECT_EQ(RQueryInfoKeyA(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyA(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               R_INVALID_HANDLE);
-    EXPECT_EQ(RQueryInfoKeyW(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyW(nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               R_INVALID_HANDLE);
 }
 
@@ -286,41 +277,41 @@ TEST_F(Reading, every_output_may_be_null) {
     EXPECT_EQ(REnumKeyInfoA(scene.root(), 0, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr), 0);
     EXPECT_EQ(REnumValueA(key.get(), 0, nullptr, nullptr, nullptr, nullptr, nullptr), 0);
     EXPECT_EQ(REnumValueW(key.get(), 0, nullptr, nullptr, nullptr, nullptr, nullptr), 0);
-    EXPECT_EQ(RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               0);
 }
 
 TEST_F(Reading, the_numbers_of_a_key_are_its_records) {
     uint32_t subkeys = 0, subkey = 0, longest_class = 0, values = 0, value = 0, data = 0, security = 99;
     RegistryTime time{};
-    EXPECT_EQ(RQueryInfoKeyW(key.get(), nullptr, nullptr, nullptr, nullptr, &subkeys, &subkey, &longest_class,
-                             &values, &value, &data, &security, &time),
+    EXPECT_EQ(RQueryInfoKeyW(key.get(), nullptr, nullptr, nullptr, nullptr, &subkeys, &subkey, &longest_class, &values,
+                             &value, &data, &security, &time),
               0);
     EXPECT_EQ(subkeys, 1U);
-    EXPECT_EQ(subkey, 3U); // "One"
+    EXPECT_EQ(subkey, 3U);  // "One"
     EXPECT_EQ(longest_class, 0U);
     EXPECT_EQ(values, 7U);
-    EXPECT_EQ(value, 5U); // "Multi"
+    EXPECT_EQ(value, 5U);  // "Multi"
     EXPECT_EQ(data, 40000U);
-    EXPECT_EQ(security, 4U); // a descriptor of 24 bytes
+    EXPECT_EQ(security, 4U);  // a descriptor of 24 bytes
     EXPECT_EQ(time.low, 0x89ABCDEFU);
     EXPECT_EQ(time.high, 0x01234567U);
 }
 
 TEST_F(Reading, a_class_comes_as_stored_and_without_a_buffer_its_size) {
     uint32_t size = 0;
-    RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, &size, nullptr, nullptr, nullptr, nullptr, nullptr,
-                   nullptr, nullptr, nullptr);
+    RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                   nullptr, nullptr);
     EXPECT_EQ(size, 10U);
     size = 0;
-    RQueryInfoKeyW(key.get(), nullptr, nullptr, nullptr, &size, nullptr, nullptr, nullptr, nullptr, nullptr,
-                   nullptr, nullptr, nullptr);
+    RQueryInfoKeyW(key.get(), nullptr, nullptr, nullptr, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                   nullptr, nullptr);
     EXPECT_EQ(size, 12U);
     char16_t text[8] = u"#######";
     size = sizeof text;
-    RQueryInfoKeyW(key.get(), nullptr, nullptr, text, &size, nullptr, nullptr, nullptr, nullptr, nullptr,
-                   nullptr, nullptr, nullptr);
+    RQueryInfoKeyW(key.get(), nullptr, nullptr, text, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                   nullptr, nullptr);
     EXPECT_EQ(size, 10U);
     EXPECT_EQ(std::u16string(text), u"Klass");
 }
@@ -348,13 +339,13 @@ TEST_F(Reading, a_key_named_in_utf16_gives_123_and_its_bytes) {
     Handle wide;
     ASSERT_EQ(ROpenSubKey(scene.root(), 1, wide.out()), 0);
     size = sizeof name;
-    EXPECT_EQ(RQueryInfoKeyA(wide.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyA(wide.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               R_INVALID_NAME);
     // One byte more, not one character: kept as callers know it.
     size = 0;
-    EXPECT_EQ(RQueryInfoKeyW(wide.get(), nullptr, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyW(wide.get(), nullptr, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               0);
     EXPECT_EQ(size, 9U);
 }
@@ -362,8 +353,8 @@ TEST_F(Reading, a_key_named_in_utf16_gives_123_and_its_bytes) {
 TEST_F(Reading, the_root_has_no_name_to_show) {
     char name[20] = "######";
     uint32_t size = sizeof name;
-    EXPECT_EQ(RQueryInfoKeyA(scene.root(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
-                             nullptr, nullptr, nullptr, nullptr),
+    EXPECT_EQ(RQueryInfoKeyA(scene.root(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
               0);
     EXPECT_EQ(size, 0U);
     EXPECT_STREQ(name, "");
@@ -399,23 +390,18 @@ TEST_P(Damaged, big_data_gives) {
 
 INSTANTIATE_TEST_SUITE_P(
     Rows, Damaged,
-    testing::Values(DamagedData{"no_db_record",
-                                [](LaidHive& h, const ValuePlaces& p) { h.put16(p.data, 0, 1); },
-                                R_CAN_NOT_COMPLETE},
-                    DamagedData{"free_record", [](LaidHive& h, const ValuePlaces& p) { h.mark_free(p.data); },
-                                R_CAN_NOT_COMPLETE},
-                    DamagedData{"more_than_the_segments_hold",
-                                [](LaidHive& h, const ValuePlaces& p) { h.put32(p.record, 4, 60000); },
-                                R_REGISTRY_CORRUPT},
-                    DamagedData{"no_segments",
-                                [](LaidHive& h, const ValuePlaces& p) { h.put16(p.data, 2, 0); },
-                                R_REGISTRY_CORRUPT},
-                    DamagedData{"list_shorter_than_its_count",
-                                [](LaidHive& h, const ValuePlaces& p) { h.put16(p.data, 2, 65535); },
-                                R_REGISTRY_IO_FAILED},
-                    DamagedData{"inline_of_five_bytes",
-                                [](LaidHive& h, const ValuePlaces& p) { h.put32(p.record, 4, 0x80000005); },
-                                R_CAN_NOT_COMPLETE}),
+    testing::Values(
+        DamagedData{"no_db_record", [](LaidHive& h, const ValuePlaces& p) { h.put16(p.data, 0, 1); },
+                    R_CAN_NOT_COMPLETE},
+        DamagedData{"free_record", [](LaidHive& h, const ValuePlaces& p) { h.mark_free(p.data); }, R_CAN_NOT_COMPLETE},
+        DamagedData{"more_than_the_segments_hold",
+                    [](LaidHive& h, const ValuePlaces& p) { h.put32(p.record, 4, 60000); }, R_REGISTRY_CORRUPT},
+        DamagedData{"no_segments", [](LaidHive& h, const ValuePlaces& p) { h.put16(p.data, 2, 0); },
+                    R_REGISTRY_CORRUPT},
+        DamagedData{"list_shorter_than_its_count", [](LaidHive& h, const ValuePlaces& p) { h.put16(p.data, 2, 65535); },
+                    R_REGISTRY_IO_FAILED},
+        DamagedData{"inline_of_five_bytes", [](LaidHive& h, const ValuePlaces& p) { h.put32(p.record, 4, 0x80000005); },
+                    R_CAN_NOT_COMPLETE}),
     [](const auto& row) { return row.param.rule; });
 
-} // namespace
+}  // namespace

@@ -42,8 +42,7 @@ struct Comparer {
         uint32_t type = 0;
         uint32_t data_size = value.size;
         Bytes data(value.size + 1);
-        const int32_t status =
-            REnumValueW(key, index, name.data(), &name_size, &type, data.data(), &data_size);
+        const int32_t status = REnumValueW(key, index, name.data(), &name_size, &type, data.data(), &data_size);
         data.resize(data_size);
         const std::u16string text(name.begin(), name.begin() + name_size / 2);
         if ((status == 0) != value.readable)
@@ -56,8 +55,8 @@ struct Comparer {
         ++keys;
         uint32_t subkeys = 0;
         uint32_t value_count = 0;
-        if (RQueryInfoKeyA(handle, nullptr, nullptr, nullptr, nullptr, &subkeys, nullptr, nullptr,
-                           &value_count, nullptr, nullptr, nullptr, nullptr) != 0 ||
+        if (RQueryInfoKeyA(handle, nullptr, nullptr, nullptr, nullptr, &subkeys, nullptr, nullptr, &value_count,
+                           nullptr, nullptr, nullptr, nullptr) != 0 ||
             subkeys != key.children.size() || value_count != key.values.size())
             return differ("counts of " + utf8(key.name));
         for (uint32_t i = 0; i < value_count; ++i)
@@ -91,7 +90,7 @@ TEST(RealHives, every_key_and_value_reads_as_the_independent_reader_has_it) {
 TEST(RealHives, every_key_named_in_8_bits_is_found_by_its_path) {
     for (const RealHive& real : real_hives()) {
         if (real.keys > 30000)
-            continue; // one of each size is enough for look-ups by path
+            continue;  // one of each size is enough for look-ups by path
         SCOPED_TRACE(real.name);
         Scene scene(read_file(real.path));
         ASSERT_TRUE(scene.is_open());
@@ -132,20 +131,20 @@ TEST(RealHives, a_key_and_a_value_made_and_removed_leave_all_else_as_it_was) {
         made.reset();
         const uint64_t record = 4100 + uint64_t{hive.root.children.front().offset};
         const uint64_t index = 4100 + uint64_t{get32(scene.bytes(), record + 28)};
-        if (get16(scene.bytes(), index) == 0x6972) { // below an index root a key stays
+        if (get16(scene.bytes(), index) == 0x6972) {  // below an index root a key stays
             EXPECT_EQ(RDeleteKey(parent.get(), "zz test _key"), R_PATH_NOT_FOUND);
             EXPECT_EQ(scene.Changes().size(), 2U);
             continue;
         }
         EXPECT_EQ(RDeleteKey(parent.get(), "zz test _key"), 0);
-        EXPECT_EQ(scene.Check(1), ""); // the data cell stays
+        EXPECT_EQ(scene.Check(1), "");  // the data cell stays
         EXPECT_EQ(scene.Changes(), std::vector<std::string>{});
     }
 }
 
 TEST(RealHives, an_insertion_leaves_a_sorted_list_sorted_wherever_it_goes) {
     for (const RealHive& real : real_hives()) {
-        if (real.keys > 12000) { // the checker reads the whole hive after each insertion
+        if (real.keys > 12000) {  // the checker reads the whole hive after each insertion
             printf("[ LEFT OUT ] %s, %zu keys\n", real.name.c_str(), real.keys);
             continue;
         }
@@ -159,4 +158,4 @@ TEST(RealHives, an_insertion_leaves_a_sorted_list_sorted_wherever_it_goes) {
     }
 }
 
-} // namespace
+}  // namespace

@@ -84,15 +84,14 @@ TEST_P(RenameRefused, writes_nothing) {
     EXPECT_TRUE(scene.Untouched());
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Rows, RenameRefused,
-    testing::Values(Refused{"empty", "Top\\Middle", "", R_INVALID_PARAMETER},
-                    Refused{"a_backslash", "Top\\Middle", "a\\b", R_INVALID_PARAMETER},
-                    Refused{"a_siblings_name", "Top\\Middle", "Alone", R_FAILED},
-                    Refused{"a_siblings_name_in_other_case", "Top\\Middle", "aLONE", R_FAILED},
-                    Refused{"its_own_name", "Top\\Middle", "Middle", R_FAILED},
-                    Refused{"its_own_name_in_other_case", "Top\\Middle", "MIDDLE", R_FAILED}),
-    [](const auto& row) { return row.param.rule; });
+INSTANTIATE_TEST_SUITE_P(Rows, RenameRefused,
+                         testing::Values(Refused{"empty", "Top\\Middle", "", R_INVALID_PARAMETER},
+                                         Refused{"a_backslash", "Top\\Middle", "a\\b", R_INVALID_PARAMETER},
+                                         Refused{"a_siblings_name", "Top\\Middle", "Alone", R_FAILED},
+                                         Refused{"a_siblings_name_in_other_case", "Top\\Middle", "aLONE", R_FAILED},
+                                         Refused{"its_own_name", "Top\\Middle", "Middle", R_FAILED},
+                                         Refused{"its_own_name_in_other_case", "Top\\Middle", "MIDDLE", R_FAILED}),
+                         [](const auto& row) { return row.param.rule; });
 
 TEST_F(Moving, a_rename_past_the_end_gives_3_and_a_null_name_87) {
     EXPECT_EQ(RRenameKey(scene.root(), 1, "x"), R_PATH_NOT_FOUND);
@@ -124,8 +123,7 @@ TEST_F(Moving, a_rename_below_an_index_root_works_in_every_leaf_kind) {
         for (const char* name : {"a", "c", "e", "g", "i", "k"})
             many.add(name).add("below");
         Scene other(layout);
-        const std::pair<const char*, const char*> renames[] = {
-            {"many\\a", "z"}, {"many\\k", "b"}, {"many\\e", "d"}};
+        const std::pair<const char*, const char*> renames[] = {{"many\\a", "z"}, {"many\\k", "b"}, {"many\\e", "d"}};
         for (const auto& [path, name] : renames) {
             EXPECT_EQ(other.Rename(path, name), 0) << path;
             EXPECT_EQ(other.Check(), "") << path;
@@ -211,7 +209,7 @@ TEST_F(Moving, a_tree_deleted_leaf_by_leaf_is_gone_and_its_place_can_be_used_aga
         EXPECT_EQ(scene.Check(), "") << path;
     }
     EXPECT_EQ(scene.Delete("Top\\Middle"), 0);
-    EXPECT_EQ(scene.Check(2 + 4 + 1), ""); // every other record, the data cells, the class
+    EXPECT_EQ(scene.Check(2 + 4 + 1), "");  // every other record, the data cells, the class
     EXPECT_EQ(scene.Create("Top\\Middle\\Child1"), 0);
     EXPECT_EQ(scene.Check(2 + 4 + 1), "");
 }
@@ -240,4 +238,4 @@ TEST_F(Moving, every_cut_of_a_rename_opens_and_keeps_what_it_did_not_name) {
     }
 }
 
-} // namespace
+}  // namespace

@@ -13,9 +13,7 @@ using namespace testkit;
 
 namespace {
 
-engine::Store& store_of(Scene& scene) {
-    return *scene.root()->store;
-}
+engine::Store& store_of(Scene& scene) { return *scene.root()->store; }
 
 // Sizes of a bin's cells, negative for used ones, from the bin's first.
 std::vector<int32_t> cells(const Bytes& bytes, uint32_t bin) {
@@ -52,7 +50,7 @@ TEST(Allocator, a_request_of_4052_bytes_on_a_full_hive_appends_a_bin_of_4096) {
     layout.no_free_space = true;
     Scene scene(layout);
     const uint32_t before = get32(scene.bytes(), 40);
-    engine::allocate(store_of(scene), 4052); // a cell of 4056, and 36
+    engine::allocate(store_of(scene), 4052);  // a cell of 4056, and 36
     EXPECT_EQ(get32(scene.bytes(), 4096 + uint64_t{before} + 8), 4096U);
     EXPECT_EQ(scene.Check(1), "");
 }
@@ -115,9 +113,7 @@ protected:
         return layout;
     }
     AllocatorRow() : scene(layout()), row(scene) {}
-    bool free_cell(uint32_t offset) {
-        return engine::free_cell(store_of(scene), engine::cell_offset(offset));
-    }
+    bool free_cell(uint32_t offset) { return engine::free_cell(store_of(scene), engine::cell_offset(offset)); }
     std::vector<int32_t> sizes() const { return cells(scene.bytes(), row.bin); }
 
     Scene scene;
@@ -194,8 +190,7 @@ protected:
     Window() : scene(layout()) {}
     uint32_t read(int64_t position, uint32_t length) {
         Bytes buffer(length);
-        const uint32_t got =
-            engine::read_at(store_of(scene), engine::sig_none, position, buffer.data(), length);
+        const uint32_t got = engine::read_at(store_of(scene), engine::sig_none, position, buffer.data(), length);
         const auto first = scene.bytes().begin() + static_cast<std::ptrdiff_t>(position);
         EXPECT_TRUE(std::equal(buffer.begin(), buffer.begin() + static_cast<std::ptrdiff_t>(got), first));
         return got;
@@ -238,18 +233,17 @@ TEST_F(Window, a_write_into_it_makes_the_next_read_come_from_the_file) {
 
 TEST_F(Window, a_record_at_the_very_end_of_the_file_is_read_as_far_as_it_goes) {
     EXPECT_EQ(read(static_cast<int64_t>(scene.bytes().size()) - 10, 20), 10U);
-    EXPECT_EQ(engine::read_at(store_of(scene), engine::sig_none,
-                              static_cast<int64_t>(scene.bytes().size()) + 5000, nullptr, 4),
+    EXPECT_EQ(engine::read_at(store_of(scene), engine::sig_none, static_cast<int64_t>(scene.bytes().size()) + 5000,
+                              nullptr, 4),
               0U);
 }
 
 TEST_F(Window, a_key_record_one_byte_too_long_is_written_without_that_byte_and_two_are_refused) {
     const uint32_t root = get32(scene.bytes(), 36);
     const auto first = scene.bytes().begin() + 4100 + static_cast<std::ptrdiff_t>(root);
-    Bytes record(first, first + 76 + 4 + 2); // named ROOT
+    Bytes record(first, first + 76 + 4 + 2);  // named ROOT
     const auto write = [&](uint32_t length) {
-        return engine::write_at(store_of(scene), engine::sig_key, 4100 + int64_t{root}, record.data(),
-                                length);
+        return engine::write_at(store_of(scene), engine::sig_key, 4100 + int64_t{root}, record.data(), length);
     };
     EXPECT_EQ(write(81), 80U);
     EXPECT_EQ(write(82), 0U);
@@ -259,4 +253,4 @@ TEST_F(Window, a_key_record_one_byte_too_long_is_written_without_that_byte_and_t
     EXPECT_TRUE(scene.Untouched());
 }
 
-} // namespace
+}  // namespace

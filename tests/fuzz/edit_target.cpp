@@ -81,7 +81,7 @@ void run_script(RegistryKey* root, Script& script) {
     }
 }
 
-} // namespace
+}  // namespace
 
 void fuzz::edit_input(const uint8_t* data, size_t size) {
     if (size < script_size)

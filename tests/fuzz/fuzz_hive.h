@@ -22,4 +22,4 @@ constexpr size_t script_size = 64;
 // Reads everything below an open key: at most as many keys as a hive of so many bytes can hold.
 void read_everything(RegistryKey* root, size_t hive_size);
 
-} // namespace fuzz
+}  // namespace fuzz

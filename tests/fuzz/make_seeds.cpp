@@ -31,7 +31,7 @@ KeyLayout& fill(KeyLayout& key) {
     return key;
 }
 
-} // namespace
+}  // namespace
 
 int main(int argc, char** argv) {
     if (argc != 2) {

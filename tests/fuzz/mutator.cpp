@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// Breaks fields of records and mends what the gate looks at, so that an input gets past it: signature, size, bin headers
-// and checksum.
+// Breaks fields of records and mends what the gate looks at, so that an input gets past it: signature, size, bin
+// headers and checksum.
 #include <cstddef>
 #include <cstdint>
 #include <cstring>
@@ -27,7 +27,8 @@ void put(uint8_t* data, size_t at, uint32_t n) {
 
 // Puts a number that such fields go wrong with, or another record's offset, into a word of a random used cell.
 void break_field(uint8_t* data, size_t size, std::mt19937& random) {
-    static const uint32_t numbers[] = {0, 1, 2, 3, 7, 8, 0xFFFF, 0x10000, 0x7FFFFFFF, 0x80000000, 0x80000004, 0xFFFFFFFF};
+    static const uint32_t numbers[] = {0,      1,       2,          3,          7,          8,
+                                       0xFFFF, 0x10000, 0x7FFFFFFF, 0x80000000, 0x80000004, 0xFFFFFFFF};
     if (size < base_size + 64)
         return;
     const size_t words = (size - base_size) / 4;
@@ -70,7 +71,7 @@ void mend(uint8_t* data, size_t size) {
     put(data, 508, sum == 0xFFFFFFFF ? 0xFFFFFFFE : sum == 0 ? 1 : sum);
 }
 
-} // namespace
+}  // namespace
 
 extern "C" size_t LLVMFuzzerCustomMutator(uint8_t* data, size_t size, size_t max_size, unsigned int seed) {
     std::mt19937 random(seed);

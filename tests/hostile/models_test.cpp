@@ -183,8 +183,8 @@ private slots:
         QVERIFY(search_in_vain(mounted));
         QVERIFY(mounted.file.bytes() == hive.bytes);
         // A key whose name is longer than the buffer for it cannot be shown.
-        const bool too_long = entry.name == "key_name_of_600_characters" ||
-                              entry.name == "key_name_of_700_characters_in_utf16";
+        const bool too_long =
+            entry.name == "key_name_of_600_characters" || entry.name == "key_name_of_700_characters_in_utf16";
         if (entry.readable == Readable::whole)
             QCOMPARE(mounted.thrown > 0, too_long);
 

@@ -91,7 +91,7 @@ void expect_below(const testkit::Key& key, const QString& path, int depth, const
         expect_below(child, path + QLatin1Char('/') + QString::fromStdU16String(child.name), depth + 1, term, hits);
 }
 
-} // namespace
+}  // namespace
 
 class FindTest : public QObject {
     Q_OBJECT
@@ -143,9 +143,7 @@ private slots:
         QCOMPARE(searched.all(QStringLiteral("run"), {}), QStringList());
     }
 
-    void an_empty_term_matches_every_name() {
-        QCOMPARE(Searched().all(QString(), RegModel::FindKeys).size(), 7);
-    }
+    void an_empty_term_matches_every_name() { QCOMPARE(Searched().all(QString(), RegModel::FindKeys).size(), 7); }
 
     // The flag is looked at after the tenth frame, and then after every eleventh.
     void a_stopped_search_ends_within_eleven_frames() {
@@ -237,8 +235,8 @@ private slots:
         laid.put16(laid.at("Key").values[1].record, 2, 1);
         Searched searched(laid.bytes);
         const QStringList hits = searched.all(QStringLiteral("zed"), RegModel::FindValues);
-        RegKey* shown = searched.model.editable_key(searched.model.index(
-            0, 0, searched.model.index(0, 0, searched.model.index(0, 0))));
+        RegKey* shown = searched.model.editable_key(
+            searched.model.index(0, 0, searched.model.index(0, 0, searched.model.index(0, 0))));
         ValuesModel source(shown);
         ValuesProxyModel table;
         table.setSourceModel(&source);

@@ -55,7 +55,7 @@ struct Mounted {
 
 const QString control = QStringLiteral("MACHINE/SYSTEM/Control");
 
-} // namespace
+}  // namespace
 
 class RegModelTest : public QObject {
     Q_OBJECT
@@ -68,8 +68,8 @@ private slots:
         const QModelIndex zz = mounted.at(control + QStringLiteral("/zz"));
         QVERIFY(mounted.model.setData(zz, QStringLiteral("zzz"), Qt::EditRole));
         QVERIFY(mounted.model.removeRows(zz.row(), 1, zz.parent()));
-        // No new key here: only the hive knows the row that it gets, so the model announces a row that is there already,
-        // which the tester objects to.
+        // No new key here: only the hive knows the row that it gets, so the model announces a row that is there
+        // already, which the tester objects to.
     }
 
     void two_groups_with_two_hives_each() {
@@ -129,8 +129,7 @@ private slots:
         Mounted mounted;
         const testkit::Bytes before = mounted.file.bytes();
         RegModel& model = mounted.model;
-        for (const QString& path :
-             {QStringLiteral("MACHINE"), QStringLiteral("MACHINE/SYSTEM"), QString(control)}) {
+        for (const QString& path : {QStringLiteral("MACHINE"), QStringLiteral("MACHINE/SYSTEM"), QString(control)}) {
             const QModelIndex index = mounted.at(path);
             QVERIFY(!model.setData(index, QStringLiteral("new"), Qt::EditRole));
             QVERIFY(!model.removeRows(index.row(), 1, index.parent()));
@@ -191,9 +190,8 @@ private slots:
         const QModelIndex branch = mounted.at(control + QStringLiteral("/branch"));
         mounted.at(control + QStringLiteral("/branch/deep/deeper/deepest"));
         QStringList order;
-        connect(&mounted.model, &QAbstractItemModel::rowsRemoved, this, [&](const QModelIndex& parent) {
-            order.append(parent.data().toString());
-        });
+        connect(&mounted.model, &QAbstractItemModel::rowsRemoved, this,
+                [&](const QModelIndex& parent) { order.append(parent.data().toString()); });
         QVERIFY(mounted.model.removeRows(branch.row(), 1, branch.parent()));
         QCOMPARE(order, QStringList({QStringLiteral("branch"), QStringLiteral("deeper"), QStringLiteral("deep"),
                                      QStringLiteral("branch"), QStringLiteral("Control")}));

@@ -36,7 +36,7 @@ struct Opened {
     QString text(int row, int column) { return model.index(row, column).data().toString(); }
 };
 
-} // namespace
+}  // namespace
 
 class ValuesModelTest : public QObject {
     Q_OBJECT
@@ -168,8 +168,8 @@ private slots:
         // Without the empty string, and then with one where none can be stored.
         QVERIFY(model.setData(cell, QStringList({QStringLiteral("a"), QStringLiteral("b")}), Qt::DisplayRole));
         QCOMPARE(file.stored("Key", "list"), QByteArray("a\0\0\0b\0\0\0\0\0", 10));
-        QVERIFY(model.setData(cell, QStringList({QStringLiteral("a"), QString(), QStringLiteral("c")}),
-                              Qt::DisplayRole));
+        QVERIFY(
+            model.setData(cell, QStringList({QStringLiteral("a"), QString(), QStringLiteral("c")}), Qt::DisplayRole));
         QCOMPARE(file.stored("Key", "list"), QByteArray("a\0\0\0c\0\0\0\0\0", 10));
     }
 

@@ -8,8 +8,8 @@
 #include "values_proxy_model.h"
 
 #include <QAbstractItemModelTester>
-#include <QSignalSpy>
 #include <QHeaderView>
+#include <QSignalSpy>
 #include <QTableView>
 #include <QTest>
 
@@ -61,7 +61,7 @@ QStringList list(std::initializer_list<const char*> names) {
     return all;
 }
 
-} // namespace
+}  // namespace
 
 class ValuesProxyModelTest : public QObject {
     Q_OBJECT

@@ -20,8 +20,7 @@ public:
     explicit HiveOnDisk(const testkit::Bytes& bytes) {
         QFile file(path());
         const auto size = static_cast<qint64>(bytes.size());
-        if (!file.open(QIODevice::WriteOnly) ||
-            file.write(reinterpret_cast<const char*>(bytes.data()), size) != size)
+        if (!file.open(QIODevice::WriteOnly) || file.write(reinterpret_cast<const char*>(bytes.data()), size) != size)
             qFatal("the hive cannot be written");
     }
 

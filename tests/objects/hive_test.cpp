@@ -42,8 +42,8 @@ QStringList other_paths(const QString& path) {
     const QString hard = path + QStringLiteral("-hard");
     symlink(QFile::encodeName(path).constData(), QFile::encodeName(soft).constData());
     link(QFile::encodeName(path).constData(), QFile::encodeName(hard).constData());
-    return {soft, hard, file.path() + QStringLiteral("/.//") + file.fileName(),
-            QDir::current().relativeFilePath(path), QStringLiteral("/proc/self/root") + path};
+    return {soft, hard, file.path() + QStringLiteral("/.//") + file.fileName(), QDir::current().relativeFilePath(path),
+            QStringLiteral("/proc/self/root") + path};
 }
 
 // How many descriptors of this process lead to a file.
@@ -56,7 +56,7 @@ int open_descriptors(const QString& path) {
     return count;
 }
 
-} // namespace
+}  // namespace
 
 class HiveTest : public QObject {
     Q_OBJECT

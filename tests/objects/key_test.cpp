@@ -47,7 +47,9 @@ struct Opened {
             all.append(parent->child(i)->name());
         return all;
     }
-    static int row(AbstractRegKey* parent, const QString& name) { return static_cast<int>(names(parent).indexOf(name)); }
+    static int row(AbstractRegKey* parent, const QString& name) {
+        return static_cast<int>(names(parent).indexOf(name));
+    }
 };
 
 template <typename Thrown, typename Call>
@@ -60,7 +62,7 @@ QString thrown(Call call) {
     return QString();
 }
 
-} // namespace
+}  // namespace
 
 class KeyTest : public QObject {
     Q_OBJECT
@@ -69,7 +71,7 @@ private slots:
     // Two objects then stand for one key: what is made through the one moves what the other shows.
     void a_key_that_lists_itself_changes_no_other_subkey_than_the_one_it_shows() {
         testkit::LaidHive laid = testkit::lay_out(layout());
-        laid.put32(laid.at("Parent").index, 4 + 8 * 4, laid.at("Parent").record); // for the last of the five
+        laid.put32(laid.at("Parent").index, 4 + 8 * 4, laid.at("Parent").record);  // for the last of the five
         const HiveOnDisk file(laid.bytes);
         DummyRegKey top(QStringLiteral("TOP"));
         RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
@@ -188,8 +190,8 @@ private slots:
         QCOMPARE(parent->new_key(), 2);
         QVERIFY(parent->delete_key(1));
         QCOMPARE(parent->new_key(), 1);
-        QCOMPARE(Opened::names(parent),
-                 QStringList({QStringLiteral("New Key #1"), QStringLiteral("New Key #2"), QStringLiteral("New Key #3")}));
+        QCOMPARE(Opened::names(parent), QStringList({QStringLiteral("New Key #1"), QStringLiteral("New Key #2"),
+                                                     QStringLiteral("New Key #3")}));
         QCOMPARE(opened.file.faults(), std::string());
     }
 

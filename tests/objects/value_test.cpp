@@ -74,7 +74,7 @@ struct Opened {
     std::unique_ptr<RegValue> read(const QString& name) { return key()->read_value(row(key(), name)); }
 };
 
-} // namespace
+}  // namespace
 
 class ValueTest : public QObject {
     Q_OBJECT
@@ -132,8 +132,8 @@ private slots:
 
     void empty_strings_of_a_list_are_dropped() {
         Opened opened;
-        QVERIFY(opened.key()->set_multi_string_value(
-            QStringLiteral("list"), {QStringLiteral("a"), QString(), QStringLiteral("b")}));
+        QVERIFY(opened.key()->set_multi_string_value(QStringLiteral("list"),
+                                                     {QStringLiteral("a"), QString(), QStringLiteral("b")}));
         QCOMPARE(opened.file.stored("Key", "list"),
                  utf16(QStringLiteral("a") + zero + QStringLiteral("b") + zero + zero));
     }
@@ -201,12 +201,16 @@ private slots:
     void renames_that_are_refused_change_nothing_data() {
         QTest::addColumn<QString>("old_name");
         QTest::addColumn<QString>("new_name");
-        QTest::newRow("a name that is taken") << "qword" << "AB";
-        QTest::newRow("its own name in another case") << "qword" << "QWORD";
-        QTest::newRow("no name") << "qword" << "";
+        QTest::newRow("a name that is taken") << "qword"
+                                              << "AB";
+        QTest::newRow("its own name in another case") << "qword"
+                                                      << "QWORD";
+        QTest::newRow("no name") << "qword"
+                                 << "";
         QTest::newRow("16384 characters") << "qword" << QString(16384, QLatin1Char('x'));
         QTest::newRow("a character that 8 bits do not carry") << "qword" << QStringLiteral("\u4e2d");
-        QTest::newRow("data that cannot be read") << "wrong dword" << "other";
+        QTest::newRow("data that cannot be read") << "wrong dword"
+                                                  << "other";
     }
     void renames_that_are_refused_change_nothing() {
         QFETCH(QString, old_name);

@@ -20,4 +20,4 @@ Contents contents(RegistryKey* key, const std::string& path, std::string& why);
 // The same for a whole hive, opened for it. Empty, with why set, when it does not open.
 Contents contents(const Bytes& bytes, std::string& why);
 
-} // namespace testkit
+}  // namespace testkit

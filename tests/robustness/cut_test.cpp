@@ -28,8 +28,7 @@ void check_every_state(const Bytes& start, const std::vector<Operation>& operati
         ASSERT_EQ(why, "");
         ASSERT_NE(before, after);
         for (size_t i = 0; i < cuts.size(); i++)
-            EXPECT_EQ(harm(operation, before, &after, cuts[i]), "")
-                << "after write " << i + 1 << " of " << cuts.size();
+            EXPECT_EQ(harm(operation, before, &after, cuts[i]), "") << "after write " << i + 1 << " of " << cuts.size();
     }
 }
 
@@ -64,4 +63,4 @@ TEST_P(Cuts, EveryStateKeepsBinsAndCellsInOrder) {
 INSTANTIATE_TEST_SUITE_P(HiveKinds, Cuts, testing::Values(Leaf::fast, Leaf::hash),
                          [](const auto& kind) { return kind.param == Leaf::fast ? "lf" : "lh"; });
 
-} // namespace
+}  // namespace

@@ -86,8 +86,7 @@ void compare_next_changes(const Expectation& expected, Scene& scene) {
     const std::vector<int32_t> statuses = probe(scene.root());
     EXPECT_EQ(statuses, probe(fresh.root()));
     EXPECT_EQ(statuses, std::vector<int32_t>(statuses.size(), R_SUCCESS)) << "after the failure";
-    EXPECT_TRUE(scene.bytes() == fresh.bytes())
-        << "the next changes go to other places than after a fresh opening";
+    EXPECT_TRUE(scene.bytes() == fresh.bytes()) << "the next changes go to other places than after a fresh opening";
     EXPECT_EQ(harm(with_probe(expected.operation), expected.before, nullptr, scene.bytes()), "");
 }
 
@@ -111,9 +110,7 @@ struct Mode {
     bool shortened;
 };
 
-void PrintTo(const Mode& mode, std::ostream* out) {
-    *out << mode.name;
-}
+void PrintTo(const Mode& mode, std::ostream* out) { *out << mode.name; }
 
 // Fails the calls of each change in turn; gives how often one failed.
 uint64_t sweep(const std::vector<Expectation>& all, const Mode& mode) {
@@ -156,18 +153,15 @@ TEST_P(Faults, NothingElseIsHarmedInRealHives) {
     }
 }
 
-INSTANTIATE_TEST_SUITE_P(Calls, Faults,
-                         testing::Values(Mode{"ReadOnce", Call::read, false, false},
-                                         Mode{"ReadFromThereOn", Call::read, true, false},
-                                         Mode{"ReadShort", Call::read, false, true},
-                                         Mode{"ReadShortFromThereOn", Call::read, true, true},
-                                         Mode{"WriteOnce", Call::write, false, false},
-                                         Mode{"WriteFromThereOn", Call::write, true, false},
-                                         Mode{"WriteShort", Call::write, false, true},
-                                         Mode{"WriteShortFromThereOn", Call::write, true, true},
-                                         Mode{"SeekOnce", Call::seek, false, false},
-                                         Mode{"SeekFromThereOn", Call::seek, true, false}),
-                         [](const auto& mode) { return mode.param.name; });
+INSTANTIATE_TEST_SUITE_P(
+    Calls, Faults,
+    testing::Values(Mode{"ReadOnce", Call::read, false, false}, Mode{"ReadFromThereOn", Call::read, true, false},
+                    Mode{"ReadShort", Call::read, false, true}, Mode{"ReadShortFromThereOn", Call::read, true, true},
+                    Mode{"WriteOnce", Call::write, false, false}, Mode{"WriteFromThereOn", Call::write, true, false},
+                    Mode{"WriteShort", Call::write, false, true},
+                    Mode{"WriteShortFromThereOn", Call::write, true, true}, Mode{"SeekOnce", Call::seek, false, false},
+                    Mode{"SeekFromThereOn", Call::seek, true, false}),
+    [](const auto& mode) { return mode.param.name; });
 
 class AllocationFaultSweep : public testing::TestWithParam<bool> {};
 
@@ -201,7 +195,7 @@ INSTANTIATE_TEST_SUITE_P(Once, AllocationFaultSweep, testing::Values(false, true
 // The walk that follows a write finds out what is free in the bin. When it fails, that is made up for later,
 // or the next change would append a bin although there is room.
 TEST(FailedWalk, TheBinsFreeSpaceIsUsedAgain) {
-    HiveLayout layout; // all that is free lies in a bin of its own
+    HiveLayout layout;  // all that is free lies in a bin of its own
     layout.root.add("Key").set("inline", 4, pattern(4));
     layout.no_free_space = true;
     layout.free_bytes = 2000;
@@ -266,4 +260,4 @@ TEST(FullDisk, RefusesTheValueAndKeepsTheHive) {
     }
 }
 
-} // namespace
+}  // namespace

@@ -14,13 +14,9 @@ namespace {
 
 using Change = std::function<int32_t(RegistryKey*)>;
 
-std::string below(const std::string& path, const std::string& name) {
-    return path.empty() ? name : path + "\\" + name;
-}
+std::string below(const std::string& path, const std::string& name) { return path.empty() ? name : path + "\\" + name; }
 
-std::string first_component(const std::string& path) {
-    return path.substr(0, path.find('\\'));
-}
+std::string first_component(const std::string& path) { return path.substr(0, path.find('\\')); }
 
 Operation create(const std::string& what, const std::string& path, const std::string& name) {
     const Change change = [name](RegistryKey* key) {
@@ -30,8 +26,7 @@ Operation create(const std::string& what, const std::string& path, const std::st
     return {what, path, change, {below(path, first_component(name))}};
 }
 
-Operation set(const std::string& what, const std::string& path, const std::string& name, uint32_t type,
-              size_t size) {
+Operation set(const std::string& what, const std::string& path, const std::string& name, uint32_t type, size_t size) {
     const Change change = [=](RegistryKey* key) {
         const Bytes data = pattern(size, 77);
         return RSetValueExW(key, name.c_str(), type, data.data(), static_cast<uint32_t>(data.size()));
@@ -40,15 +35,11 @@ Operation set(const std::string& what, const std::string& path, const std::strin
 }
 
 Operation remove_value(const std::string& what, const std::string& path, const std::string& name) {
-    return {what,
-            path,
-            [name](RegistryKey* key) { return RDeleteValue(key, name.c_str()); },
-            {path + "|" + name}};
+    return {what, path, [name](RegistryKey* key) { return RDeleteValue(key, name.c_str()); }, {path + "|" + name}};
 }
 
 Operation remove_key(const std::string& what, const std::string& path, const std::string& name) {
-    return {
-        what, path, [name](RegistryKey* key) { return RDeleteKey(key, name.c_str()); }, {below(path, name)}};
+    return {what, path, [name](RegistryKey* key) { return RDeleteKey(key, name.c_str()); }, {below(path, name)}};
 }
 
 Operation rename(const std::string& what, const std::string& path, const std::string& old_name,
@@ -70,7 +61,7 @@ void fill(KeyLayout& key) {
     key.set("last", 1, text_data("text"));
 }
 
-} // namespace
+}  // namespace
 
 HiveLayout operation_layout(Leaf leaf) {
     HiveLayout layout;
@@ -145,17 +136,12 @@ namespace {
 
 // Names that the calls take as they are shown.
 bool is_plain(const std::u16string& name) {
-    return !name.empty() &&
-           std::all_of(name.begin(), name.end(), [](char16_t c) { return c > 0x20 && c < 0x7F; });
+    return !name.empty() && std::all_of(name.begin(), name.end(), [](char16_t c) { return c > 0x20 && c < 0x7F; });
 }
 
-std::string narrow(const std::u16string& text) {
-    return std::string(text.begin(), text.end());
-}
+std::string narrow(const std::u16string& text) { return std::string(text.begin(), text.end()); }
 
-bool is_plain_key(const Key& key) {
-    return key.name_8bit && is_plain(key.name);
-}
+bool is_plain_key(const Key& key) { return key.name_8bit && is_plain(key.name); }
 
 // Chooses what the changes are made on: for each kind the first that will do.
 class Choice {
@@ -218,21 +204,19 @@ private:
             const bool is_leaf = child.children.empty();
             add(rename, is_leaf ? "key renamed" : "key with subkeys renamed", path, name, "m other");
             if (is_leaf)
-                add(remove_key, child.values.empty() ? "empty key deleted" : "key with values deleted", path,
-                    name);
+                add(remove_key, child.values.empty() ? "empty key deleted" : "key with values deleted", path, name);
         }
     }
 };
 
-} // namespace
+}  // namespace
 
 namespace {
 
 bool is_named(const Operation& operation, const std::string& place) {
     return std::any_of(operation.named.begin(), operation.named.end(), [&](const std::string& name) {
         const bool begins = place.compare(0, name.size(), name) == 0;
-        return begins &&
-               (place.size() == name.size() || place[name.size()] == '\\' || place[name.size()] == '|');
+        return begins && (place.size() == name.size() || place[name.size()] == '\\' || place[name.size()] == '|');
     });
 }
 
@@ -241,10 +225,9 @@ bool holds(const Contents& contents, const std::string& place, const std::string
     return found != contents.end() && found->second == what;
 }
 
-} // namespace
+}  // namespace
 
-std::string harm(const Operation& operation, const Contents& before, const Contents* after,
-                 const Bytes& bytes) {
+std::string harm(const Operation& operation, const Contents& before, const Contents* after, const Bytes& bytes) {
     std::string text;
     const Contents now = contents(bytes, text);
     for (const auto& [place, what] : before) {
@@ -262,9 +245,7 @@ std::string harm(const Operation& operation, const Contents& before, const Conte
     return text;
 }
 
-std::vector<Operation> operations_on(const Bytes& hive) {
-    return Choice(read_hive(hive)).operations;
-}
+std::vector<Operation> operations_on(const Bytes& hive) { return Choice(read_hive(hive)).operations; }
 
 std::vector<std::pair<std::string, Bytes>> small_real_hives() {
     constexpr size_t wanted = 3;
@@ -278,4 +259,4 @@ std::vector<std::pair<std::string, Bytes>> small_real_hives() {
     return hives;
 }
 
-} // namespace testkit
+}  // namespace testkit

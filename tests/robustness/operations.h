@@ -15,7 +15,7 @@ namespace testkit {
 
 struct Operation {
     std::string name;
-    std::string key; // path of the key that the call is made on
+    std::string key;  // path of the key that the call is made on
     std::function<int32_t(RegistryKey* key)> change;
     // The keys ("PATH", with all below) and values ("PATH|NAME") that the call names: all else must stay as
     // it is.
@@ -37,7 +37,6 @@ std::vector<std::pair<std::string, Bytes>> small_real_hives();
 
 // What is not as it was, among what the operation does not name; and, unless after is null, what it does name
 // that is neither as before nor as after nor absent. Empty when all is well.
-std::string harm(const Operation& operation, const Contents& before, const Contents* after,
-                 const Bytes& bytes);
+std::string harm(const Operation& operation, const Contents& before, const Contents* after, const Bytes& bytes);
 
-} // namespace testkit
+}  // namespace testkit

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// Long random sessions against a model of what a key holds, the bytes checked after every step of a short one. TALLOWFEN_WALK_STEPS
-// makes them longer than the short ones of every test run.
+// Long random sessions against a model of what a key holds, the bytes checked after every step of a short one.
+// TALLOWFEN_WALK_STEPS makes them longer than the short ones of every test run.
 #include "operations.h"
 #include "real_hives.h"
 
@@ -255,4 +255,4 @@ TEST(RandomWalk, OnCopiesOfRealHives) {
     std::printf("random walks on %zu real hives of 3\n", walked);
 }
 
-} // namespace
+}  // namespace

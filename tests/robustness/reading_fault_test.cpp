@@ -20,13 +20,12 @@ using Call = MemoryFile::Call;
 class Transcript {
 public:
     void add(const char* call, int32_t status, const std::string& answer = {}) {
-        text_ += std::string(call) + " " + std::to_string(status) + " " +
-                 (status == R_SUCCESS ? answer : "") + "\n";
+        text_ += std::string(call) + " " + std::to_string(status) + " " + (status == R_SUCCESS ? answer : "") + "\n";
         if (!is_in_table(status))
             strange_ += std::string(call) + " " + std::to_string(status) + "\n";
     }
     const std::string& text() const { return text_; }
-    const std::string& strange() const { return strange_; } // statuses that no call may give
+    const std::string& strange() const { return strange_; }  // statuses that no call may give
 
 private:
     std::string text_;
@@ -48,14 +47,13 @@ void query_key(RegistryKey* key, Transcript& out) {
     uint32_t class_size = sizeof class_name;
     uint32_t n[6] = {};
     RegistryTime time = {};
-    int32_t status = RQueryInfoKeyA(key, name, &size, class_name, &class_size, &n[0], &n[1], &n[2], &n[3],
-                                    &n[4], &n[5], nullptr, &time);
+    int32_t status = RQueryInfoKeyA(key, name, &size, class_name, &class_size, &n[0], &n[1], &n[2], &n[3], &n[4], &n[5],
+                                    nullptr, &time);
     out.add("RQueryInfoKeyA", status, taken(name, size) + taken(n, sizeof n));
     uint32_t security = 0;
-    status = RQueryInfoKeyW(key, wide_name, &wide_size, nullptr, nullptr, &n[0], &n[1], &n[2], &n[3], &n[4],
-                            &n[5], &security, &time);
-    out.add("RQueryInfoKeyW", status,
-            taken(wide_name, wide_size) + taken(n, sizeof n) + std::to_string(security));
+    status = RQueryInfoKeyW(key, wide_name, &wide_size, nullptr, nullptr, &n[0], &n[1], &n[2], &n[3], &n[4], &n[5],
+                            &security, &time);
+    out.add("RQueryInfoKeyW", status, taken(wide_name, wide_size) + taken(n, sizeof n) + std::to_string(security));
 }
 
 void enumerate_keys(RegistryKey* key, Transcript& out) {
@@ -82,7 +80,7 @@ void enumerate_keys(RegistryKey* key, Transcript& out) {
 
 void enumerate_values(RegistryKey* key, Transcript& out) {
     std::vector<char> data(70000);
-    const auto room = static_cast<uint32_t>(data.size()); // a call may hand back the size of what did not fit
+    const auto room = static_cast<uint32_t>(data.size());  // a call may hand back the size of what did not fit
     for (uint32_t i = 0; i < 4; i++) {
         char name[600] = {};
         uint16_t wide_name[600] = {};
@@ -108,8 +106,7 @@ void enumerate_values(RegistryKey* key, Transcript& out) {
 
 // Two keys of a hive, held open, and every reading call on them.
 struct Reader {
-    Reader(const Bytes& bytes, std::string where)
-        : scene(bytes), path(std::move(where)), held(scene.OpenKey(path)) {}
+    Reader(const Bytes& bytes, std::string where) : scene(bytes), path(std::move(where)), held(scene.OpenKey(path)) {}
 
     Transcript read() {
         Transcript out;
@@ -171,9 +168,7 @@ struct Mode {
     bool shortened;
 };
 
-void PrintTo(const Mode& mode, std::ostream* out) {
-    *out << mode.name;
-}
+void PrintTo(const Mode& mode, std::ostream* out) { *out << mode.name; }
 
 void sweep(const std::vector<Place>& places, const Mode& mode) {
     for (const Place& place : places) {
@@ -200,22 +195,16 @@ void sweep(const std::vector<Place>& places, const Mode& mode) {
 
 class ReadingFaults : public testing::TestWithParam<Mode> {};
 
-TEST_P(ReadingFaults, HandlesAnswerAsBeforeAfterwards) {
-    sweep(made_places(), GetParam());
-}
+TEST_P(ReadingFaults, HandlesAnswerAsBeforeAfterwards) { sweep(made_places(), GetParam()); }
 
-TEST_P(ReadingFaults, HandlesOfRealHivesAnswerAsBeforeAfterwards) {
-    sweep(real_places(), GetParam());
-}
+TEST_P(ReadingFaults, HandlesOfRealHivesAnswerAsBeforeAfterwards) { sweep(real_places(), GetParam()); }
 
-INSTANTIATE_TEST_SUITE_P(Calls, ReadingFaults,
-                         testing::Values(Mode{"ReadOnce", Call::read, false, false},
-                                         Mode{"ReadFromThereOn", Call::read, true, false},
-                                         Mode{"ReadShort", Call::read, false, true},
-                                         Mode{"ReadShortFromThereOn", Call::read, true, true},
-                                         Mode{"SeekOnce", Call::seek, false, false},
-                                         Mode{"SeekFromThereOn", Call::seek, true, false}),
-                         [](const auto& mode) { return mode.param.name; });
+INSTANTIATE_TEST_SUITE_P(
+    Calls, ReadingFaults,
+    testing::Values(Mode{"ReadOnce", Call::read, false, false}, Mode{"ReadFromThereOn", Call::read, true, false},
+                    Mode{"ReadShort", Call::read, false, true}, Mode{"ReadShortFromThereOn", Call::read, true, true},
+                    Mode{"SeekOnce", Call::seek, false, false}, Mode{"SeekFromThereOn", Call::seek, true, false}),
+    [](const auto& mode) { return mode.param.name; });
 
 TEST(ReadingWithoutMemory, HandlesAnswerAsBeforeAfterwards) {
     for (const Place& place : made_places()) {
@@ -260,8 +249,8 @@ TEST(ReadingFaults, AKeyWhoseListsTheDeviceFailsToReadIsNotOpenedEmpty) {
         const Handle key = scene.OpenKey("Flat\\alpha");
         if (key) {
             uint32_t values = 0;
-            RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, &values,
-                           nullptr, nullptr, nullptr, nullptr);
+            RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, &values, nullptr,
+                           nullptr, nullptr, nullptr);
             EXPECT_EQ(values, 4U) << "read " << nth;
         }
         if (!scene.file().failed())
@@ -269,4 +258,4 @@ TEST(ReadingFaults, AKeyWhoseListsTheDeviceFailsToReadIsNotOpenedEmpty) {
     }
 }
 
-} // namespace
+}  // namespace

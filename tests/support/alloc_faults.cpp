@@ -16,7 +16,7 @@ bool has_failed = false;
 uint64_t asked = 0;
 uint64_t failing = 0;
 uint64_t largest_request = 0;
-int64_t held = 0; // negative where more is freed than was taken since the count began
+int64_t held = 0;  // negative where more is freed than was taken since the count began
 int64_t most_held = 0;
 
 bool fails(size_t size) {
@@ -42,7 +42,7 @@ void given_back(void* block) {
         held -= static_cast<int64_t>(malloc_usable_size(block));
 }
 
-} // namespace
+}  // namespace
 
 extern "C" {
 
@@ -55,9 +55,7 @@ void* __wrap_calloc(size_t count, size_t size);
 void* __wrap_realloc(void* block, size_t size);
 void __wrap_free(void* block);
 
-void* __wrap_malloc(size_t size) {
-    return fails(size) ? nullptr : taken(__real_malloc(size));
-}
+void* __wrap_malloc(size_t size) { return fails(size) ? nullptr : taken(__real_malloc(size)); }
 void* __wrap_calloc(size_t count, size_t size) {
     return fails(count * size) ? nullptr : taken(__real_calloc(count, size));
 }
@@ -75,7 +73,7 @@ void __wrap_free(void* block) {
     __real_free(block);
 }
 
-} // extern "C"
+}  // extern "C"
 
 namespace testkit {
 
@@ -90,24 +88,14 @@ AllocationFaults::AllocationFaults(uint64_t nth, bool lasting) {
     active = true;
 }
 
-AllocationFaults::~AllocationFaults() {
-    active = false;
-}
+AllocationFaults::~AllocationFaults() { active = false; }
 
-uint64_t AllocationFaults::allocations() const {
-    return asked;
-}
+uint64_t AllocationFaults::allocations() const { return asked; }
 
-uint64_t AllocationFaults::largest() const {
-    return largest_request;
-}
+uint64_t AllocationFaults::largest() const { return largest_request; }
 
-uint64_t AllocationFaults::peak() const {
-    return static_cast<uint64_t>(most_held);
-}
+uint64_t AllocationFaults::peak() const { return static_cast<uint64_t>(most_held); }
 
-bool AllocationFaults::failed() const {
-    return has_failed;
-}
+bool AllocationFaults::failed() const { return has_failed; }
 
-} // namespace testkit
+}  // namespace testkit

@@ -18,10 +18,10 @@ public:
     AllocationFaults(const AllocationFaults&) = delete;
     AllocationFaults& operator=(const AllocationFaults&) = delete;
 
-    uint64_t allocations() const; // asked for so far
-    bool failed() const;          // whether one failed
-    uint64_t largest() const;     // bytes of the largest request
-    uint64_t peak() const;        // the most bytes that were allocated at one time since the count began
+    uint64_t allocations() const;  // asked for so far
+    bool failed() const;           // whether one failed
+    uint64_t largest() const;      // bytes of the largest request
+    uint64_t peak() const;         // the most bytes that were allocated at one time since the count began
 };
 
-} // namespace testkit
+}  // namespace testkit

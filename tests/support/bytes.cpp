@@ -79,4 +79,4 @@ Bytes read_file(const std::string& path) {
     return Bytes(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
 }
 
-} // namespace testkit
+}  // namespace testkit

@@ -12,8 +12,8 @@ namespace testkit {
 
 using Bytes = std::vector<uint8_t>;
 
-constexpr uint32_t none = 0xFFFFFFFF;       // a cell offset that leads nowhere
-constexpr uint32_t base_block_bytes = 4096; // where the first bin begins
+constexpr uint32_t none = 0xFFFFFFFF;        // a cell offset that leads nowhere
+constexpr uint32_t base_block_bytes = 4096;  // where the first bin begins
 
 // Whether n bytes from position lie in bytes.
 inline bool holds(const Bytes& bytes, uint64_t position, uint64_t n) {
@@ -51,4 +51,4 @@ std::u16string widen(const std::string& text);
 // A file's bytes; throws std::runtime_error when it cannot be read.
 Bytes read_file(const std::string& path);
 
-} // namespace testkit
+}  // namespace testkit

@@ -90,8 +90,7 @@ private:
         const Bytes name = encode(key.name, key.wide_name);
         const uint32_t cell = places.record = add_cell(76 + name.size());
         sign(cell, "nk");
-        hive_.put16(cell, 2,
-                    static_cast<uint16_t>(key.flags | (key.wide_name ? 0 : 0x20) | (root ? 0x0C : 0)));
+        hive_.put16(cell, 2, static_cast<uint16_t>(key.flags | (key.wide_name ? 0 : 0x20) | (root ? 0x0C : 0)));
         hive_.put32(cell, 4, static_cast<uint32_t>(key.time));
         hive_.put32(cell, 8, static_cast<uint32_t>(key.time >> 32));
         hive_.put32(cell, 16, parent == none ? 0 : parent);
@@ -192,9 +191,8 @@ private:
         for (const KeyLayout& child : key.children)
             order.push_back(&child);
         if (key.sorted)
-            std::stable_sort(order.begin(), order.end(), [](const KeyLayout* a, const KeyLayout* b) {
-                return upper(a->name) < upper(b->name);
-            });
+            std::stable_sort(order.begin(), order.end(),
+                             [](const KeyLayout* a, const KeyLayout* b) { return upper(a->name) < upper(b->name); });
         const Leaf kind = key.own_leaf ? key.leaf : layout_.leaf;
         const size_t per_leaf = key.per_leaf == 0 ? order.size() : key.per_leaf;
         std::vector<uint32_t> offsets;
@@ -205,16 +203,15 @@ private:
             longest = std::max(longest, static_cast<uint32_t>(child->name.size() * 2));
         }
         for (size_t first = 0; first < order.size(); first += per_leaf)
-            places.leaves.push_back(
-                lay_leaf(kind, order, offsets, first, std::min(order.size(), first + per_leaf)));
+            places.leaves.push_back(lay_leaf(kind, order, offsets, first, std::min(order.size(), first + per_leaf)));
         places.index = key.per_leaf == 0 ? places.leaves.front() : lay_index_root(places.leaves);
         hive_.put32(cell, 20, static_cast<uint32_t>(order.size()));
         hive_.put32(cell, 28, places.index);
         hive_.put32(cell, 52, longest);
     }
 
-    uint32_t lay_leaf(Leaf kind, const std::vector<const KeyLayout*>& keys,
-                      const std::vector<uint32_t>& offsets, size_t first, size_t last) {
+    uint32_t lay_leaf(Leaf kind, const std::vector<const KeyLayout*>& keys, const std::vector<uint32_t>& offsets,
+                      size_t first, size_t last) {
         const uint32_t width = kind == Leaf::plain ? 4 : 8;
         const uint32_t leaf = add_cell(4 + (last - first) * width);
         sign(leaf, kind == Leaf::plain ? "li" : kind == Leaf::hash ? "lh" : "lf");
@@ -281,12 +278,12 @@ private:
     LaidHive hive_;
     uint32_t bin_ = 0;
     uint32_t bin_size_ = 0;
-    uint32_t next_ = 0;    // where the next cell goes
-    uint32_t last_ = none; // the cell laid last
+    uint32_t next_ = 0;     // where the next cell goes
+    uint32_t last_ = none;  // the cell laid last
     std::map<size_t, uint32_t> references_;
 };
 
-} // namespace
+}  // namespace
 
 KeyLayout& KeyLayout::add(const std::string& child_name) {
     children.emplace_back();
@@ -302,9 +299,7 @@ ValueLayout& KeyLayout::set(const std::string& value_name, uint32_t value_type, 
     return values.back();
 }
 
-LaidHive lay_out(const HiveLayout& layout) {
-    return Builder(layout).build();
-}
+LaidHive lay_out(const HiveLayout& layout) { return Builder(layout).build(); }
 
 Bytes text_data(const std::string& text) {
     Bytes data;
@@ -322,4 +317,4 @@ Bytes pattern(size_t n, uint8_t seed) {
     return data;
 }
 
-} // namespace testkit
+}  // namespace testkit

@@ -12,13 +12,13 @@ namespace {
 constexpr size_t most_faults = 200;
 
 struct Cell {
-    uint64_t position = 0; // of the record, behind the size word
-    uint32_t room = 0;     // 0: no such cell
+    uint64_t position = 0;  // of the record, behind the size word
+    uint32_t room = 0;      // 0: no such cell
 };
 
 struct Index {
     std::vector<uint32_t> keys;
-    std::vector<std::pair<char, uint32_t>> marks; // 'f' hint, 'h' hash, 'i' none
+    std::vector<std::pair<char, uint32_t>> marks;  // 'f' hint, 'h' hash, 'i' none
 };
 
 class Checker {
@@ -62,8 +62,7 @@ private:
             const uint64_t at = base_block_bytes + bin;
             const uint32_t size = get32(bytes_, at + 8);
             if (get32(bytes_, at) != 0x6E696268 || get32(bytes_, at + 4) != bin)
-                return fault("bins", static_cast<uint32_t>(bin),
-                             "no bin here, or one that says it is elsewhere");
+                return fault("bins", static_cast<uint32_t>(bin), "no bin here, or one that says it is elsewhere");
             if (size == 0 || size % 4096 != 0 || size > size_ - bin)
                 return fault("bins", static_cast<uint32_t>(bin), "a bin of size " + std::to_string(size));
             check_cells(static_cast<uint32_t>(bin), size);
@@ -155,7 +154,7 @@ private:
         if (at == none)
             return;
         if (length == 0 && (at >= size_ || at % 8 != 0 || state_[at / 8] != used))
-            return; // a class of no length is no class
+            return;  // a class of no length is no class
         const Cell cell = reach(at, "class", offset, true);
         if (cell.room != 0 && cell.room < length)
             fault("class", offset, "the class is longer than its cell");
@@ -335,7 +334,7 @@ private:
             open.pop_back();
             const uint64_t p = base_block_bytes + uint64_t{offset} + 4;
             if (offset >= size_ || state_[offset / 8] != reached)
-                continue; // told already
+                continue;  // told already
             if (get32(bytes_, p + 12) != security_[offset])
                 fault("references", offset,
                       "security record says " + std::to_string(get32(bytes_, p + 12)) + " keys, there are " +
@@ -373,11 +372,11 @@ private:
     const Bytes& bytes_;
     CheckResult& result_;
     uint32_t size_ = 0;
-    std::vector<uint8_t> state_;            // by cell offset / 8; 0: no cell begins there
-    std::map<uint32_t, uint32_t> security_; // record -> keys that refer to it
+    std::vector<uint8_t> state_;             // by cell offset / 8; 0: no cell begins there
+    std::map<uint32_t, uint32_t> security_;  // record -> keys that refer to it
 };
 
-} // namespace
+}  // namespace
 
 CheckResult check_hive(const Bytes& bytes) {
     CheckResult result;
@@ -403,8 +402,6 @@ std::string text_of(const std::vector<Fault>& faults) {
     return lines;
 }
 
-std::string CheckResult::text() const {
-    return text_of(faults);
-}
+std::string CheckResult::text() const { return text_of(faults); }
 
-} // namespace testkit
+}  // namespace testkit

@@ -9,17 +9,17 @@
 namespace testkit {
 
 struct Fault {
-    std::string rule;    // short and fixed: "bins", "cells", "reach", "parent", "order", "hash", ...
-    uint32_t offset = 0; // cell offset of the record at fault (0 for the file as a whole)
+    std::string rule;     // short and fixed: "bins", "cells", "reach", "parent", "order", "hash", ...
+    uint32_t offset = 0;  // cell offset of the record at fault (0 for the file as a whole)
     std::string text;
 };
 
 // Cells in use that nothing leads to, told by the record that they begin with. The engine leaves some on
 // purpose.
 struct Leaks {
-    std::vector<uint32_t> values; // "vk" records
-    std::vector<uint32_t> keys;   // "nk" records
-    std::vector<uint32_t> others; // data, lists, indexes, classes
+    std::vector<uint32_t> values;  // "vk" records
+    std::vector<uint32_t> keys;    // "nk" records
+    std::vector<uint32_t> others;  // data, lists, indexes, classes
 
     size_t count() const { return values.size() + keys.size() + others.size(); }
 };
@@ -47,4 +47,4 @@ std::vector<Fault> new_faults(const CheckResult& before, const CheckResult& afte
 
 std::string text_of(const std::vector<Fault>& faults);
 
-} // namespace testkit
+}  // namespace testkit

@@ -31,8 +31,7 @@ std::map<Ordinal, const Value*> values_by_name(const Key& key) {
 }
 
 std::string describe(const Value& value) {
-    return " type " + std::to_string(value.type) + " data " +
-           (value.readable ? hex(value.data) : "unreadable");
+    return " type " + std::to_string(value.type) + " data " + (value.readable ? hex(value.data) : "unreadable");
 }
 
 bool same(const Value& a, const Value& b) {
@@ -45,8 +44,7 @@ void add_values(const char* sign, const std::string& path, const Key& key, std::
         lines.push_back(std::string(sign) + " value " + path + " : " + utf8(value.name) + describe(value));
 }
 
-void compare_values(const std::string& path, const Key& before, const Key& after,
-                    std::vector<std::string>& lines) {
+void compare_values(const std::string& path, const Key& before, const Key& after, std::vector<std::string>& lines) {
     const auto old_values = values_by_name(before);
     const auto new_values = values_by_name(after);
     for (const auto& [name, value] : old_values) {
@@ -62,17 +60,15 @@ void compare_values(const std::string& path, const Key& before, const Key& after
             lines.push_back("+ value " + path + " : " + utf8(name.first) + describe(*value));
 }
 
-void compare_keys(const std::string& path, const Key& before, const Key& after,
-                  std::vector<std::string>& lines) {
+void compare_keys(const std::string& path, const Key& before, const Key& after, std::vector<std::string>& lines) {
     if (before.flags != after.flags || before.time != after.time || before.stored_name != after.stored_name)
         lines.push_back("~ key " + path + ": flags, time or stored name");
     if (before.class_name != after.class_name)
-        lines.push_back("~ key " + path + ": class " + utf8(before.class_name) + " -> " +
-                        utf8(after.class_name));
+        lines.push_back("~ key " + path + ": class " + utf8(before.class_name) + " -> " + utf8(after.class_name));
     compare_values(path, before, after, lines);
 }
 
-} // namespace
+}  // namespace
 
 std::vector<std::string> diff(const Hive& before, const Hive& after) {
     std::vector<std::string> lines;
@@ -101,4 +97,4 @@ std::vector<std::string> diff(const Bytes& before, const Bytes& after) {
     return diff(read_hive(before), read_hive(after));
 }
 
-} // namespace testkit
+}  // namespace testkit

@@ -8,7 +8,7 @@
 namespace testkit {
 namespace {
 
-constexpr uint32_t deepest = 520; // levels; Windows makes 512
+constexpr uint32_t deepest = 520;  // levels; Windows makes 512
 constexpr uint32_t segment_bytes = 16344;
 
 // Where a record lies in the file and how many bytes its cell leaves it.
@@ -223,12 +223,12 @@ private:
     const Bytes& bytes_;
     Hive& hive_;
     uint64_t end_;
-    uint64_t data_budget_;  // bytes of data that may still be copied: values that share data cannot blow up
-    uint64_t entry_budget_; // list entries that may still be followed
+    uint64_t data_budget_;   // bytes of data that may still be copied: values that share data cannot blow up
+    uint64_t entry_budget_;  // list entries that may still be followed
     std::unordered_set<uint32_t> seen_;
 };
 
-} // namespace
+}  // namespace
 
 Hive read_hive(const Bytes& bytes) {
     Hive hive;
@@ -284,4 +284,4 @@ Totals count(const Hive& hive) {
     return totals;
 }
 
-} // namespace testkit
+}  // namespace testkit

@@ -9,35 +9,35 @@
 namespace testkit {
 
 struct Value {
-    uint32_t offset = none; // cell offset of the record
-    std::u16string name;    // decoded
+    uint32_t offset = none;  // cell offset of the record
+    std::u16string name;     // decoded
     Bytes stored_name;
     bool name_8bit = false;
     uint32_t type = 0;
-    uint32_t size = 0; // stored size without the inline bit
+    uint32_t size = 0;  // stored size without the inline bit
     bool is_inline = false;
-    bool readable = false; // data holds the size's worth of bytes
-    Bytes data;            // as stored; segments of big data put together
+    bool readable = false;  // data holds the size's worth of bytes
+    Bytes data;             // as stored; segments of big data put together
 };
 
 struct Key {
-    uint32_t offset = none; // cell offset of the record
-    std::u16string name;    // decoded
+    uint32_t offset = none;  // cell offset of the record
+    std::u16string name;     // decoded
     Bytes stored_name;
     bool name_8bit = false;
     uint16_t flags = 0;
-    uint32_t parent = none; // as the record says
+    uint32_t parent = none;  // as the record says
     uint64_t time = 0;
     uint32_t security = none;
     std::u16string class_name;
-    std::vector<Value> values; // in list order
-    std::vector<Key> children; // in index order
+    std::vector<Value> values;  // in list order
+    std::vector<Key> children;  // in index order
 };
 
 struct Hive {
-    bool sound_root = false; // a root key was read
+    bool sound_root = false;  // a root key was read
     Key root;
-    std::vector<std::string> complaints; // what could not be read, one line each
+    std::vector<std::string> complaints;  // what could not be read, one line each
 
     // The key at a path below the root ("" is the root), names compared with ASCII case ignored; null when
     // not there.
@@ -52,14 +52,14 @@ const Value* find_value(const Key& key, const std::string& name);
 Hive read_hive(const Bytes& bytes);
 
 struct FlatKey {
-    std::u16string path; // "" for the root, "A\B" below
+    std::u16string path;  // "" for the root, "A\B" below
     const Key* key;
 };
 // Every key of the hive, a key before its children. Points into the hive.
 std::vector<FlatKey> flatten(const Hive& hive);
 
 struct Totals {
-    size_t keys = 0; // the root included
+    size_t keys = 0;  // the root included
     size_t values = 0;
     size_t wide_keys = 0;
 };
@@ -70,4 +70,4 @@ Totals count(const Hive& hive);
 std::vector<std::string> diff(const Hive& before, const Hive& after);
 std::vector<std::string> diff(const Bytes& before, const Bytes& after);
 
-} // namespace testkit
+}  // namespace testkit

@@ -95,9 +95,7 @@ int32_t MemoryFile::write(void* device, const void* buffer, int32_t length) {
 
 namespace {
 
-int descriptor(void* device) {
-    return static_cast<int>(reinterpret_cast<intptr_t>(device));
-}
+int descriptor(void* device) { return static_cast<int>(reinterpret_cast<intptr_t>(device)); }
 int32_t seek_file(void* device, int32_t offset, int32_t whence) {
     return static_cast<int32_t>(::lseek(descriptor(device), offset, whence));
 }
@@ -108,7 +106,7 @@ int32_t write_file_part(void* device, const void* buffer, int32_t length) {
     return static_cast<int32_t>(::write(descriptor(device), buffer, static_cast<size_t>(length)));
 }
 
-} // namespace
+}  // namespace
 
 FileDevice::FileDevice(const std::string& path, bool writable)
     : fd_(::open(path.c_str(), (writable ? O_RDWR : O_RDONLY) | O_CLOEXEC)), writable_(writable) {
@@ -116,13 +114,11 @@ FileDevice::FileDevice(const std::string& path, bool writable)
         throw std::runtime_error("cannot open " + path);
 }
 
-FileDevice::~FileDevice() {
-    ::close(fd_);
-}
+FileDevice::~FileDevice() { ::close(fd_); }
 
 RegistryIo FileDevice::io() {
     return {reinterpret_cast<void*>(static_cast<intptr_t>(fd_)), seek_file, read_file_part,
             writable_ ? write_file_part : nullptr};
 }
 
-} // namespace testkit
+}  // namespace testkit

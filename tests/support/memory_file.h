@@ -18,9 +18,9 @@ public:
 
     struct Failure {
         Call call = Call::read;
-        uint64_t nth = 0;       // 1: the next one after arm; 0: never
-        bool lasting = false;   // every one from there on, else that one alone
-        bool shortened = false; // half the bytes are moved; else -1 and none. A seek always gives -1.
+        uint64_t nth = 0;        // 1: the next one after arm; 0: never
+        bool lasting = false;    // every one from there on, else that one alone
+        bool shortened = false;  // half the bytes are moved; else -1 and none. A seek always gives -1.
     };
 
     struct Counts {
@@ -45,14 +45,14 @@ public:
     void arm(const Failure& failure);
     void disarm() { arm({}); }
     const Counts& counts() const { return counts_; }
-    bool failed() const { return failed_; } // whether an armed failure struck since arm
+    bool failed() const { return failed_; }  // whether an armed failure struck since arm
 
     Bytes bytes;
-    bool read_only = false;         // io() gives no write callback
-    uint64_t capacity = 0x7FFFFFFF; // the file cannot grow beyond: a write stops short there
-    bool keep_cuts = false;         // a copy of bytes after every write goes to cuts
+    bool read_only = false;          // io() gives no write callback
+    uint64_t capacity = 0x7FFFFFFF;  // the file cannot grow beyond: a write stops short there
+    bool keep_cuts = false;          // a copy of bytes after every write goes to cuts
     std::vector<Bytes> cuts;
-    std::function<void(uint64_t position, uint64_t length)> on_write; // after the bytes have changed
+    std::function<void(uint64_t position, uint64_t length)> on_write;  // after the bytes have changed
 
 private:
     static int32_t seek(void* device, int32_t offset, int32_t whence);
@@ -81,4 +81,4 @@ private:
     bool writable_;
 };
 
-} // namespace testkit
+}  // namespace testkit

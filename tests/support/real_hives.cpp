@@ -16,7 +16,7 @@ std::vector<RealHive> real_hives() {
     const std::string directory = variable == nullptr ? "" : variable;
     std::ifstream index(directory + "/INDEX.tsv");
     std::string line;
-    std::getline(index, line); // the heading
+    std::getline(index, line);  // the heading
     while (!directory.empty() && std::getline(index, line)) {
         std::vector<std::string> fields;
         std::istringstream row(line);
@@ -24,12 +24,11 @@ std::vector<RealHive> real_hives() {
             fields.push_back(field);
         if (fields.size() < 5 || fields[3] == "-")
             continue;
-        hives.push_back(
-            {fields[0], directory + "/" + fields[0], std::stoul(fields[3]), std::stoul(fields[4])});
+        hives.push_back({fields[0], directory + "/" + fields[0], std::stoul(fields[3]), std::stoul(fields[4])});
     }
     if (hives.empty())
         printf("[ LEFT OUT ] every real hive: TALLOWFEN_HIVES names no directory with them\n");
     return hives;
 }
 
-} // namespace testkit
+}  // namespace testkit

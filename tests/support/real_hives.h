@@ -19,4 +19,4 @@ struct RealHive {
 // out when there is no such directory.
 std::vector<RealHive> real_hives();
 
-} // namespace testkit
+}  // namespace testkit

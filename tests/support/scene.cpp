@@ -52,9 +52,7 @@ int32_t Scene::Close() {
     return status;
 }
 
-bool Scene::Reopen() {
-    return Close() == 0 && Open();
-}
+bool Scene::Reopen() { return Close() == 0 && Open(); }
 
 void Scene::MarkBase() {
     base_ = bytes();
@@ -64,8 +62,7 @@ void Scene::MarkBase() {
 namespace {
 
 // The handle for a path: the root itself for "", which stays open.
-int32_t with_key(RegistryKey* root, const std::string& path,
-                 const std::function<int32_t(RegistryKey*)>& call) {
+int32_t with_key(RegistryKey* root, const std::string& path, const std::function<int32_t(RegistryKey*)>& call) {
     if (path.empty())
         return call(root);
     Handle key;
@@ -73,7 +70,7 @@ int32_t with_key(RegistryKey* root, const std::string& path,
     return status != 0 ? status : call(key.get());
 }
 
-} // namespace
+}  // namespace
 
 Handle Scene::OpenKey(const std::string& path) {
     Handle key;
@@ -140,4 +137,4 @@ std::vector<std::string> subkey_names(RegistryKey* key) {
     }
 }
 
-} // namespace testkit
+}  // namespace testkit

@@ -24,7 +24,7 @@ public:
 
     RegistryKey* get() const { return key_; }
     explicit operator bool() const { return key_ != nullptr; }
-    RegistryKey** out() { // closes what it holds and takes what a call puts there
+    RegistryKey** out() {  // closes what it holds and takes what a call puts there
         reset();
         return &key_;
     }
@@ -40,14 +40,14 @@ private:
 // and after Close the verbs must not be called.
 class Scene {
 public:
-    Scene() : Scene(HiveLayout{}) {} // a root without anything in it
+    Scene() : Scene(HiveLayout{}) {}  // a root without anything in it
     explicit Scene(const HiveLayout& layout);
     explicit Scene(Bytes bytes);
     ~Scene();
     Scene(const Scene&) = delete;
     Scene& operator=(const Scene&) = delete;
 
-    bool Open(); // true when a hive is open then
+    bool Open();  // true when a hive is open then
     int32_t Close();
     bool Reopen();
     bool is_open() const { return root_ != nullptr; }
@@ -55,7 +55,7 @@ public:
     MemoryFile& file() { return *file_; }
     const Bytes& bytes() const { return file_->bytes; }
 
-    Handle OpenKey(const std::string& path); // empty when it cannot be opened
+    Handle OpenKey(const std::string& path);  // empty when it cannot be opened
     int32_t Create(const std::string& path, uint32_t* disposition = nullptr);
     int32_t Set(const std::string& path, const std::string& name, uint32_t type, const Bytes& data);
     int32_t DeleteValue(const std::string& path, const std::string& name);
@@ -82,4 +82,4 @@ private:
 // The names of a hive's keys as the engine enumerates them, in order.
 std::vector<std::string> subkey_names(RegistryKey* key);
 
-} // namespace testkit
+}  // namespace testkit

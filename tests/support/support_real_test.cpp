@@ -29,9 +29,9 @@ TEST(SupportReal, the_checker_reaches_every_key_and_value_of_a_sound_hive) {
         const CheckResult result = check_hive(read_file(real.path));
         EXPECT_EQ(result.keys, real.keys);
         EXPECT_EQ(result.values, real.values);
-        printf("%s: %zu faults at rest, %zu cells that nothing leads to\n", real.name.c_str(),
-               result.faults.size(), result.leaks.count());
+        printf("%s: %zu faults at rest, %zu cells that nothing leads to\n", real.name.c_str(), result.faults.size(),
+               result.leaks.count());
     }
 }
 
-} // namespace
+}  // namespace

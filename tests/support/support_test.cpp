@@ -89,36 +89,35 @@ TEST_P(Broken, is_found) {
 
 INSTANTIATE_TEST_SUITE_P(
     Rules, Broken,
-    testing::Values(
-        Damage{"checksum", [](LaidHive& h) { h.put_base(4, 9); }},
-        Damage{"base", [](LaidHive& h) { h.bytes.resize(h.bytes.size() - 4096); }},
-        Damage{"bins", [](LaidHive& h) { set32(h.bytes, 4100, 4096); }},
-        Damage{"cells", [](LaidHive& h) { h.set_cell_size(h.at("Alpha").record, -12); }},
-        Damage{"free", [](LaidHive& h) { h.mark_free(h.at("Alpha").record); }},
-        Damage{"reach", [](LaidHive& h) { h.put32(h.at("Alpha").record, 40, 44); }},
-        Damage{"twice",
-               [](LaidHive& h) { h.put32(h.at("Alpha").value_list, 4, h.at("Alpha").values[0].record); }},
-        Damage{"record", [](LaidHive& h) { h.put16(h.at("Alpha").record, 0, 0x4141); }},
-        Damage{"name", [](LaidHive& h) { h.put16(h.at("Alpha").record, 72, 400); }},
-        Damage{"parent", [](LaidHive& h) { h.put32(h.at("Alpha").record, 16, 64); }},
-        Damage{"count", [](LaidHive& h) { h.put32(h.at("").record, 20, 2); }},
-        Damage{"maximum", [](LaidHive& h) { h.put32(h.at("Alpha").record, 60, 2); }},
-        Damage{"maximum", [](LaidHive& h) { h.put32(h.at("").record, 52, 2); }},
-        Damage{"maximum", [](LaidHive& h) { h.put32(h.at("Alpha").record, 64, 2); }},
-        Damage{"data", [](LaidHive& h) { h.put32(h.at("Alpha").values[1].record, 4, 0x80000005); }},
-        Damage{"data", [](LaidHive& h) { h.put32(h.at("Alpha\\Inner").values[0].record, 4, 70000); }},
-        Damage{"class", [](LaidHive& h) { h.put16(h.at("").record, 74, 400); }},
-        Damage{"index", [](LaidHive& h) { h.put16(h.at("").index, 0, 0x4141); }},
-        Damage{"hash", [](LaidHive& h) { h.put32(h.at("").index, 8, 5); }},
-        Damage{"order",
-               [](LaidHive& h) {
-                   const uint32_t leaf = h.at("many_keys").leaves[0];
-                   const uint32_t first = h.get32(leaf, 4);
-                   h.put32(leaf, 4, h.get32(leaf, 12));
-                   h.put32(leaf, 12, first);
-               }},
-        Damage{"references", [](LaidHive& h) { h.put32(h.security[0], 12, 3); }},
-        Damage{"ring", [](LaidHive& h) { h.put32(h.security[0], 8, none); }}),
+    testing::Values(Damage{"checksum", [](LaidHive& h) { h.put_base(4, 9); }},
+                    Damage{"base", [](LaidHive& h) { h.bytes.resize(h.bytes.size() - 4096); }},
+                    Damage{"bins", [](LaidHive& h) { set32(h.bytes, 4100, 4096); }},
+                    Damage{"cells", [](LaidHive& h) { h.set_cell_size(h.at("Alpha").record, -12); }},
+                    Damage{"free", [](LaidHive& h) { h.mark_free(h.at("Alpha").record); }},
+                    Damage{"reach", [](LaidHive& h) { h.put32(h.at("Alpha").record, 40, 44); }},
+                    Damage{"twice",
+                           [](LaidHive& h) { h.put32(h.at("Alpha").value_list, 4, h.at("Alpha").values[0].record); }},
+                    Damage{"record", [](LaidHive& h) { h.put16(h.at("Alpha").record, 0, 0x4141); }},
+                    Damage{"name", [](LaidHive& h) { h.put16(h.at("Alpha").record, 72, 400); }},
+                    Damage{"parent", [](LaidHive& h) { h.put32(h.at("Alpha").record, 16, 64); }},
+                    Damage{"count", [](LaidHive& h) { h.put32(h.at("").record, 20, 2); }},
+                    Damage{"maximum", [](LaidHive& h) { h.put32(h.at("Alpha").record, 60, 2); }},
+                    Damage{"maximum", [](LaidHive& h) { h.put32(h.at("").record, 52, 2); }},
+                    Damage{"maximum", [](LaidHive& h) { h.put32(h.at("Alpha").record, 64, 2); }},
+                    Damage{"data", [](LaidHive& h) { h.put32(h.at("Alpha").values[1].record, 4, 0x80000005); }},
+                    Damage{"data", [](LaidHive& h) { h.put32(h.at("Alpha\\Inner").values[0].record, 4, 70000); }},
+                    Damage{"class", [](LaidHive& h) { h.put16(h.at("").record, 74, 400); }},
+                    Damage{"index", [](LaidHive& h) { h.put16(h.at("").index, 0, 0x4141); }},
+                    Damage{"hash", [](LaidHive& h) { h.put32(h.at("").index, 8, 5); }},
+                    Damage{"order",
+                           [](LaidHive& h) {
+                               const uint32_t leaf = h.at("many_keys").leaves[0];
+                               const uint32_t first = h.get32(leaf, 4);
+                               h.put32(leaf, 4, h.get32(leaf, 12));
+                               h.put32(leaf, 12, first);
+                           }},
+                    Damage{"references", [](LaidHive& h) { h.put32(h.security[0], 12, 3); }},
+                    Damage{"ring", [](LaidHive& h) { h.put32(h.security[0], 8, none); }}),
     [](const auto& row) { return std::to_string(row.index) + "_" + row.param.rule; });
 
 TEST(Support, cells_that_nothing_leads_to_are_counted_by_kind) {
@@ -127,7 +126,7 @@ TEST(Support, cells_that_nothing_leads_to_are_counted_by_kind) {
     const Leaks leaks = check_hive(hive.bytes).leaks;
     EXPECT_EQ(leaks.values.size(), 2U);
     EXPECT_EQ(leaks.keys.size(), 0U);
-    EXPECT_EQ(leaks.others.size(), 2U); // the list and the text
+    EXPECT_EQ(leaks.others.size(), 2U);  // the list and the text
 }
 
 TEST(Support, the_reader_survives_every_single_changed_byte_of_a_small_hive) {
@@ -218,4 +217,4 @@ TEST(Support, allocations_are_measured) {
     free(second);
 }
 
-} // namespace
+}  // namespace

@@ -30,12 +30,11 @@ private:
     QRunnable* task;
 };
 
-} // namespace
+}  // namespace
 
 void QThreadPool::start(QRunnable* task, int priority) {
     using Start = void (*)(QThreadPool*, QRunnable*, int);
-    static const auto library_start =
-        reinterpret_cast<Start>(dlsym(RTLD_NEXT, "_ZN11QThreadPool5startEP9QRunnablei"));
+    static const auto library_start = reinterpret_cast<Start>(dlsym(RTLD_NEXT, "_ZN11QThreadPool5startEP9QRunnablei"));
     if (library_start == nullptr)
         qFatal("the toolkit's library has no QThreadPool::start(QRunnable*, int)");
     library_start(this, new HandedOver(task), priority);

@@ -82,11 +82,9 @@ QByteArray standard_output_of(Act act) {
     return file.readAll();
 }
 
-QVariant value_not_set() {
-    return QVariant::fromValue(ValueNotSet{});
-}
+QVariant value_not_set() { return QVariant::fromValue(ValueNotSet{}); }
 
-} // namespace
+}  // namespace
 
 class DelegatesTest : public QObject {
     Q_OBJECT
@@ -135,8 +133,7 @@ void DelegatesTest::text_by_type() {
     QFETCH(QString, text);
     const ValueDelegate delegate(nullptr);
     QString shown;
-    QCOMPARE(standard_output_of([&] { shown = delegate.displayText(datum, QLocale(QLocale::German)); }),
-             QByteArray());
+    QCOMPARE(standard_output_of([&] { shown = delegate.displayText(datum, QLocale(QLocale::German)); }), QByteArray());
     QCOMPARE(shown, text);
 }
 
@@ -254,8 +251,7 @@ void DelegatesTest::a_megabyte_paints_like_a_kilobyte_data() {
     QTest::addColumn<QVariant>("small");
     QTest::addColumn<QVariant>("large");
     QTest::newRow("bytes") << QVariant(QByteArray(1 << 10, 'x')) << QVariant(QByteArray(1 << 20, 'x'));
-    QTest::newRow("text") << QVariant(QString(512, QLatin1Char('x')))
-                          << QVariant(QString(1 << 19, QLatin1Char('x')));
+    QTest::newRow("text") << QVariant(QString(512, QLatin1Char('x'))) << QVariant(QString(1 << 19, QLatin1Char('x')));
     QTest::newRow("texts") << QVariant(QStringList(64, QString(7, QLatin1Char('x'))))
                            << QVariant(QStringList(1 << 16, QString(7, QLatin1Char('x'))));
 }
@@ -282,8 +278,7 @@ void DelegatesTest::a_megabyte_paints_like_a_kilobyte() {
     };
     const qint64 of_small = fastest(small);
     const qint64 of_large = fastest(large);
-    qInfo("1 KiB: %lld ns, 1 MiB: %lld ns", static_cast<long long>(of_small),
-          static_cast<long long>(of_large));
+    qInfo("1 KiB: %lld ns, 1 MiB: %lld ns", static_cast<long long>(of_small), static_cast<long long>(of_large));
     QVERIFY2(of_large <= 2 * of_small, "a row of 1 MiB paints more than twice as slowly as one of 1 KiB");
 }
 

@@ -117,7 +117,7 @@ void add_editors() {
                            << QVariant(qulonglong(18446744073709551615ULL));
 }
 
-} // namespace
+}  // namespace
 
 class EditorsTest : public QObject {
     Q_OBJECT

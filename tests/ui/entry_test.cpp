@@ -63,7 +63,7 @@ QString told(const Ended& ended) {
 const QString usage = QStringLiteral("usage: tallowfen [NAME FILE ...]\n");
 const QString tops = QStringLiteral("MACHINE/SYSTEM");
 
-} // namespace
+}  // namespace
 
 class EntryTest : public QObject {
     Q_OBJECT
@@ -115,11 +115,10 @@ void EntryTest::a_hibernated_system_is_told() {
     QCOMPARE(ended.status, 2);
     QCOMPARE(told(ended), QString());
     QCOMPARE(ended.out,
-             QStringLiteral(
-                 "box: Hibernation Detected\n"
-                 "text: Your system is in hibernate mode. Therefore the registry cannot be edited. Please "
-                 "restart your system and exit the hibernate mode or contact Zenta Support\n"
-                 "icon: critical\nbuttons: 1024\nparent: none\n"));
+             QStringLiteral("box: Hibernation Detected\n"
+                            "text: Your system is in hibernate mode. Therefore the registry cannot be edited. Please "
+                            "restart your system and exit the hibernate mode or contact Zenta Support\n"
+                            "icon: critical\nbuttons: 1024\nparent: none\n"));
 }
 
 void EntryTest::a_name_without_two_parts_mounts_nothing_data() {

@@ -13,9 +13,7 @@ namespace {
 
 const QString alpha = QStringLiteral("MACHINE\\SYSTEM\\Alpha");
 
-QString joined(const QStringList& names) {
-    return names.join(QLatin1Char(' '));
-}
+QString joined(const QStringList& names) { return names.join(QLatin1Char(' ')); }
 
 // The subkeys of a path below the hive's root as they stand in the file, read without the program.
 QString subkeys_in_file(const Scene& scene, const char* path) {
@@ -28,7 +26,7 @@ QString subkeys_in_file(const Scene& scene, const char* path) {
     return joined(names);
 }
 
-} // namespace
+}  // namespace
 
 class KeysViewTest : public QObject {
     Q_OBJECT
@@ -55,14 +53,13 @@ void KeysViewTest::the_context_menu_of_a_key() {
     const Scene scene;
     Stage stage(scene);
     stage.select_key(alpha);
-    bool shown =
-        with_context_menu(*stage.keys, stage.keys->visualRect(stage.key(alpha)).center(), [](QMenu& menu) {
-            QCOMPARE(joined(texts_of(menu)), QStringLiteral("New Delete Rename"));
-            QCOMPARE(menu.actions()[0]->menu()->actions(), QList<QAction*>{shared_actions().new_key_action});
-            QCOMPARE(menu.actions()[1], shared_actions().delete_action);
-            QCOMPARE(menu.actions()[2], shared_actions().rename_action);
-            QCOMPARE(menu.parentWidget(), nullptr);
-        });
+    bool shown = with_context_menu(*stage.keys, stage.keys->visualRect(stage.key(alpha)).center(), [](QMenu& menu) {
+        QCOMPARE(joined(texts_of(menu)), QStringLiteral("New Delete Rename"));
+        QCOMPARE(menu.actions()[0]->menu()->actions(), QList<QAction*>{shared_actions().new_key_action});
+        QCOMPARE(menu.actions()[1], shared_actions().delete_action);
+        QCOMPARE(menu.actions()[2], shared_actions().rename_action);
+        QCOMPARE(menu.parentWidget(), nullptr);
+    });
     QVERIFY(shown);
 }
 
@@ -157,8 +154,8 @@ void KeysViewTest::deletion_asks() {
     QCOMPARE(joined(stage.subkeys(alpha)), left);
     QCOMPARE(subkeys_in_file(scene, "Alpha"), left);
     QVERIFY(stage.keys->currentIndex().isValid());
-    QCOMPARE(stage.status(), answer == QMessageBox::Yes ? alpha + QStringLiteral("\\Zeta")
-                                                        : alpha + QStringLiteral("\\Leaf"));
+    QCOMPARE(stage.status(),
+             answer == QMessageBox::Yes ? alpha + QStringLiteral("\\Zeta") : alpha + QStringLiteral("\\Leaf"));
 }
 
 void KeysViewTest::closing_the_question_deletes_nothing() {

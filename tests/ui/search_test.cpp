@@ -55,14 +55,11 @@ DialogHand::Step ask(const Search& search) {
         find_by_text<QCheckBox>(*dialog, QStringLiteral("Find keys"))->setChecked(search.keys);
         find_by_text<QCheckBox>(*dialog, QStringLiteral("Find values"))->setChecked(search.values);
         find_by_text<QRadioButton>(*dialog, search.kind)->setChecked(true);
-        QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok),
-                          Qt::LeftButton);
+        QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok), Qt::LeftButton);
     };
 }
 
-void escape(QWidget* dialog) {
-    QTest::keyClick(dialog, Qt::Key_Escape);
-}
+void escape(QWidget* dialog) { QTest::keyClick(dialog, Qt::Key_Escape); }
 
 // What is found, in order: the path of the key, and behind a colon the name of the value.
 QStringList all_hits(Stage& stage, const Search& search) {
@@ -82,7 +79,7 @@ QStringList all_hits(Stage& stage, const Search& search) {
     return hits;
 }
 
-} // namespace
+}  // namespace
 
 class SearchTest : public QObject {
     Q_OBJECT
@@ -169,8 +166,7 @@ void SearchTest::a_cancelled_dialog_changes_nothing() {
     DialogHand hand;
     hand.then([](QWidget* dialog) {
         dialog->findChild<QLineEdit*>()->setText(QStringLiteral("Zeta"));
-        QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Cancel),
-                          Qt::LeftButton);
+        QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Cancel), Qt::LeftButton);
     });
     stage.window.show_find_dialog();
     QCOMPARE(stage.status(), alpha);
@@ -319,8 +315,7 @@ void SearchTest::cancel_returns_when_the_worker_has_ended() {
     hand.then(ask({QStringLiteral("zeta")})).then_while_searching([&](QWidget* dialog) {
         model.entered.acquire();
         if (by_button) {
-            QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Cancel),
-                              Qt::LeftButton);
+            QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Cancel), Qt::LeftButton);
         } else {
             escape(dialog);
         }
@@ -343,8 +338,7 @@ void SearchTest::a_value_hit_is_a_row_of_the_sorted_table() {
     const Scene scene;
     Stage stage(scene);
     stage.select_key(alpha + QStringLiteral("\\Deep"));
-    QVERIFY(stage.values->model()->setData(stage.value(QStringLiteral("A")), QStringLiteral("zzz"),
-                                           Qt::EditRole));
+    QVERIFY(stage.values->model()->setData(stage.value(QStringLiteral("A")), QStringLiteral("zzz"), Qt::EditRole));
     QCOMPARE(stage.value_row(QStringLiteral("zzz")), 1);
     DialogHand hand;
     hand.then(ask({QStringLiteral("zzz"), false, true}));

@@ -41,17 +41,14 @@ testkit::HiveLayout layout() {
     return hive;
 }
 
-} // namespace
+}  // namespace
 
-Scene::Scene() : m_laid(testkit::lay_out(layout())) {
-    write(m_laid.bytes);
-}
+Scene::Scene() : m_laid(testkit::lay_out(layout())) { write(m_laid.bytes); }
 
 void Scene::write(const testkit::Bytes& all) const {
     QFile out(file());
     const auto size = static_cast<qint64>(all.size());
-    if (!out.open(QIODevice::WriteOnly) ||
-        out.write(reinterpret_cast<const char*>(all.data()), size) != size) {
+    if (!out.open(QIODevice::WriteOnly) || out.write(reinterpret_cast<const char*>(all.data()), size) != size) {
         qFatal("cannot write %s", qPrintable(file()));
     }
 }
@@ -115,9 +112,7 @@ QStringList Stage::subkeys(const QString& path) const {
     return names;
 }
 
-int Stage::value_row(const QString& name) const {
-    return static_cast<int>(value_names().indexOf(name));
-}
+int Stage::value_row(const QString& name) const { return static_cast<int>(value_names().indexOf(name)); }
 
 QModelIndex Stage::value(const QString& name, int column) const {
     return values->model()->index(value_row(name), column);
@@ -136,9 +131,7 @@ QStringList Stage::value_names() const {
     return names;
 }
 
-QString Stage::status() const {
-    return window.statusBar()->findChild<QLabel*>()->text();
-}
+QString Stage::status() const { return window.statusBar()->findChild<QLabel*>()->text(); }
 
 void Stage::return_to(QWidget& view) {
     window.activateWindow();

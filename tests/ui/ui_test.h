@@ -92,13 +92,12 @@ private:
 
     QTimer m_timer;
     QPointer<QWidget> m_answered;
-    std::deque<std::pair<Step, bool>> m_steps; // and whether it is for the search's dialog
+    std::deque<std::pair<Step, bool>> m_steps;  // and whether it is for the search's dialog
 };
 
 // Opens the context menu of a view at a point of its viewport, hands it to `act` and closes it; false when no
 // menu came.
-inline bool with_context_menu(QAbstractScrollArea& view, QPoint point,
-                              const std::function<void(QMenu&)>& act) {
+inline bool with_context_menu(QAbstractScrollArea& view, QPoint point, const std::function<void(QMenu&)>& act) {
     bool shown = false;
     QTimer timer;
     QObject::connect(&timer, &QTimer::timeout, &timer, [&] {
@@ -137,10 +136,10 @@ Widget* find_by_text(const QWidget& parent, const QString& text) {
     return nullptr;
 }
 
-#define UI_TEST_MAIN(TestClass)                                                                              \
-    int main(int argc, char** argv) {                                                                        \
-        Application application(argc, argv);                                                                 \
-        QCoreApplication::setApplicationName(QStringLiteral("Registry Editor"));                             \
-        TestClass test;                                                                                      \
-        return QTest::qExec(&test, argc, argv);                                                              \
+#define UI_TEST_MAIN(TestClass)                                                                                        \
+    int main(int argc, char** argv) {                                                                                  \
+        Application application(argc, argv);                                                                           \
+        QCoreApplication::setApplicationName(QStringLiteral("Registry Editor"));                                       \
+        TestClass test;                                                                                                \
+        return QTest::qExec(&test, argc, argv);                                                                        \
     }

@@ -68,13 +68,10 @@ void ValidatorsTest::uint64_validator_data() {
     QTest::newRow("zero") << quint64(0) << top << "0" << QValidator::Acceptable;
     QTest::newRow("more than 32 bits") << quint64(0) << top << "4294967296" << QValidator::Acceptable;
     QTest::newRow("the largest") << quint64(0) << top << "18446744073709551615" << QValidator::Acceptable;
-    QTest::newRow("one more than the largest")
-        << quint64(0) << top << "18446744073709551616" << QValidator::Invalid;
+    QTest::newRow("one more than the largest") << quint64(0) << top << "18446744073709551616" << QValidator::Invalid;
     QTest::newRow("a letter") << quint64(0) << top << "a" << QValidator::Invalid;
-    QTest::newRow("below the bottom")
-        << quint64(5000000000) << top << "4999999999" << QValidator::Intermediate;
-    QTest::newRow("above the top") << quint64(0) << quint64(5000000000) << "5000000001"
-                                   << QValidator::Invalid;
+    QTest::newRow("below the bottom") << quint64(5000000000) << top << "4999999999" << QValidator::Intermediate;
+    QTest::newRow("above the top") << quint64(0) << quint64(5000000000) << "5000000001" << QValidator::Invalid;
 }
 
 void ValidatorsTest::uint64_validator() {

@@ -61,7 +61,7 @@ void press(const QWidget& dialog, QDialogButtonBox::StandardButton button) {
     QTest::mouseClick(dialog.findChild<QDialogButtonBox*>()->button(button), Qt::LeftButton);
 }
 
-} // namespace
+}  // namespace
 
 class ValuesViewTest : public QObject {
     Q_OBJECT
@@ -311,9 +311,8 @@ void ValuesViewTest::the_context_menu_of_everything_else() {
     Stage stage(scene);
     stage.select_key(alpha);
     const QPoint point =
-        column < 0
-            ? QPoint(20, stage.values->viewport()->height() - 5)
-            : stage.values->visualRect(stage.value(QStringLiteral("text"), column)).topLeft() + QPoint(5, 5);
+        column < 0 ? QPoint(20, stage.values->viewport()->height() - 5)
+                   : stage.values->visualRect(stage.value(QStringLiteral("text"), column)).topLeft() + QPoint(5, 5);
     QVERIFY(with_context_menu(*stage.values, point, [](QMenu& menu) {
         QCOMPARE(texts_of(menu), QStringList{QStringLiteral("New")});
         QCOMPARE(texts_of(*menu.actions()[0]->menu()).join(QLatin1Char('|')),
@@ -346,8 +345,7 @@ void ValuesViewTest::a_new_value_is_named_in_place_data() {
     QTest::newRow("binary") << actions.new_binary_action << 3U << QVariant(QByteArray(""));
     QTest::newRow("dword") << actions.new_dword_action << 4U << QVariant(0U);
     // The two zeros of an empty list read as one empty text.
-    QTest::newRow("multi-string") << actions.new_multi_string_action << 7U
-                                  << QVariant(QStringList{QString()});
+    QTest::newRow("multi-string") << actions.new_multi_string_action << 7U << QVariant(QStringList{QString()});
     QTest::newRow("qword") << actions.new_qword_action << 11U << QVariant(qulonglong(0));
 }
 

@@ -41,7 +41,7 @@ QAction* action_of(const QMenu& menu, const QString& text) {
     return nullptr;
 }
 
-} // namespace
+}  // namespace
 
 class WindowTest : public QObject {
     Q_OBJECT
@@ -133,8 +133,7 @@ void WindowTest::menus() {
     }
     QCOMPARE(titles.join(QLatin1Char(' ')), QStringLiteral("&File &Edit &View"));
     const QMenu& edit_menu = *menu_of(*window.menuBar(), QStringLiteral("&Edit"));
-    QCOMPARE(texts_of(edit_menu).join(QLatin1Char('|')),
-             QStringLiteral("&New|-|Delete|Rename|-|Find...|Find next"));
+    QCOMPARE(texts_of(edit_menu).join(QLatin1Char('|')), QStringLiteral("&New|-|Delete|Rename|-|Find...|Find next"));
     const QMenu& new_menu = *menu_of(edit_menu, QStringLiteral("&New"));
     QCOMPARE(texts_of(new_menu).join(QLatin1Char('|')),
              QStringLiteral("Key|-|String Value|Binary Value|DWORD (32-bit) Value|QWORD (64-bit) Value|"
@@ -143,11 +142,9 @@ void WindowTest::menus() {
     QCOMPARE(shared_actions().delete_action->shortcut(), QKeySequence(QKeySequence::Delete));
     QVERIFY(shared_actions().rename_action->shortcut().isEmpty());
     QCOMPARE(action_of(edit_menu, QStringLiteral("Find..."))->shortcut(), QKeySequence(QKeySequence::Find));
-    QCOMPARE(action_of(edit_menu, QStringLiteral("Find next"))->shortcut(),
-             QKeySequence(QKeySequence::FindNext));
+    QCOMPARE(action_of(edit_menu, QStringLiteral("Find next"))->shortcut(), QKeySequence(QKeySequence::FindNext));
     const QMenu& view_menu = *menu_of(*window.menuBar(), QStringLiteral("&View"));
-    QCOMPARE(action_of(view_menu, QStringLiteral("Refresh"))->shortcut(),
-             QKeySequence(QKeySequence::Refresh));
+    QCOMPARE(action_of(view_menu, QStringLiteral("Refresh"))->shortcut(), QKeySequence(QKeySequence::Refresh));
     const QMenu& file_menu = *menu_of(*window.menuBar(), QStringLiteral("&File"));
     QVERIFY(action_of(file_menu, QStringLiteral("Exit"))->shortcut().isEmpty());
 }
@@ -163,14 +160,12 @@ void WindowTest::the_views_are_set_up() {
     QCOMPARE(stage.keys->header()->sectionResizeMode(0), QHeaderView::ResizeToContents);
     QVERIFY(!stage.keys->header()->stretchLastSection());
     QCOMPARE(stage.values->contextMenuPolicy(), Qt::CustomContextMenu);
-    QCOMPARE(stage.values->editTriggers(),
-             QAbstractItemView::EditTriggers(QAbstractItemView::EditKeyPressed));
+    QCOMPARE(stage.values->editTriggers(), QAbstractItemView::EditTriggers(QAbstractItemView::EditKeyPressed));
     QCOMPARE(stage.values->selectionBehavior(), QAbstractItemView::SelectItems);
     QCOMPARE(stage.values->selectionMode(), QAbstractItemView::SingleSelection);
     QVERIFY(!stage.values->showGrid());
     QVERIFY(stage.values->verticalHeader()->isHidden());
-    const auto* splitter =
-        qobject_cast<QSplitter*>(by_accessible_name(stage.window, QStringLiteral("splitter")));
+    const auto* splitter = qobject_cast<QSplitter*>(by_accessible_name(stage.window, QStringLiteral("splitter")));
     QVERIFY(splitter);
     QCOMPARE(splitter->widget(0), stage.keys);
     QCOMPARE(splitter->widget(1), stage.values);
@@ -199,8 +194,7 @@ void WindowTest::actions_by_depth() {
     const Scene scene;
     Stage stage(scene);
     // From a key where everything is enabled and from one where nothing is.
-    for (const QString& before :
-         {QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Leaf"), QStringLiteral("MACHINE")}) {
+    for (const QString& before : {QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Leaf"), QStringLiteral("MACHINE")}) {
         stage.select_key(before);
         stage.select_key(path);
         QCOMPARE(stage.keys->currentIndex(), stage.key(path));
@@ -304,8 +298,7 @@ void WindowTest::refresh_sorts_by_name() {
     Stage stage(scene);
     stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Deep"));
     QCOMPARE(stage.value_names().join(QLatin1Char(' ')), QStringLiteral("(Default) A b"));
-    QVERIFY(
-        stage.values->model()->setData(stage.value(QStringLiteral("A")), QStringLiteral("c"), Qt::EditRole));
+    QVERIFY(stage.values->model()->setData(stage.value(QStringLiteral("A")), QStringLiteral("c"), Qt::EditRole));
     QCOMPARE(stage.value_names().join(QLatin1Char(' ')), QStringLiteral("(Default) c b"));
     QTest::keySequence(&stage.window, QKeySequence(QKeySequence::Refresh));
     QCOMPARE(stage.value_names().join(QLatin1Char(' ')), QStringLiteral("(Default) b c"));
@@ -344,8 +337,7 @@ void WindowTest::the_splitter_fills_the_window() {
     const QWidget* splitter = by_accessible_name(stage.window, QStringLiteral("splitter"));
     const auto expected = [&] {
         const int top = stage.window.menuBar()->height();
-        return QRect(0, top, stage.window.width(),
-                     stage.window.height() - top - stage.window.statusBar()->height());
+        return QRect(0, top, stage.window.width(), stage.window.height() - top - stage.window.statusBar()->height());
     };
     stage.window.resize(size);
     QTRY_COMPARE(splitter->geometry(), expected());
@@ -379,8 +371,7 @@ void WindowTest::columns_start_wide_enough() {
     const QFontMetrics metrics = stage.values->fontMetrics();
     QVERIFY(stage.values->columnWidth(0) > metrics.horizontalAdvance(QStringLiteral("SystemPartition")));
     QVERIFY(stage.values->columnWidth(1) > metrics.horizontalAdvance(QStringLiteral("REG_EXPAND_SZ")));
-    QVERIFY(stage.values->columnWidth(2) >
-            metrics.horizontalAdvance(QStringLiteral("0x00000000 (4294967295)")));
+    QVERIFY(stage.values->columnWidth(2) > metrics.horizontalAdvance(QStringLiteral("0x00000000 (4294967295)")));
     // What the user has widened stays, whatever key comes next.
     stage.values->setColumnWidth(0, 333);
     stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Deep"));
@@ -402,8 +393,7 @@ void WindowTest::a_damaged_key_is_told_once_and_its_siblings_stay() {
     QTRY_VERIFY(hand.is_done());
     QCOMPARE(hand.icon, QMessageBox::Critical);
     QCOMPARE(hand.title, QStringLiteral("Registry Editor"));
-    QCOMPARE(hand.text,
-             QStringLiteral("The key \"MACHINE\\SYSTEM\\Alpha\\#1\" cannot be read: ROpenSubKey failed"));
+    QCOMPARE(hand.text, QStringLiteral("The key \"MACHINE\\SYSTEM\\Alpha\\#1\" cannot be read: ROpenSubKey failed"));
 
     // The siblings on both sides are there and can be used.
     QCOMPARE(stage.model->rowCount(alpha), 3);

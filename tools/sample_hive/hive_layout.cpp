@@ -18,9 +18,9 @@ constexpr std::size_t bin_unit = 4096;
 constexpr std::size_t bin_header_size = 32;
 constexpr std::size_t segment_size = 16344;
 constexpr std::uint32_t none = 0xFFFFFFFF;
-constexpr std::uint64_t written_at = 0x01D9'0000'0000'0000; // one fixed time, so that each sample is the same
+constexpr std::uint64_t written_at = 0x01D9'0000'0000'0000;  // one fixed time, so that each sample is the same
 
-constexpr std::uint16_t flag_root = 0x000C; // the root, which cannot be deleted
+constexpr std::uint16_t flag_root = 0x000C;  // the root, which cannot be deleted
 constexpr std::uint16_t flag_name_8_bit = 0x0020;
 
 void put16(Bytes& bytes, std::size_t at, std::uint16_t number) {
@@ -97,9 +97,7 @@ public:
         return cell;
     }
 
-    void set32(std::uint32_t cell, std::size_t field, std::uint32_t number) {
-        put32(bytes, cell + 4 + field, number);
-    }
+    void set32(std::uint32_t cell, std::size_t field, std::uint32_t number) { put32(bytes, cell + 4 + field, number); }
 
     // Every bin, the last one closed.
     Bytes finish() {
@@ -110,7 +108,7 @@ public:
 private:
     void close_bin() {
         if (next < bin_end) {
-            put32(bytes, next, static_cast<std::uint32_t>(bin_end - next)); // positive: free
+            put32(bytes, next, static_cast<std::uint32_t>(bin_end - next));  // positive: free
         }
         next = bin_end;
     }
@@ -138,7 +136,7 @@ Bytes security_descriptor() {
     const Bytes administrators = {1, 2, 0, 0, 0, 0, 0, 5, 0x20, 0, 0, 0, 0x20, 2, 0, 0};
     Bytes descriptor(20 + 2 * administrators.size() + 8 + 8 + administrators.size());
     descriptor[0] = 1;
-    put16(descriptor, 2, 0x8004); // self-relative, with an access list
+    put16(descriptor, 2, 0x8004);  // self-relative, with an access list
     put32(descriptor, 4, 20);
     put32(descriptor, 8, 36);
     put32(descriptor, 16, 52);
@@ -147,9 +145,9 @@ Bytes security_descriptor() {
     descriptor[52] = 2;
     put16(descriptor, 54, static_cast<std::uint16_t>(8 + 8 + administrators.size()));
     put16(descriptor, 56, 1);
-    descriptor[61] = 2; // inherited by subkeys
+    descriptor[61] = 2;  // inherited by subkeys
     put16(descriptor, 62, static_cast<std::uint16_t>(8 + administrators.size()));
-    put32(descriptor, 64, 0x000F003F); // full access to a key
+    put32(descriptor, 64, 0x000F003F);  // full access to a key
     put_bytes(descriptor, 68, administrators);
     return descriptor;
 }
@@ -285,7 +283,7 @@ private:
     void fill_security(const Bytes& descriptor) {
         Bytes record(20 + descriptor.size());
         put_signature(record, 0, "sk");
-        put32(record, 4, security); // the one record of its ring
+        put32(record, 4, security);  // the one record of its ring
         put32(record, 8, security);
         put32(record, 12, key_count);
         put32(record, 16, static_cast<std::uint32_t>(descriptor.size()));
@@ -299,14 +297,13 @@ private:
         }
     }
 
-    static Bytes with_base_block(const Bytes& bins, std::uint32_t root_cell,
-                                 const std::u16string& file_name) {
+    static Bytes with_base_block(const Bytes& bins, std::uint32_t root_cell, const std::u16string& file_name) {
         Bytes file(base_block_size + bins.size());
         put_signature(file, 0, "regf");
-        put32(file, 4, 1); // both sequence numbers: nothing is waiting in a log
+        put32(file, 4, 1);  // both sequence numbers: nothing is waiting in a log
         put32(file, 8, 1);
         put64(file, 12, written_at);
-        put32(file, 20, 1); // version 1.5, the first with data in segments
+        put32(file, 20, 1);  // version 1.5, the first with data in segments
         put32(file, 24, 5);
         put32(file, 32, 1);
         put32(file, 36, root_cell);
@@ -316,8 +313,7 @@ private:
         std::uint32_t checksum = 0;
         for (std::size_t at = 0; at < 508; at += 4) {
             checksum ^= static_cast<std::uint32_t>(file[at]) | static_cast<std::uint32_t>(file[at + 1]) << 8 |
-                        static_cast<std::uint32_t>(file[at + 2]) << 16 |
-                        static_cast<std::uint32_t>(file[at + 3]) << 24;
+                        static_cast<std::uint32_t>(file[at + 2]) << 16 | static_cast<std::uint32_t>(file[at + 3]) << 24;
         }
         put32(file, 508, checksum == none ? none - 1 : checksum == 0 ? 1 : checksum);
         put_bytes(file, base_block_size, bins);
@@ -325,13 +321,12 @@ private:
     }
 
     Cells cells;
-    std::vector<Record>
-        records; // key and security records, written once everything that they lead to has its place
+    std::vector<Record> records;  // key and security records, written once everything that they lead to has its place
     std::uint32_t security = none;
     std::uint32_t key_count = 0;
 };
 
-} // namespace
+}  // namespace
 
 SampleKey& SampleKey::add(std::u16string subkey_name) {
     return subkeys.emplace_back(SampleKey{std::move(subkey_name), {}, {}, {}});

@@ -10,15 +10,15 @@
 #include <vector>
 
 struct SampleValue {
-    std::string name; // 8-bit characters; empty for the key's default value
+    std::string name;  // 8-bit characters; empty for the key's default value
     std::uint32_t type = 0;
     std::vector<std::uint8_t> data;
 };
 
 struct SampleKey {
-    std::u16string name; // stored in 8 bits where every character fits, in UTF-16 otherwise
+    std::u16string name;  // stored in 8 bits where every character fits, in UTF-16 otherwise
     std::vector<SampleValue> values;
-    std::vector<SampleKey> subkeys; // in any order; the layout sorts them
+    std::vector<SampleKey> subkeys;  // in any order; the layout sorts them
     std::u16string class_name;
 
     SampleKey& add(std::u16string subkey_name);

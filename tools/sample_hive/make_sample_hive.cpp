@@ -135,8 +135,7 @@ SampleKey sample_tree() {
         control_set.add(u"Enum").add(u"Root").add(u"LEGACY_BEEP").add(u"0000").set_text("Service", u"Beep");
         control_set.add(u"Hardware Profiles").add(u"0001");
     }
-    root.add(u"MountedDevices")
-        .set("\\DosDevices\\C:", 3, {0x12, 0x34, 0x56, 0x78, 0, 0x7E, 0, 0, 0, 0, 0, 0});
+    root.add(u"MountedDevices").set("\\DosDevices\\C:", 3, {0x12, 0x34, 0x56, 0x78, 0, 0x7E, 0, 0, 0, 0, 0, 0});
     root.add(u"Select")
         .set_dword("Current", 1)
         .set_dword("Default", 1)
@@ -155,7 +154,7 @@ bool write_file(const char* path, const std::vector<std::uint8_t>& bytes) {
     return std::fclose(file) == 0 && written;
 }
 
-} // namespace
+}  // namespace
 
 int main(int argc, char** argv) {
     if (argc != 2 && argc != 3) {

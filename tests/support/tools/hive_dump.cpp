@@ -64,7 +64,7 @@ int check(const std::string& path) {
     return result.faults.empty() ? 0 : 1;
 }
 
-} // namespace
+}  // namespace
 
 int main(int argc, char** argv) {
     try {

@@ -49,8 +49,7 @@ private:
         if (auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget())) {
             tell("box", box->windowTitle());
             tell("text", box->text());
-            tell("icon",
-                 box->icon() == QMessageBox::Critical ? QStringLiteral("critical") : QStringLiteral("other"));
+            tell("icon", box->icon() == QMessageBox::Critical ? QStringLiteral("critical") : QStringLiteral("other"));
             tell("buttons", QString::number(box->standardButtons()));
             tell("parent", box->parentWidget() ? QStringLiteral("some") : QStringLiteral("none"));
             m_timer.stop();
@@ -79,6 +78,6 @@ public:
     QObject* create(const QString& /*name*/, const QString& /*text*/) override { return new Presser; }
 };
 
-} // namespace
+}  // namespace
 
 #include "presser.moc"
