@@ -5,6 +5,7 @@
 #include "reg_hive.h"
 #include "reg_key.h"
 
+#include <QCoreApplication>
 #include <QIcon>
 #include <QStringList>
 
@@ -80,9 +81,21 @@ int RegModel::rowCount(const QModelIndex& parent) const {
 
 int RegModel::columnCount(const QModelIndex&) const { return 1; }
 
+// What a screen reader says, which is what is shown. It asks through parts of the toolkit that lose memory when an
+// exception passes them.
+QVariant RegModel::spoken_name(const QModelIndex& index) const {
+    try {
+        return data(index, Qt::DisplayRole);
+    } catch (const std::runtime_error&) {
+        return QCoreApplication::translate("KeyDelegate", "(cannot be read)");
+    }
+}
+
 QVariant RegModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid())
         return QVariant();
+    if (role == Qt::AccessibleTextRole)
+        return spoken_name(index);
     if (role == Qt::DecorationRole)
         return QIcon::fromTheme(QStringLiteral("folder"), QIcon());
     if (role != Qt::DisplayRole && role != Qt::EditRole)

@@ -76,6 +76,7 @@ private:
     static AbstractRegKey* key_of(const QModelIndex& index);
     QModelIndex index_of(AbstractRegKey* key) const;
     int row_of(const AbstractRegKey* key) const;
+    QVariant spoken_name(const QModelIndex& index) const;
     int key_depth(const QModelIndex& index) const;
     bool remove_key(int row, const QModelIndex& parent);
     void move_persistent_indexes(const QModelIndex& renamed, const QModelIndex& moved);
@@ -91,9 +92,14 @@ private:
     QModelIndex searched_;       // set by find; the tree may have changed since
     QMutex mutex_;               // guards stop_ alone
     bool stop_ = false;
-    // How many keys of each hive the search may still visit. A damaged hive can list a key more often than the file
-    // has room for keys; twice what its size allows bounds the walk, the second half of it without going further down.
-    std::map<const RegHive*, qint64> keys_left_;
+    // How many keys of each hive the search may still visit, and go further down from. A damaged hive can list a key
+    // more often than the file has room for keys; twice what its size allows bounds the walk, the first half of it
+    // going down.
+    struct KeysLeft {
+        qint64 to_visit;
+        qint64 to_descend;
+    };
+    std::map<const RegHive*, KeysLeft> keys_left_;
 };
 
 Q_DECLARE_OPERATORS_FOR_FLAGS(RegModel::FindMode)

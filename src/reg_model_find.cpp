@@ -65,8 +65,10 @@ void RegModel::begin_find(const QModelIndex& start) {
     if (start.isValid())
         search_.push_back({start, -1});
     keys_left_.clear();
-    for (const auto& hive : hives_)
-        keys_left_[hive.get()] = 2 * most_keys(*hive);
+    for (const auto& hive : hives_) {
+        const qint64 most = most_keys(*hive);
+        keys_left_[hive.get()] = {2 * most, most};
+    }
     // Last, so that the lock hands the stack over to the worker as well.
     const QMutexLocker locker(&mutex_);
     stop_ = false;
@@ -89,11 +91,12 @@ void RegModel::push_key_frames(const Frame& frame, FindMode mode) {
     bool goes_on = true;
     bool goes_down = !visited->is_below_itself();
     if (in_hive != nullptr) {
-        qint64& left = keys_left_[in_hive->hive()];
-        left--;
+        KeysLeft& left = keys_left_[in_hive->hive()];
+        left.to_visit--;
+        left.to_descend--;
         // A hive's root is listed in its group, whose other hives have nothing to do with it.
-        goes_on = left > 0 || in_hive == in_hive->hive()->root_key();
-        goes_down = goes_down && left > most_keys(*in_hive->hive());
+        goes_on = left.to_visit > 0 || in_hive == in_hive->hive()->root_key();
+        goes_down = goes_down && left.to_descend > 0;
     }
     const QModelIndex sibling = goes_on ? index(frame.key.row() + 1, 0, parent(frame.key)) : QModelIndex();
     if (sibling.isValid())

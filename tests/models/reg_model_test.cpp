@@ -227,6 +227,9 @@ private slots:
         QVERIFY(damaged.isValid());
         QCOMPARE(model.rowCount(damaged), 0);
         QVERIFY_EXCEPTION_THROWN(model.data(damaged, Qt::DisplayRole), std::runtime_error);
+        // A screen reader is told what is seen, without an exception.
+        QCOMPARE(damaged.data(Qt::AccessibleTextRole).toString(), QStringLiteral("(cannot be read)"));
+        QCOMPARE(model.index(3, 0, parent).data(Qt::AccessibleTextRole).toString(), QStringLiteral("zz"));
     }
 };
 
