@@ -131,12 +131,11 @@ int32_t RQueryInfoKeyA(RegistryKey* key, char* name, uint32_t* name_size, void* 
                        uint32_t* out_security_size, RegistryTime* out_last_write) {
     if (!is_key(key))
         return R_INVALID_HANDLE;
-    const int32_t status = give_name_8bit(*key, name, name_size);
-    if (status != R_SUCCESS)
-        return status;
+    const int32_t named = give_name_8bit(*key, name, name_size);
     give_class(*key->info, class_name, class_size, 1);
-    return give_numbers(*key, {out_subkeys, out_longest_subkey, out_longest_class, out_values, out_longest_value,
-                               out_largest_data, out_security_size, out_last_write});
+    const int32_t status = give_numbers(*key, {out_subkeys, out_longest_subkey, out_longest_class, out_values,
+                                               out_longest_value, out_largest_data, out_security_size, out_last_write});
+    return named != R_SUCCESS ? named : status;
 }
 
 int32_t RQueryInfoKeyW(RegistryKey* key, uint16_t* name, uint32_t* name_size, void* class_name, uint32_t* class_size,

@@ -193,6 +193,12 @@ Outcome take_out(Store& store, const SubkeyIndex& index, uint32_t position) {
     return rewrite_at(store, record_position(leaf.cell.offset), now.block.bytes, before.block.bytes, now.used());
 }
 
+// Whether an entry that moves to a place has it in its own leaf.
+bool stays_in_leaf(const SubkeyIndex& index, uint32_t position, uint32_t place) {
+    const Leaf& leaf = index.leaf(leaf_holding(index, position));
+    return place >= leaf.first && place - leaf.first <= leaf.count;
+}
+
 Outcome move_within(Store& store, const Leaf& leaf, uint32_t from, uint32_t to, const LeafEntry& entry) {
     LeafBytes now(leaf);
     LeafBytes before(leaf);
@@ -251,6 +257,10 @@ bool can_grow(const SubkeyIndex& index, uint32_t position) {
     return index.leaf_count == 0 || index.leaf(leaf_for_new(index, position)).count < leaf_limit;
 }
 
+bool can_move(const SubkeyIndex& index, uint32_t position, uint32_t place) {
+    return stays_in_leaf(index, position, place) || can_grow(index, place);
+}
+
 Outcome add_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
                   uint32_t position, CellOffset key, const Name& name) {
     KeyRecord changed = parent;
@@ -296,7 +306,7 @@ Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, 
 Outcome move_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
                    uint32_t position, uint32_t place, CellOffset key, const Name& name) {
     const Leaf& leaf = index.leaf(leaf_holding(index, position));
-    if (place >= leaf.first && place - leaf.first <= leaf.count)
+    if (stays_in_leaf(index, position, place))
         return move_within(store, leaf, position - leaf.first, place - leaf.first,
                            entry_for(leaf.signature, key, name));
     return move_between(store, parent_offset, parent, index, position, place, key, name);

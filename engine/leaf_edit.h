@@ -14,6 +14,9 @@ namespace engine {
 // Whether the leaf that a new entry at this position would go to has room in its count.
 bool can_grow(const SubkeyIndex& index, uint32_t position);
 
+// Whether move_entry has room for the entry at a position in the leaf of its new place.
+bool can_move(const SubkeyIndex& index, uint32_t position, uint32_t place);
+
 // Puts in an entry for a key that is complete; parent follows what the file holds. In turn:
 //   the leaf has room: the parent's count, the leaf;
 //   it has none, below a root: a longer copy of the leaf, the parent's count, the root's entry, the old leaf freed;

@@ -34,6 +34,17 @@ uint8_t lower_ascii(uint8_t c) { return c >= 'A' && c <= 'Z' ? static_cast<uint8
 
 int order(uint32_t a, uint32_t b) { return a < b ? -1 : a > b ? 1 : 0; }
 
+// How the characters of two names at one place compare, upper-cased. Two bytes are compared as such: several may be
+// widened to one unit.
+int compare_at(const Name& a, const Name& b, uint32_t i) {
+    if (a.wide || b.wide)
+        return order(upper_unit(a, i), upper_unit(b, i));
+    if (a.bytes[i] == b.bytes[i])
+        return 0;
+    return order(static_cast<uint8_t>(upper(static_cast<char>(a.bytes[i]))),
+                 static_cast<uint8_t>(upper(static_cast<char>(b.bytes[i]))));
+}
+
 }  // namespace
 
 uint16_t Name::unit(uint32_t i) const {
@@ -80,7 +91,7 @@ int compare_index(const Name& searched, const Name& stored) {
 int compare_upper(const Name& a, const Name& b) {
     const uint32_t common = a.characters() < b.characters() ? a.characters() : b.characters();
     for (uint32_t i = 0; i < common; i++) {
-        const int difference = order(upper_unit(a, i), upper_unit(b, i));
+        const int difference = compare_at(a, b, i);
         if (difference != 0)
             return difference;
     }
@@ -90,12 +101,9 @@ int compare_upper(const Name& a, const Name& b) {
 bool same_name(const Name& a, const Name& b) {
     if (a.characters() != b.characters())
         return false;
-    const bool narrow_both = !a.wide && !b.wide;
     // From the end: the names under one key often begin alike and differ in a number behind.
     for (uint32_t i = a.characters(); i-- > 0;) {
-        if (narrow_both && a.bytes[i] == b.bytes[i])
-            continue;
-        if (upper_unit(a, i) != upper_unit(b, i))
+        if (compare_at(a, b, i) != 0)
             return false;
     }
     return true;

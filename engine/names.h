@@ -27,7 +27,8 @@ char upper(char c);
 int compare_signed(const Name& searched, const Name& stored);
 // The order that a search in an index goes by: lower-cased as strncasecmp does in the C locale, unsigned.
 int compare_index(const Name& searched, const Name& stored);
-// The order in which Windows keeps its lists, as far as 8 bits tell: upper-cased units, unsigned.
+// The order in which Windows keeps its lists, as far as 8 bits tell: upper-cased units, unsigned. Two 8-bit names are
+// compared as bytes; beside a UTF-16 name an 8-bit one is widened.
 int compare_upper(const Name& a, const Name& b);
 // Whether compare_upper finds no difference.
 bool same_name(const Name& a, const Name& b);

@@ -79,28 +79,67 @@ Named compare_value(Store& store, CellOffset offset, const Name& name, ValueView
     return compare_name(store, value, name, many.bytes);
 }
 
+namespace {
+
+// The signature of the record in the cell that an offset leads to, 0 where it leads to none.
+uint32_t signature_at(Store& store, CellOffset offset) {
+    Cell cell;
+    Le16 signature;
+    if (!find_used_cell(store, offset, cell) || !read_part(store, cell, 0, &signature, sizeof signature))
+        return 0;
+    return signature;
+}
+
+bool is_index_signature(uint32_t signature) {
+    return signature == sig_fast_leaf || signature == sig_hash_leaf || signature == sig_index_leaf;
+}
+
+// An index's first entry leads to a key, a root's to a leaf.
+bool is_index_record(Store& store, const Cell& cell, const IndexHead& head) {
+    Le32 entry;
+    if (head.count == 0 || !read_part(store, cell, sizeof head, &entry, sizeof entry))
+        return false;
+    const uint32_t below = signature_at(store, cell_offset(entry));
+    return head.signature == sig_index_root ? is_index_signature(below) : below == sig_key;
+}
+
+bool is_security_record(Store& store, const Cell& cell) {
+    SecurityRecord record;
+    return read_part(store, cell, 0, &record, sizeof record) &&
+           signature_at(store, cell_offset(record.next)) == sig_security &&
+           signature_at(store, cell_offset(record.previous)) == sig_security;
+}
+
+bool is_value_record(Store& store, const Cell& cell) {
+    ValueView value;
+    Cell data;
+    return read_value(store, cell.offset, value) &&
+           (value.is_inline() || value.size() == 0 || find_used_cell(store, cell_offset(value.record.data), data));
+}
+
+bool is_key_record(Store& store, const Cell& cell) {
+    KeyView key;
+    return read_key(store, cell.offset, key) &&
+           (cell.offset == store.root || signature_at(store, cell_offset(key.record.parent)) == sig_key);
+}
+
+}  // namespace
+
 bool is_record(Store& store, const Cell& cell) {
     IndexHead head;
     if (!read_part(store, cell, 0, &head, sizeof head))
         return false;
-    const uint32_t rest = cell.room() - static_cast<uint32_t>(sizeof head);
-    KeyView key;
-    ValueView value;
     switch (head.signature) {
     case sig_key:
-        return read_key(store, cell.offset, key);
+        return is_key_record(store, cell);
     case sig_value:
-        return read_value(store, cell.offset, value);
+        return is_value_record(store, cell);
     case sig_security:
-        return cell.room() >= sizeof(SecurityRecord);
-    case sig_fast_leaf:
-    case sig_hash_leaf:
-        return head.count <= rest / sizeof(LeafEntry);
-    case sig_index_leaf:
+        return is_security_record(store, cell);
     case sig_index_root:
-        return head.count <= rest / sizeof(Le32);
+        return is_index_record(store, cell, head);
     default:
-        return false;
+        return is_index_signature(head.signature) && is_index_record(store, cell, head);
     }
 }
 

@@ -61,8 +61,8 @@ struct Block {
     ~Block();
 };
 
-// Whether the cell holds a whole record of a kind that begins with a signature. Plain data can look like one; what
-// takes it for another's then merely leaves it alone.
+// Whether the cell holds a record: it begins with a signature, and what it refers to is of the kind that it must be.
+// Plain data that begins like a record does not pass.
 bool is_record(Store& store, const Cell& cell);
 
 }  // namespace engine

@@ -54,8 +54,6 @@ bool is_anothers(Store& store, const KeyView& parent, const SubkeyIndex& index) 
 
 Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& index, const Name& name,
                      bool new_reference, CellOffset& key) {
-    if (!index.whole || index.total != parent.record.subkey_count)
-        return Inserted::failed;
     uint32_t position = 0;
     KeyView found;
     const Lookup lookup = find_subkey(store, index, parent.offset(), name, compare_index, position, found);
@@ -64,8 +62,9 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
         return Inserted::exists;
     }
     // Where a sibling cannot be read, the name may be there already.
-    if (lookup == Lookup::unreadable || is_anothers(store, parent, index) || name.length == 0 ||
-        name.length > longest_key_name || !place_for_name(store, index, name, position) || !can_grow(index, position))
+    if (!index.whole || index.total != parent.record.subkey_count || lookup == Lookup::unreadable ||
+        is_anothers(store, parent, index) || name.length == 0 || name.length > longest_key_name ||
+        !place_for_name(store, index, name, position) || !can_grow(index, position))
         return Inserted::failed;
 
     const CellOffset security = cell_offset(parent.record.security);
@@ -106,10 +105,7 @@ uint32_t set_parents(Store& store, CellOffset own, const SubkeyIndex& children, 
 
 // Puts the renamed record in the old one's place; both are complete. Every child knows the new one already.
 int32_t switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position, const Name& name,
-                       CellOffset renamed) {
-    uint32_t place = 0;
-    if (!place_for_name(store, index, name, place))
-        return R_CAN_NOT_COMPLETE;
+                       uint32_t place, CellOffset renamed) {
     KeyRecord changed = parent.record;
     if (2 * name.length > changed.longest_subkey)
         changed.longest_subkey = 2 * name.length;
@@ -123,16 +119,19 @@ int32_t switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, 
 
 int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position,
                       const SubkeyIndex& children, const KeyView& old, const Name& name) {
+    uint32_t place = 0;
+    if (!place_for_name(store, index, name, place) || !can_move(index, position, place))
+        return R_FAILED;
     KeyRecord record = old.record;
     record.flags = static_cast<uint16_t>(record.flags | key_name_8bit);
     record.name_length = static_cast<uint16_t>(name.length);
     const CellOffset renamed = place_key(store, record, name);
     if (renamed == CellOffset::none)
-        return R_CAN_NOT_COMPLETE;
+        return R_FAILED;
     const uint32_t set = set_parents(store, old.offset(), children, children.total, renamed);
     int32_t status = R_CAN_NOT_COMPLETE;
     if (set == children.total)
-        status = switch_records(store, parent, index, position, name, renamed);
+        status = switch_records(store, parent, index, position, name, place, renamed);
     if (status == R_SUCCESS) {
         // A note about the order of the key's own list does not hold for whatever takes its cell.
         if (store.sorted_key == old.offset())

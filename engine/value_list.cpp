@@ -175,8 +175,19 @@ CellOffset grow_list(Store& store, const ValueList& list) {
     return CellOffset::none;
 }
 
-// Puts the record into the list's next slot and the list into the key.
-Outcome link_value(Store& store, CellOffset key_offset, KeyRecord& key, ValueList list, CellOffset offset) {
+// The key's record with the longest value name and the largest data not below these.
+KeyRecord with_maxima(const KeyRecord& key, uint32_t name_bytes, uint32_t data_size) {
+    KeyRecord raised = key;
+    if (name_bytes > raised.longest_value)
+        raised.longest_value = name_bytes;
+    if (data_size > raised.largest_data)
+        raised.largest_data = data_size;
+    return raised;
+}
+
+// Puts the record into the list's next slot, and list and maxima into the key.
+Outcome link_value(Store& store, CellOffset key_offset, KeyRecord& key, ValueList list, CellOffset offset,
+                   const NewValue& value) {
     CellOffset grown = CellOffset::none;
     if (list.count == 0)
         grown = allocate(store, slot_size);
@@ -190,7 +201,7 @@ Outcome link_value(Store& store, CellOffset key_offset, KeyRecord& key, ValueLis
         list.cell.offset = grown;
     Le32 slot;
     slot = raw(offset);
-    KeyRecord changed = key;
+    KeyRecord changed = with_maxima(key, 2 * value.name.length, value.size);
     changed.value_count = list.count + 1;
     changed.value_list = raw(list.cell.offset);
     Outcome outcome = Outcome::unchanged;
@@ -203,15 +214,18 @@ Outcome link_value(Store& store, CellOffset key_offset, KeyRecord& key, ValueLis
     return outcome;
 }
 
-// Raises the key's longest value name and largest data. Written ahead of the value: they are upper bounds, so a stop
-// behind them says nothing untrue.
-bool raise_maxima(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t name_bytes, uint32_t data_size) {
-    KeyRecord raised = key;
-    if (name_bytes > raised.longest_value)
-        raised.longest_value = name_bytes;
-    if (data_size > raised.largest_data)
-        raised.largest_data = data_size;
-    return rewrite_key(store, key_offset, key, raised) == Outcome::written;
+// Replaces a value's data. The key's largest data is raised ahead of it: it is an upper bound, so a stop behind it
+// says nothing untrue. It is lowered again where the value has surely stayed as it was.
+bool update_value(Store& store, CellOffset key_offset, KeyRecord& key, const ValueView& old, const NewValue& value) {
+    const KeyRecord before = key;
+    if (rewrite_key(store, key_offset, key, with_maxima(key, 0, value.size)) != Outcome::written)
+        return false;
+    if (replace_value(store, old, value))
+        return true;
+    ValueView now;
+    if (read_value(store, old.cell.offset, now) && memcmp(&now.record, &old.record, sizeof now.record) == 0)
+        rewrite_key(store, key_offset, key, before);
+    return false;
 }
 
 }  // namespace
@@ -275,8 +289,8 @@ int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueV
 }
 
 // A new value, in turn: its data cell, its record, its slot in the list (in a longer copy of the list, where that has
-// no room), the key's record with count and list, then the old list is freed. Until the key's record is written the
-// value is not there.
+// no room), the key's record with count, list and maxima, then the old list is freed. Until the key's record is
+// written the value is not there.
 Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const NewValue& value) {
     const ValueList list = find_value_list(store, key);
     if (!list.whole || !is_own_cell(store, key_offset) || (list.count > 0 && !is_own_cell(store, list.cell.offset)))
@@ -286,17 +300,12 @@ Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const Ne
     // Where a record cannot be read, the name may be there already.
     if (position == unreadable_value)
         return Stored::failed;
-    if (position >= 0) {
-        return raise_maxima(store, key_offset, key, 0, value.size) && replace_value(store, old, value)
-                   ? Stored::replaced
-                   : Stored::failed;
-    }
-    if (!raise_maxima(store, key_offset, key, 2 * value.name.length, value.size))
-        return Stored::failed;
+    if (position >= 0)
+        return update_value(store, key_offset, key, old, value) ? Stored::replaced : Stored::failed;
     const CellOffset offset = place_value(store, value);
     if (offset == CellOffset::none)
         return Stored::failed;
-    const Outcome outcome = link_value(store, key_offset, key, list, offset);
+    const Outcome outcome = link_value(store, key_offset, key, list, offset, value);
     if (outcome == Outcome::written)
         return Stored::added;
     // Where it is surely not in the list, record and data go back.

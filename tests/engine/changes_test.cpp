@@ -252,6 +252,38 @@ TEST_F(Changing, the_maxima_follow_names_and_data) {
     EXPECT_EQ(field("Empty", 64), 300U);
 }
 
+TEST_F(Changing, the_maxima_stay_as_they_were_when_a_value_cannot_be_stored) {
+    HiveLayout layout = tree();
+    layout.no_free_space = true;
+    Scene full(layout);
+    full.file().capacity = full.bytes().size();
+    EXPECT_NE(full.Set("Alpha", "A new value with a long name", 3, pattern(5000)), 0);
+    EXPECT_NE(full.Set("Alpha", "Hundred", 3, pattern(5000)), 0);
+    const uint32_t record = full.Read().find("Alpha")->offset;
+    EXPECT_EQ(get32(full.bytes(), LaidHive::position(record, 60)), 14U);
+    EXPECT_EQ(get32(full.bytes(), LaidHive::position(record, 64)), 100U);
+    EXPECT_EQ(full.Changes(), std::vector<std::string>());
+}
+
+TEST_F(Changing, data_that_begins_like_a_record_is_updated_in_its_own_cell) {
+    for (const std::string signature : {"nk", "vk", "sk", "lf", "lh", "li", "ri", "db"}) {
+        HiveLayout layout;
+        Bytes stored = pattern(100);
+        std::copy(signature.begin(), signature.end(), stored.begin());
+        stored[2] = 1;  // as an index it would have one entry
+        stored[3] = 0;
+        layout.root.add("Key").set("v", 3, stored);
+        const LaidHive laid = lay_out(layout);
+        Scene other(laid.bytes);
+        EXPECT_EQ(other.Set("Key", "v", 3, pattern(100, 7)), 0);
+        EXPECT_EQ(other.Check(), "") << signature;
+        EXPECT_EQ(get32(other.bytes(), LaidHive::position(laid.at("Key").values[0].record, 8)),
+                  laid.at("Key").values[0].data)
+            << signature;
+        EXPECT_EQ(find_value(*other.Read().find("Key"), "v")->data, pattern(100, 7)) << signature;
+    }
+}
+
 TEST_F(Changing, two_hundred_values_grow_the_list) {
     for (int i = 0; i < 200; ++i) {
         ASSERT_EQ(scene.Set("Empty", "v" + std::to_string(i), 3, pattern(static_cast<size_t>(i))), 0);

@@ -146,6 +146,16 @@ TEST(Damaged, no_key_is_made_in_a_list_that_is_another_ones) {
     EXPECT_EQ(scene.Create("Alpha\\New"), 0);
 }
 
+TEST(Damaged, a_path_goes_through_a_key_that_exists_below_a_parent_whose_count_is_wrong) {
+    LaidHive hive = lay_out(tree());
+    hive.put32(hive.at("").record, 20, 4);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Create("New"), R_INVALID_PARAMETER);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(scene.Create("Gamma\\leaf\\New"), 0);
+    EXPECT_EQ(scene.Changes(), (std::vector<std::string>{"+ key Gamma\\leaf\\New"}));
+}
+
 TEST(Damaged, data_that_leads_to_a_key_is_moved_and_the_key_stays) {
     for (const size_t size : {5U, 40U, 76U}) {
         LaidHive hive = lay_out(tree());

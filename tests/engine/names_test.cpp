@@ -127,6 +127,27 @@ TEST(Hooks, text_goes_through_the_hooks_both_ways) {
     EXPECT_EQ(name[0], 0x20AC);
 }
 
+TEST(Hooks, two_names_that_are_widened_alike_are_still_two) {
+    const Hooks back;
+    HiveLayout layout;
+    layout.root.add("\xC4").set("\xC4", 4, {1, 0, 0, 0});
+    layout.root.add("\xD6").set("here", 4, {1, 0, 0, 0});
+    Scene scene(layout);
+    mb2wc_ptr = [](char c) { return static_cast<uint16_t>(static_cast<unsigned char>(c) < 0x80 ? c : 0xFFFD); };
+    Handle first = scene.OpenKey("\xC4");
+    Handle second = scene.OpenKey("\xD6");
+    EXPECT_EQ(RFindValueA(first.get(), "\xD6"), -1);
+    EXPECT_EQ(RFindValueA(second.get(), "here"), 0);
+    EXPECT_EQ(scene.Set("\xC4", "\xD6", 4, {2, 0, 0, 0}), 0);
+    first = scene.OpenKey("\xC4");
+    EXPECT_EQ(RFindValueA(first.get(), "\xC4"), 0);
+    EXPECT_EQ(RFindValueA(first.get(), "\xD6"), 1);
+    uint32_t disposition = 9;
+    EXPECT_EQ(scene.Create("\xDC", &disposition), 0);
+    EXPECT_EQ(disposition, 0U);
+    EXPECT_EQ(scene.Check(), "");
+}
+
 class Checksum : public testing::TestWithParam<std::pair<uint32_t, uint32_t>> {};
 
 TEST_P(Checksum, of_a_base_block_whose_words_give) {
@@ -192,6 +213,21 @@ TEST(Leaf, of_65535_entries_takes_no_other) {
     const Bytes before = scene.bytes();
     EXPECT_EQ(scene.Create("one more"), R_INVALID_PARAMETER);
     EXPECT_EQ(scene.bytes(), before);
+}
+
+TEST(Leaf, of_65535_entries_takes_none_from_another_leaf) {
+    HiveLayout layout;
+    KeyLayout& many = layout.root.add("many");
+    for (int i = 0; i < 65535; ++i)
+        many.add("k" + std::to_string(i));
+    many.add("z");
+    many.per_leaf = 65535;
+    Scene scene(layout);
+    ASSERT_TRUE(scene.is_open());
+    EXPECT_EQ(scene.Rename("many\\z", "a"), R_FAILED);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(scene.Rename("many\\z", "y"), 0);
+    EXPECT_EQ(scene.Check(), "");
 }
 
 }  // namespace

@@ -161,6 +161,15 @@ TEST_P(OpenPath, gives) {
     EXPECT_EQ(scene.Close(), 0);
 }
 
+TEST(OpenKey, backslashes_in_front_of_a_path_lead_to_the_same_key) {
+    Scene scene(tree());
+    Handle plain = scene.OpenKey("Alpha\\Inner");
+    Handle with = scene.OpenKey("\\\\\\Alpha\\Inner");
+    ASSERT_TRUE(plain);
+    ASSERT_TRUE(with);
+    EXPECT_EQ(RKeyOffset(plain.get()), RKeyOffset(with.get()));
+}
+
 INSTANTIATE_TEST_SUITE_P(Rows, OpenPath,
                          testing::Values(PathRow{"plain", "Alpha", 0, 0}, PathRow{"second", "Beta", 0, 1},
                                          PathRow{"any_case", "aLPHA\\INNER\\leaf", 0, 0},

@@ -78,10 +78,17 @@ TEST_P(OwnNameRoom, is_as_the_contract_says) {
     char name[20];
     memset(name, '#', sizeof name);
     uint32_t size = row.room;
-    EXPECT_EQ(RQueryInfoKeyA(key.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+    uint32_t class_size = 0;
+    uint32_t subkeys = 99;
+    uint32_t values = 99;
+    EXPECT_EQ(RQueryInfoKeyA(key.get(), name, &size, nullptr, &class_size, &subkeys, nullptr, nullptr, &values, nullptr,
                              nullptr, nullptr, nullptr),
               row.status);
     EXPECT_EQ(size, row.size);
+    // A name that was cut keeps nothing else back.
+    EXPECT_EQ(class_size, 10U);
+    EXPECT_EQ(subkeys, 1U);
+    EXPECT_EQ(values, 7U);
     EXPECT_EQ(std::string(name, 7), std::string(row.text, 7));
 }
 
@@ -185,6 +192,15 @@ INSTANTIATE_TEST_SUITE_P(
                     DataRow{"big_exact", "Big", 40000, 0, 40000}, DataRow{"wide_name", "wide", 100, 0, 4},
                     DataRow{"unknown_type", "Odd", 3, 0, 3}, DataRow{"missing", "None", 100, R_FILE_NOT_FOUND, 100}),
     [](const auto& row) { return row.param.rule; });
+
+TEST_F(Reading, a_value_that_is_not_there_gives_2_in_8_bits_too) {
+    uint32_t type = 99;
+    char data[4] = {};
+    uint32_t size = sizeof data;
+    EXPECT_EQ(RQueryValueExA(key.get(), "None", &type, data, &size), R_FILE_NOT_FOUND);
+    EXPECT_EQ(type, 99U);
+    EXPECT_EQ(size, sizeof data);
+}
 
 TEST_F(Reading, without_a_data_buffer_the_stored_size_comes_back) {
     uint32_t size = 1;
@@ -339,9 +355,11 @@ TEST_F(Reading, a_key_named_in_utf16_gives_123_and_its_bytes) {
     Handle wide;
     ASSERT_EQ(ROpenSubKey(scene.root(), 1, wide.out()), 0);
     size = sizeof name;
-    EXPECT_EQ(RQueryInfoKeyA(wide.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
+    uint32_t values = 99;
+    EXPECT_EQ(RQueryInfoKeyA(wide.get(), name, &size, nullptr, nullptr, nullptr, nullptr, nullptr, &values, nullptr,
                              nullptr, nullptr, nullptr),
               R_INVALID_NAME);
+    EXPECT_EQ(values, 0U);
     // One byte more, not one character: kept as callers know it.
     size = 0;
     EXPECT_EQ(RQueryInfoKeyW(wide.get(), nullptr, &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,

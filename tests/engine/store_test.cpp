@@ -245,8 +245,11 @@ TEST_F(Window, a_key_record_one_byte_too_long_is_written_without_that_byte_and_t
     const auto write = [&](uint32_t length) {
         return engine::write_at(store_of(scene), engine::sig_key, 4100 + int64_t{root}, record.data(), length);
     };
+    scene.file().arm({});
     EXPECT_EQ(write(81), 80U);
+    EXPECT_EQ(scene.file().counts().bytes_written, 80U);
     EXPECT_EQ(write(82), 0U);
+    EXPECT_EQ(scene.file().counts().bytes_written, 80U);
     EXPECT_EQ(write(76), 76U);
     record[0] = 'x';
     EXPECT_EQ(write(80), 0U);

@@ -72,7 +72,8 @@ std::vector<QPersistentModelIndex> read_tree(Mounted& mounted) {
     std::vector<QPersistentModelIndex> found;
     std::vector<std::pair<QModelIndex, int>> stack{{QModelIndex(), 0}};
     while (!stack.empty() && found.size() < most_keys) {
-        const auto [parent, depth] = stack.back();
+        const QModelIndex parent = stack.back().first;
+        const int depth = stack.back().second;
         stack.pop_back();
         for (int row = 0; row < mounted.model.rowCount(parent) && found.size() < most_keys; row++) {
             QModelIndex child;
@@ -174,7 +175,7 @@ private slots:
         const Entry& entry = hostile::catalogue()[static_cast<size_t>(number)];
         const Case hive = entry.make();
         if (entry.readable == Readable::no) {
-            QVERIFY_EXCEPTION_THROWN(Mounted{hive.bytes}, std::runtime_error);
+            QVERIFY_THROWS_EXCEPTION(std::runtime_error, Mounted{hive.bytes});
             return;
         }
         Mounted mounted(hive.bytes);

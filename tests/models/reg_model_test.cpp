@@ -98,7 +98,7 @@ private slots:
         QVERIFY(!RegModel::is_mount_name(QStringLiteral("SYSTEM")));
         QVERIFY(!RegModel::is_mount_name(QStringLiteral("/SYSTEM/")));
         QVERIFY(RegModel::is_mount_name(QStringLiteral("A/B")));
-        QVERIFY_EXCEPTION_THROWN(model.add_hive(QStringLiteral("SYSTEM"), QString()), std::out_of_range);
+        QVERIFY_THROWS_EXCEPTION(std::out_of_range, model.add_hive(QStringLiteral("SYSTEM"), QString()));
         QCOMPARE(model.rowCount(), 0);
     }
 
@@ -226,7 +226,7 @@ private slots:
         const QModelIndex damaged = model.index(1, 0, parent);
         QVERIFY(damaged.isValid());
         QCOMPARE(model.rowCount(damaged), 0);
-        QVERIFY_EXCEPTION_THROWN(model.data(damaged, Qt::DisplayRole), std::runtime_error);
+        QVERIFY_THROWS_EXCEPTION(std::runtime_error, model.data(damaged, Qt::DisplayRole));
         // A screen reader is told what is seen, without an exception.
         QCOMPARE(damaged.data(Qt::AccessibleTextRole).toString(), QStringLiteral("(cannot be read)"));
         QCOMPARE(model.index(3, 0, parent).data(Qt::AccessibleTextRole).toString(), QStringLiteral("zz"));

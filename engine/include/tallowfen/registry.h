@@ -149,12 +149,12 @@ int32_t RFindValueA(RegistryKey* key, const char* name);
 int32_t RQueryValueExA(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size);
 int32_t RQueryValueExW(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size);
 
-// The key itself. Unlike its Windows namesake the first text pair is the key's own name, the second its class.
-// Only a handle with flag 32 has a name; others give an empty one and size 0.
-// A: size is characters. Larger than the name: terminated, size becomes the length; equal: not terminated; smaller:
-// cut, 111. A name in UTF-16 is copied as stored, 123. No buffer or no room: size becomes the length.
-// Longest names are characters, the longest class and the class itself bytes, the largest data bytes.
-// security_size: the descriptor's length less 20. 6: not a key. 1003: the security record cannot be read.
+// The key itself. Unlike its Windows namesake the first text pair is the key's own name, the second its class. Only a
+// handle with flag 32 has a name; others give an empty one and size 0. A: size is characters. Larger than the name:
+// terminated, size becomes the length; equal: not terminated; smaller: cut, 111. A name in UTF-16 is copied as stored,
+// 123. All else is given with 111 and 123 as well. No buffer or no room: size becomes the length. Longest names are
+// characters, the longest class and the class itself bytes, the largest data bytes. security_size: the descriptor's
+// length less 20. 6: not a key. 1003: the security record cannot be read.
 int32_t RQueryInfoKeyA(RegistryKey* key, char* name, uint32_t* name_size, void* class_name, uint32_t* class_size,
                        uint32_t* out_subkeys, uint32_t* out_longest_subkey, uint32_t* out_longest_class,
                        uint32_t* out_values, uint32_t* out_longest_value, uint32_t* out_largest_data,
