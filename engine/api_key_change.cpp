@@ -3,6 +3,7 @@
 #include "allocator.h"
 #include "handle.h"
 #include "kinship.h"
+#include "leaf_edit.h"
 #include "security.h"
 #include "stored_name.h"
 #include "subkey_insert.h"
@@ -40,7 +41,7 @@ void free_index_cell(Store& store, const KeyRecord& key) {
     SubkeyIndex index = {};
     if (static_cast<int32_t>(offset) > 0 && load_index(store, offset, index) && index.whole && index.total == 0 &&
         !index.is_root)
-        free_cell(store, offset);
+        free_leaf(store, offset);
     free_index(index);
 }
 

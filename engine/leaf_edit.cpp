@@ -157,7 +157,7 @@ Outcome add_to_leaf(Store& store, CellOffset parent_offset, KeyRecord& parent, c
             take_back(store, parent_offset, parent, unchanged);
     }
     if (outcome == Outcome::written)
-        free_cell(store, leaf.cell.offset);
+        free_leaf(store, leaf.cell.offset);
     else if (outcome == Outcome::unchanged)
         free_cell(store, longer);
     return outcome;
@@ -180,7 +180,7 @@ Outcome take_out(Store& store, const SubkeyIndex& index, uint32_t position) {
         const Outcome outcome =
             rewrite_at(store, record_position(root.cell.offset), now.block.bytes, before.block.bytes, now.used());
         if (outcome == Outcome::written)
-            free_cell(store, leaf.cell.offset);
+            free_leaf(store, leaf.cell.offset);
         return outcome;
     }
     LeafBytes now(leaf);
@@ -252,6 +252,12 @@ Outcome move_between(Store& store, CellOffset parent_offset, KeyRecord& parent, 
 }
 
 }  // namespace
+
+void free_leaf(Store& store, CellOffset leaf) {
+    KeyView root;
+    if (read_key(store, store.root, root) && cell_offset(root.record.subkey_index) != leaf)
+        free_cell(store, leaf);
+}
 
 bool can_grow(const SubkeyIndex& index, uint32_t position) {
     return index.leaf_count == 0 || index.leaf(leaf_for_new(index, position)).count < leaf_limit;

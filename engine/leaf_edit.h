@@ -11,6 +11,10 @@ namespace engine {
 // A key is seen when both its parent's count and the leaf's count reach it. So a count that rises is written to the
 // parent first, and one that falls to the leaf first: no other key is ever out of sight.
 
+// Frees a leaf that its key leads to no more. Where the hive's root leads to it as well, in a damaged hive, it stays:
+// without it the hive would not open again.
+void free_leaf(Store& store, CellOffset leaf);
+
 // Whether the leaf that a new entry at this position would go to has room in its count.
 bool can_grow(const SubkeyIndex& index, uint32_t position);
 

@@ -94,33 +94,49 @@ bool is_index_signature(uint32_t signature) {
     return signature == sig_fast_leaf || signature == sig_hash_leaf || signature == sig_index_leaf;
 }
 
-// An index's first entry leads to a key, a root's to a leaf.
+// One of an index's first entries leads to a key, a root's to a leaf.
 bool is_index_record(Store& store, const Cell& cell, const IndexHead& head) {
-    Le32 entry;
-    if (head.count == 0 || !read_part(store, cell, sizeof head, &entry, sizeof entry))
+    constexpr uint32_t few = 16;
+    Le32 entries[2 * few];
+    const uint32_t per_entry = head.signature == sig_index_leaf || head.signature == sig_index_root ? 1 : 2;
+    const uint32_t in_cell = (cell.room() - static_cast<uint32_t>(sizeof head)) / (per_entry * 4);
+    uint32_t count = head.count < in_cell ? head.count : in_cell;
+    count = count < few ? count : few;
+    if (!read_part(store, cell, sizeof head, entries, count * per_entry * 4))
         return false;
-    const uint32_t below = signature_at(store, cell_offset(entry));
-    return head.signature == sig_index_root ? is_index_signature(below) : below == sig_key;
+    for (uint32_t i = 0; i < count; i++) {
+        const uint32_t below = signature_at(store, cell_offset(entries[i * per_entry]));
+        if (head.signature == sig_index_root ? is_index_signature(below) : below == sig_key)
+            return true;
+    }
+    return false;
 }
 
+// It has a neighbour in the ring, or a descriptor of the only revision there is.
 bool is_security_record(Store& store, const Cell& cell) {
     SecurityRecord record;
-    return read_part(store, cell, 0, &record, sizeof record) &&
-           signature_at(store, cell_offset(record.next)) == sig_security &&
-           signature_at(store, cell_offset(record.previous)) == sig_security;
+    if (!read_part(store, cell, 0, &record, sizeof record))
+        return false;
+    if (signature_at(store, cell_offset(record.next)) == sig_security ||
+        signature_at(store, cell_offset(record.previous)) == sig_security)
+        return true;
+    uint8_t revision = 0;
+    return record.descriptor_length > 0 && record.descriptor_length <= cell.room() - sizeof record &&
+           read_part(store, cell, sizeof record, &revision, sizeof revision) && revision == 1;
 }
 
 bool is_value_record(Store& store, const Cell& cell) {
     ValueView value;
     Cell data;
-    return read_value(store, cell.offset, value) &&
-           (value.is_inline() || value.size() == 0 || find_used_cell(store, cell_offset(value.record.data), data));
+    return read_value(store, cell.offset, value) && (value.record.flags <= value_name_8bit || value.is_inline() ||
+                                                     find_used_cell(store, cell_offset(value.record.data), data));
 }
 
+// Every key but a root has a name.
 bool is_key_record(Store& store, const Cell& cell) {
     KeyView key;
     return read_key(store, cell.offset, key) &&
-           (cell.offset == store.root || signature_at(store, cell_offset(key.record.parent)) == sig_key);
+           (key.record.name_length > 0 || signature_at(store, cell_offset(key.record.parent)) == sig_key);
 }
 
 }  // namespace

@@ -61,8 +61,8 @@ struct Block {
     ~Block();
 };
 
-// Whether the cell holds a record: it begins with a signature, and what it refers to is of the kind that it must be.
-// Plain data that begins like a record does not pass.
+// Whether the cell holds a record, judged by its signature and one more trait. A record that is damaged in another one
+// still counts. Plain data can pass for a record by chance; what takes it for another's then merely leaves it alone.
 bool is_record(Store& store, const Cell& cell);
 
 }  // namespace engine

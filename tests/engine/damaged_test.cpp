@@ -146,6 +146,22 @@ TEST(Damaged, no_key_is_made_in_a_list_that_is_another_ones) {
     EXPECT_EQ(scene.Create("Alpha\\New"), 0);
 }
 
+TEST(Damaged, a_key_made_in_the_list_of_the_root_leaves_the_root_its_list) {
+    HiveLayout layout;
+    layout.root.add("Loop");
+    LaidHive hive = lay_out(layout);
+    const KeyPlaces& loop = hive.at("Loop");
+    hive.put32(loop.record, 16, 0x4F00);
+    hive.put32(loop.record, 20, 1);
+    hive.put32(loop.record, 28, hive.at("").index);
+    Scene scene(hive.bytes);
+    ASSERT_TRUE(scene.is_open());
+    for (const char* name : {"a", "b", "c"})
+        scene.Create(std::string("Loop\\") + name);
+    EXPECT_TRUE(scene.Reopen());
+    EXPECT_TRUE(scene.OpenKey("Loop"));
+}
+
 TEST(Damaged, a_path_goes_through_a_key_that_exists_below_a_parent_whose_count_is_wrong) {
     LaidHive hive = lay_out(tree());
     hive.put32(hive.at("").record, 20, 4);
