@@ -17,7 +17,7 @@ int sized(int count);
 // The same for the arguments of a benchmark, as ArgsProduct takes them.
 std::vector<std::vector<int64_t>> sizes(const std::vector<int>& counts);
 
-// The hive that whole-file measures are taken on: the one that TALLOWFEN_BENCH_HIVE names, else the largest of the
+// The hive that whole-file measures are taken on: the one that TALLOWFEN_BENCH_HIVE names, else software-7 of the
 // tests' real ones, which a short run leaves alone. Empty: there is none, and one is to be made.
 std::string large_hive();
 

@@ -6,7 +6,7 @@
 #include "leaf_edit.h"
 #include "security.h"
 #include "stored_name.h"
-#include "subkey_insert.h"
+#include "subkey_change.h"
 
 #include <cstdlib>
 #include <cstring>

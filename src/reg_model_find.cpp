@@ -5,7 +5,7 @@
 #include "reg_hive.h"
 #include "reg_key.h"
 #include "reg_model.h"
-#include "value_names.h"
+#include "value_order.h"
 #include "values_model.h"
 
 #include <QMutexLocker>

@@ -3,7 +3,7 @@
 #include "values_proxy_model.h"
 
 #include "reg_key.h"
-#include "value_names.h"
+#include "value_order.h"
 #include "values_model.h"
 
 #include <QIcon>

@@ -408,12 +408,24 @@ class Program:
                 menu = self._popup(item)
                 until(lambda: has(menu, State.SHOWING), f"the menu {text!r} to open")
 
-    def menu_open(self, *path):
+    def menu_open(self, *path, timeout=20):
         """Waits until this menu of the menu bar is open."""
         menu = self.find(None, kind="menu bar")
         for text in path:
             menu = self._popup(self._item(menu, text))
-        until(lambda: has(menu, State.SHOWING), f"the menu {path} to open")
+        until(lambda: has(menu, State.SHOWING), f"the menu {path} to open", timeout)
+
+    def menu_by_keys(self, keys, *path):
+        """Opens a menu of the menu bar by keys. On a busy machine a press is lost now and then between the server, the
+        bus and the toolkit; a person would press again, and so does this, twice at most."""
+        for timeout in (5, 5, 20):
+            self.keys(keys)
+            try:
+                return self.menu_open(*path, timeout=timeout)
+            except Failure:
+                if timeout == 20:
+                    raise
+                print(f"   {keys} did not open {path}: pressed again", flush=True)
 
     def context_menu(self):
         """The context menu that is open."""

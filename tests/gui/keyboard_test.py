@@ -76,10 +76,8 @@ def current_row(session):
 def pick_new(session, steps_down):
     """The menu of new things: its first item is highlighted as it opens."""
     program = session.program
-    program.keys("alt+e")
-    program.menu_open("Edit")
-    program.keys("n")
-    program.menu_open("Edit", "New")
+    program.menu_by_keys("alt+e", "Edit")
+    program.menu_by_keys("n", "Edit", "New")
     program.keys(*["Down"] * steps_down, "Return")
 
 

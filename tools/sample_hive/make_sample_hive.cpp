@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-// make_sample_hive FILE: writes a small hive in the manner of a machine's SYSTEM hive, with a value of every
-// type.
+// make_sample_hive FILE [KEYS]: writes a small hive in the manner of a machine's SYSTEM hive, with a value of every
+// type, and so many keys more.
 
-#include "hive_layout.h"
+#include "sample_layout.h"
 
 #include <cstdio>
 #include <cstdlib>

@@ -1,6 +1,6 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#include "value_names.h"
+#include "value_order.h"
 
 #include "reg_key.h"
 

@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 // Lays a tree of keys and values out as the bytes of a hive file.
 
-#include "hive_layout.h"
+#include "sample_layout.h"
 
 #include <algorithm>
 #include <array>
@@ -152,7 +152,7 @@ Bytes security_descriptor() {
     return descriptor;
 }
 
-class HiveLayout {
+class SampleLayout {
 public:
     Bytes lay_out(SampleKey& root, const std::u16string& file_name) {
         // The root's record stands first, as its offset is what the base block leads to.
@@ -362,5 +362,5 @@ SampleKey& SampleKey::set_qword(std::string value_name, std::uint64_t number) {
 }
 
 std::vector<std::uint8_t> lay_out_hive(SampleKey root, const std::u16string& file_name) {
-    return HiveLayout().lay_out(root, file_name);
+    return SampleLayout().lay_out(root, file_name);
 }

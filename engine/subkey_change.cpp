@@ -1,6 +1,6 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#include "subkey_insert.h"
+#include "subkey_change.h"
 
 #include "allocator.h"
 #include "kinship.h"
