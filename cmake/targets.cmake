@@ -11,7 +11,7 @@ if(TALLOWFEN_SANITIZE)
     target_link_options(tallowfen_sanitizers INTERFACE -fsanitize=${TALLOWFEN_SANITIZE})
 endif()
 if(TALLOWFEN_COVERAGE)
-    target_compile_options(tallowfen_sanitizers INTERFACE --coverage -fprofile-update=atomic)
+    target_compile_options(tallowfen_sanitizers INTERFACE --coverage)
     target_link_options(tallowfen_sanitizers INTERFACE --coverage)
 endif()
 

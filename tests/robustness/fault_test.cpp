@@ -3,6 +3,7 @@
 //
 // The N-th read, write, seek or allocation of a change fails, for every N until none does.
 #include "alloc_faults.h"
+#include "failure_mode.h"
 #include "operations.h"
 #include "statuses.h"
 
@@ -103,17 +104,8 @@ void check_outcome(const Expectation& expected, Scene& scene, Handle& handle, in
     EXPECT_EQ(scene.Close(), R_SUCCESS);
 }
 
-struct Mode {
-    const char* name;
-    Call call;
-    bool lasting;
-    bool shortened;
-};
-
-void PrintTo(const Mode& mode, std::ostream* out) { *out << mode.name; }
-
 // Fails the calls of each change in turn; gives how often one failed.
-uint64_t sweep(const std::vector<Expectation>& all, const Mode& mode) {
+uint64_t sweep(const std::vector<Expectation>& all, const FailureMode& mode) {
     uint64_t struck_times = 0;
     for (const Expectation& expected : all) {
         for (uint64_t nth = 1;; nth++) {
@@ -137,7 +129,7 @@ uint64_t sweep(const std::vector<Expectation>& all, const Mode& mode) {
     return struck_times;
 }
 
-class Faults : public testing::TestWithParam<Mode> {};
+class Faults : public testing::TestWithParam<FailureMode> {};
 
 TEST_P(Faults, NothingElseIsHarmed) {
     const std::vector<Expectation> all = made_expectations();
@@ -153,15 +145,18 @@ TEST_P(Faults, NothingElseIsHarmedInRealHives) {
     }
 }
 
-INSTANTIATE_TEST_SUITE_P(
-    Calls, Faults,
-    testing::Values(Mode{"ReadOnce", Call::read, false, false}, Mode{"ReadFromThereOn", Call::read, true, false},
-                    Mode{"ReadShort", Call::read, false, true}, Mode{"ReadShortFromThereOn", Call::read, true, true},
-                    Mode{"WriteOnce", Call::write, false, false}, Mode{"WriteFromThereOn", Call::write, true, false},
-                    Mode{"WriteShort", Call::write, false, true},
-                    Mode{"WriteShortFromThereOn", Call::write, true, true}, Mode{"SeekOnce", Call::seek, false, false},
-                    Mode{"SeekFromThereOn", Call::seek, true, false}),
-    [](const auto& mode) { return mode.param.name; });
+INSTANTIATE_TEST_SUITE_P(Calls, Faults,
+                         testing::Values(FailureMode{"ReadOnce", Call::read, false, false},
+                                         FailureMode{"ReadFromThereOn", Call::read, true, false},
+                                         FailureMode{"ReadShort", Call::read, false, true},
+                                         FailureMode{"ReadShortFromThereOn", Call::read, true, true},
+                                         FailureMode{"WriteOnce", Call::write, false, false},
+                                         FailureMode{"WriteFromThereOn", Call::write, true, false},
+                                         FailureMode{"WriteShort", Call::write, false, true},
+                                         FailureMode{"WriteShortFromThereOn", Call::write, true, true},
+                                         FailureMode{"SeekOnce", Call::seek, false, false},
+                                         FailureMode{"SeekFromThereOn", Call::seek, true, false}),
+                         [](const auto& mode) { return mode.param.name; });
 
 class AllocationFaultSweep : public testing::TestWithParam<bool> {};
 

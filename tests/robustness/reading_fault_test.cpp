@@ -4,6 +4,7 @@
 // The N-th read, seek or allocation of every call that only reads fails: a status says so, nothing is
 // written, and the same handles answer as before afterwards.
 #include "alloc_faults.h"
+#include "failure_mode.h"
 #include "operations.h"
 #include "statuses.h"
 
@@ -161,16 +162,7 @@ std::vector<Place> real_places() {
     return places;
 }
 
-struct Mode {
-    const char* name;
-    Call call;
-    bool lasting;
-    bool shortened;
-};
-
-void PrintTo(const Mode& mode, std::ostream* out) { *out << mode.name; }
-
-void sweep(const std::vector<Place>& places, const Mode& mode) {
+void sweep(const std::vector<Place>& places, const FailureMode& mode) {
     for (const Place& place : places) {
         Reader reader(place.bytes, place.path);
         ASSERT_TRUE(reader.held);
@@ -193,18 +185,20 @@ void sweep(const std::vector<Place>& places, const Mode& mode) {
     }
 }
 
-class ReadingFaults : public testing::TestWithParam<Mode> {};
+class ReadingFaults : public testing::TestWithParam<FailureMode> {};
 
 TEST_P(ReadingFaults, HandlesAnswerAsBeforeAfterwards) { sweep(made_places(), GetParam()); }
 
 TEST_P(ReadingFaults, HandlesOfRealHivesAnswerAsBeforeAfterwards) { sweep(real_places(), GetParam()); }
 
-INSTANTIATE_TEST_SUITE_P(
-    Calls, ReadingFaults,
-    testing::Values(Mode{"ReadOnce", Call::read, false, false}, Mode{"ReadFromThereOn", Call::read, true, false},
-                    Mode{"ReadShort", Call::read, false, true}, Mode{"ReadShortFromThereOn", Call::read, true, true},
-                    Mode{"SeekOnce", Call::seek, false, false}, Mode{"SeekFromThereOn", Call::seek, true, false}),
-    [](const auto& mode) { return mode.param.name; });
+INSTANTIATE_TEST_SUITE_P(Calls, ReadingFaults,
+                         testing::Values(FailureMode{"ReadOnce", Call::read, false, false},
+                                         FailureMode{"ReadFromThereOn", Call::read, true, false},
+                                         FailureMode{"ReadShort", Call::read, false, true},
+                                         FailureMode{"ReadShortFromThereOn", Call::read, true, true},
+                                         FailureMode{"SeekOnce", Call::seek, false, false},
+                                         FailureMode{"SeekFromThereOn", Call::seek, true, false}),
+                         [](const auto& mode) { return mode.param.name; });
 
 TEST(ReadingWithoutMemory, HandlesAnswerAsBeforeAfterwards) {
     for (const Place& place : made_places()) {
