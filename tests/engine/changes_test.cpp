@@ -69,7 +69,20 @@ TEST_F(Changing, a_null_key_is_refused_by_every_call) {
     EXPECT_EQ(RDeleteValue(nullptr, "v"), R_INVALID_HANDLE);
     EXPECT_NE(RRenameKey(nullptr, 0, "x"), 0);
     EXPECT_EQ(RDeleteKey(nullptr, "x"), R_INVALID_HANDLE);
+    EXPECT_EQ(RCheckDeleteTree(nullptr, 0), R_INVALID_HANDLE);
     EXPECT_TRUE(scene.Untouched());
+}
+
+TEST_F(Changing, data_that_no_hive_has_room_for_is_refused_without_a_look_at_it) {
+    const Handle key = scene.OpenKey("Alpha");
+    for (const uint32_t size : {0x3FFFFFFFU, 0x7FFFF000U, 0x7FFFFFFFU, 0x80000000U, 0xFFFFFFFFU}) {
+        EXPECT_EQ(RSetValueExA(key.get(), "v", 1, "ab", size), R_FAILED) << size;
+        EXPECT_TRUE(scene.Untouched()) << size;
+    }
+    for (const uint32_t size : {0x7FFFF000U, 0x7FFFFFFFU, 0x80000000U, 0xFFFFFFFFU}) {
+        EXPECT_EQ(RSetValueExW(key.get(), "v", 3, "ab", size), R_FAILED) << size;
+        EXPECT_TRUE(scene.Untouched()) << size;
+    }
 }
 
 // ---- creating

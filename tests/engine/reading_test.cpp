@@ -193,6 +193,12 @@ INSTANTIATE_TEST_SUITE_P(
                     DataRow{"unknown_type", "Odd", 3, 0, 3}, DataRow{"missing", "None", 100, R_FILE_NOT_FOUND, 100}),
     [](const auto& row) { return row.param.rule; });
 
+TEST_F(Reading, without_a_name_buffer_the_room_for_the_name_comes_back_in_bytes) {
+    uint32_t size = 0;
+    EXPECT_EQ(REnumValueW(key.get(), 0, nullptr, &size, nullptr, nullptr, nullptr), 0);
+    EXPECT_EQ(size, 10U);  // "Text" and a final zero
+}
+
 TEST_F(Reading, a_value_that_is_not_there_gives_2_in_8_bits_too) {
     uint32_t type = 99;
     char data[4] = {};
