@@ -26,6 +26,11 @@ bool change_size(Store& store, int64_t position, int32_t before, int32_t now) {
     return rewrite_at(store, position, &word, &old_word, sizeof word) == Outcome::written;
 }
 
+// Makes one free cell of a run that is whole bytes long, by the size word of its first.
+bool join(Store& store, int64_t position, uint32_t first, uint32_t whole) {
+    return first == whole || change_size(store, position, static_cast<int32_t>(first), static_cast<int32_t>(whole));
+}
+
 // The bin whose largest free cell is the smallest that will do, the earliest of equals.
 const Bin* choose_bin(const Store& store, uint32_t size) {
     const Bin* best = nullptr;
@@ -183,19 +188,22 @@ CellOffset allocate(Store& store, uint32_t n) {
     return offset;
 }
 
-// In turn: the cell's size word turned positive, then one word for every free cell that a run's first one takes in.
-// The cells tile the bin after each.
+// In turn: the cell's size word turned positive, then one word for every run of free cells, whose first takes the
+// others in. The cells tile the bin after each.
 bool free_cell(Store& store, CellOffset offset) {
     Cell cell;
     if (!find_used_cell(store, offset, cell))
         return false;
-    const Bin bin = *bin_of(store, offset);
+    Bin& held = *bin_of(store, offset);
+    const HeldBin holder(store, held);
+    const Bin bin = held;
     const auto size_word = static_cast<int32_t>(cell.size);
     if (!change_size(store, cell_position(offset), -size_word, size_word))
         return false;
     const int64_t start = int64_t{base_block_size} + bin.offset;
     uint32_t run = 0;  // where the present run of free cells began, 0 outside one
-    uint32_t run_size = 0;
+    uint32_t first = 0;
+    uint32_t whole = 0;
     uint32_t walked = bin_header_size;
     while (walked < bin.size) {
         int32_t size;
@@ -203,19 +211,19 @@ bool free_cell(Store& store, CellOffset offset) {
         if (!read_size(store, start + walked, size) || !is_cell_size(size, bin.size - walked, absolute))
             return false;
         if (size < 0) {
+            if (run != 0 && !join(store, start + run, first, whole))
+                return false;
             run = 0;
         } else if (run == 0) {
             run = walked;
-            run_size = absolute;
+            first = absolute;
+            whole = absolute;
         } else {
-            const auto joined = static_cast<int32_t>(run_size + absolute);
-            if (!change_size(store, start + run, static_cast<int32_t>(run_size), joined))
-                return false;
-            run_size += absolute;
+            whole += absolute;
         }
         walked += absolute;
     }
-    return true;
+    return run == 0 || join(store, start + run, first, whole);
 }
 
 }  // namespace engine

@@ -48,7 +48,7 @@ void free_index_cell(Store& store, const KeyRecord& key) {
 // Frees what a key owned that nothing leads to any more. Of its values' records every other one goes, beginning with
 // the first, as when each was removed by its place in a list that closes up; the rest, and all data cells, stay
 // allocated.
-void free_key(Store& store, const KeyView& key) {
+void free_key(Store& store, const KeyView& key, CellOffset parent) {
     const ValueList values = find_value_list(store, key.record);
     for (uint32_t i = 0; i < values.count; i += 2) {
         ValueView value;
@@ -60,7 +60,8 @@ void free_key(Store& store, const KeyView& key) {
     if (values.count > 0 && !is_record(store, values.cell))
         free_cell(store, values.cell.offset);
     drop_security_reference(store, cell_offset(key.record.security));
-    if (store.sorted_key == key.offset())
+    // Another list may have led to this key as well: what takes its cell need not stand in order there.
+    if (store.sorted_key != parent)
         store.sorted_key = CellOffset::none;
     free_cell(store, key.offset());
 }
@@ -94,7 +95,7 @@ int32_t delete_at(RegistryKey& handle, const PathEnd& end) {
         status = R_FAILED;
     free_index(index);
     if (status == R_SUCCESS)
-        free_key(store, key);
+        free_key(store, key, end.parent);
     if (end.parent == handle.info->own)
         reread_counts(handle);
     return status;
@@ -107,7 +108,13 @@ struct Level {
     uint32_t next;  // the child to look at
 };
 
-// Whether the entry at a position can be deleted by its name: stored in 8 bits, and met first by that name.
+// Whether a path can lead to a key of this name.
+bool is_component(const Name& name) {
+    return name.length > 0 && name.length <= longest_key_name && memchr(name.bytes, '\\', name.length) == nullptr &&
+           memchr(name.bytes, '\0', name.length) == nullptr;
+}
+
+// Whether the entry at a position can be deleted by its name: stored in 8 bits, fit for a path, and met first by it.
 int32_t check_entry(Store& store, const Level& parent, uint32_t position, KeyView& key) {
     if (parent.children.is_root)
         return R_PATH_NOT_FOUND;
@@ -115,10 +122,11 @@ int32_t check_entry(Store& store, const Level& parent, uint32_t position, KeyVie
         return R_FAILED;
     if (key.wide())
         return R_INVALID_NAME;
+    const Name name = key.searchable();
     KeyView met;
     uint32_t where;
-    if (find_subkey(store, parent.children, parent.key.offset(), key.searchable(), compare_signed, where, met) !=
-            Lookup::found ||
+    if (!is_component(name) ||
+        find_subkey(store, parent.children, parent.key.offset(), name, compare_signed, where, met) != Lookup::found ||
         where != position || has_other_parent(store, parent.key.offset(), key))
         return R_PATH_NOT_FOUND;
     return check_lists(store, key);
@@ -142,6 +150,8 @@ int32_t check_tree(Store& store, Level* levels, uint32_t room, const Level& pare
         Level& level = levels[depth - 1];
         if (!level.children.whole || level.children.total != level.key.record.subkey_count) {
             status = R_FAILED;
+        } else if (level.children.total > 0 && (level.key.record.flags & (key_is_link | key_is_root)) != 0) {
+            status = R_INVALID_HANDLE;  // nothing is deleted below such a key
         } else if (level.next == level.children.total) {
             free_index(level.children);
             depth--;
@@ -228,6 +238,11 @@ int32_t RDeleteKey(RegistryKey* key, const char* path) {
     const StoredName stored(path);
     if (stored.text() == nullptr)
         return R_NOT_ENOUGH_MEMORY;
+    // A path is followed by as much of a component as can be told apart; what is deleted has the whole name.
+    const char* separator = strrchr(stored.text(), '\\');
+    const size_t last = strlen(separator != nullptr ? separator + 1 : stored.text());
+    if (last == 0 || last > longest_key_name)
+        return R_PATH_NOT_FOUND;
     PathEnd end;
     const int32_t status = follow_path(*key, stored.text(), end);
     if (status == R_NOT_ENOUGH_MEMORY)

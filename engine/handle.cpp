@@ -9,8 +9,6 @@ namespace engine {
 
 namespace {
 
-constexpr uint32_t component_limit = 259;  // longer components are cut there
-
 // Bytes of the class that are really there: a class that leads nowhere, or past its cell, is no class.
 uint32_t class_bytes(Store& store, const KeyRecord& record, Cell& cell) {
     const uint32_t length = record.class_length;
@@ -237,8 +235,8 @@ int32_t follow_path(RegistryKey& from, const char* path, PathEnd& end) {
     int32_t status = R_SUCCESS;
     while (*path != '\0') {
         const uint32_t length = component_length(path);
-        const Name name = {reinterpret_cast<const uint8_t*>(path), length < component_limit ? length : component_limit,
-                           false};
+        const Name name = {reinterpret_cast<const uint8_t*>(path),
+                           length < longest_key_name ? length : longest_key_name, false};
         KeyView key;
         if (end.depth == depth_limit ||
             find_subkey(store, *index, end.key, name, compare_signed, end.position, key) != Lookup::found) {

@@ -20,6 +20,9 @@ struct Name {
 
 Name name_of(const char* text);
 
+// Longest key name, in bytes, that a path can lead to: longer components are cut there, longer names not stored.
+constexpr uint32_t longest_key_name = 259;
+
 char upper(char c);
 
 // The order that a search by position goes by: upper-cased through toupper_ptr, characters as signed 8-bit numbers (so

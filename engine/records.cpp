@@ -27,11 +27,12 @@ bool read_key(Store& store, CellOffset offset, KeyView& key) {
     constexpr uint32_t most = sizeof(KeyRecord) + key_name_kept;
     const uint32_t wanted = key.cell.room() < most ? key.cell.room() : most;
     const uint32_t count = read_at(store, sig_key, record_position(offset), &key, wanted);
-    if (count != wanted || wanted < sizeof(KeyRecord))
+    if (count < sizeof(KeyRecord))
         return false;
     const uint32_t length = key.record.name_length;
     key.kept = length < key_name_kept ? length : key_name_kept;
-    return length <= key.cell.room() - sizeof(KeyRecord);
+    // What the cell has behind the name may be cut off with the file's end.
+    return length <= key.cell.room() - sizeof(KeyRecord) && count - sizeof(KeyRecord) >= key.kept;
 }
 
 Outcome rewrite_key(Store& store, CellOffset offset, KeyRecord& key, const KeyRecord& changed) {
@@ -56,27 +57,36 @@ Outcome rewrite_value(Store& store, const ValueView& value, const ValueRecord& c
 
 namespace {
 
-// buffer has room for the value's name; null when memory ran out.
-Named compare_name(Store& store, const ValueView& value, const Name& name, uint8_t* buffer) {
-    const uint32_t length = value.record.name_length;
+// Compares the first length bytes of the stored name; buffer has room for them, and is null when memory ran out.
+Named compare_name(Store& store, const ValueView& value, const Name& name, uint32_t length, uint8_t* buffer) {
     if (buffer == nullptr || !read_part(store, value.cell, sizeof(ValueRecord), buffer, length))
         return Named::unreadable;
-    return same_name(name, {buffer, length, value.wide()}) ? Named::so : Named::otherwise;
+    if (!same_name(name, {buffer, length, value.wide()}))
+        return Named::otherwise;
+    return length == value.record.name_length ? Named::so : Named::begun;
 }
 
 }  // namespace
 
-Named compare_value(Store& store, CellOffset offset, const Name& name, ValueView& value) {
+Named compare_value(Store& store, CellOffset offset, const Name& name, bool tell_begun, ValueView& value) {
     if (!read_value(store, offset, value))
         return Named::unreadable;
-    if (value.name_characters() != name.characters())
-        return Named::otherwise;
-    const uint32_t length = value.record.name_length;
+    uint32_t length = value.record.name_length;
+    if (value.name_characters() != name.characters()) {
+        uint8_t behind = 0;
+        if (!tell_begun || value.wide() || length < name.length)
+            return Named::otherwise;
+        if (!read_part(store, value.cell, static_cast<uint32_t>(sizeof(ValueRecord)) + name.length, &behind, 1))
+            return Named::unreadable;
+        if (behind != 0)
+            return Named::otherwise;
+        length = name.length;
+    }
     uint8_t few[512];
     if (length <= sizeof few)
-        return compare_name(store, value, name, few);
+        return compare_name(store, value, name, length, few);
     const Block many(length);
-    return compare_name(store, value, name, many.bytes);
+    return compare_name(store, value, name, length, many.bytes);
 }
 
 namespace {

@@ -46,9 +46,10 @@ struct ValueView {
 bool read_value(Store& store, CellOffset offset, ValueView& value);
 // Writes the fixed 20 bytes over what the file holds; the name stays.
 Outcome rewrite_value(Store& store, const ValueView& value, const ValueRecord& changed);
-enum class Named { so, otherwise, unreadable };
+enum class Named { so, begun, otherwise, unreadable };
 // Reads the value at an offset and says whether it has this name, case ignored; an empty name is the default value's.
-Named compare_value(Store& store, CellOffset offset, const Name& name, ValueView& value);
+// tell_begun: also whether it is an 8-bit name that goes on behind a zero byte after this one.
+Named compare_value(Store& store, CellOffset offset, const Name& name, bool tell_begun, ValueView& value);
 
 // A memory block that frees itself.
 struct Block {

@@ -104,7 +104,7 @@ void refresh_bin_at(Store& store, int64_t position) {
         else
             high = middle;
     }
-    if (low == store.bin_count || store.bins[low].offset > place)
+    if (low == store.bin_count || store.bins[low].offset > place || &store.bins[low] == store.held_bin)
         return;
     refresh_bin(store, store.bins[low]);
 }

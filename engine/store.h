@@ -53,6 +53,7 @@ struct Store {
     uint8_t* cell_map;
     uint32_t cell_map_size;  // bytes
 
+    const Bin* held_bin;    // not walked again after a write, see HeldBin; mostly null
     int32_t unread_bins;    // how many bins are unread
     uint32_t failed_reads;  // raised when the device fails, which tells what could not be read from what is not there
     int32_t recent_bin;     // where the last look-up of a cell ended: the next is mostly near
@@ -141,6 +142,22 @@ void map_bin(Store& store, Bin& bin);
 void refresh_bin(Store& store, Bin& bin);
 // The same for the bins that could not be walked the last time.
 void refresh_unread_bins(Store& store);
+// While it lives, writes do not find out that bin's cells afresh; its end does, once. For one change of many size
+// words, which nothing in between asks for. No bin may be added meanwhile.
+class HeldBin {
+public:
+    HeldBin(Store& store, Bin& bin) : store_(store), bin_(bin) { store.held_bin = &bin; }
+    HeldBin(const HeldBin&) = delete;
+    HeldBin& operator=(const HeldBin&) = delete;
+    ~HeldBin() {
+        store_.held_bin = nullptr;
+        refresh_bin(store_, bin_);
+    }
+
+private:
+    Store& store_;
+    Bin& bin_;
+};
 
 // Makes room for one more entry in the bin table; false when memory ran out, the table then being as before.
 bool reserve_bin(Store& store, int32_t growth);

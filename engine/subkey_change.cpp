@@ -54,6 +54,8 @@ bool is_anothers(Store& store, const KeyView& parent, const SubkeyIndex& index) 
 
 Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& index, const Name& name,
                      bool new_reference, CellOffset& key) {
+    if (name.length == 0 || name.length > longest_key_name)
+        return Inserted::failed;
     uint32_t position = 0;
     KeyView found;
     const Lookup lookup = find_subkey(store, index, parent.offset(), name, compare_index, position, found);
@@ -63,8 +65,8 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
     }
     // Where a sibling cannot be read, the name may be there already.
     if (!index.whole || index.total != parent.record.subkey_count || lookup == Lookup::unreadable ||
-        is_anothers(store, parent, index) || name.length == 0 || name.length > longest_key_name ||
-        !place_for_name(store, index, name, position) || !can_grow(index, position))
+        is_anothers(store, parent, index) || !place_for_name(store, index, name, position) ||
+        !can_grow(index, position))
         return Inserted::failed;
 
     const CellOffset security = cell_offset(parent.record.security);
@@ -133,9 +135,12 @@ int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, u
     if (set == children.total)
         status = switch_records(store, parent, index, position, name, place, renamed);
     if (status == R_SUCCESS) {
-        // A note about the order of the key's own list does not hold for whatever takes its cell.
+        // A note about the order of the key's own list goes with it; one about another list, which may have led to the
+        // old record as well, does not hold for whatever takes its cell.
         if (store.sorted_key == old.offset())
             store.sorted_key = renamed;
+        else if (store.sorted_key != parent.offset())
+            store.sorted_key = CellOffset::none;
         free_cell(store, old.offset());
     } else if (status == R_CAN_NOT_COMPLETE) {
         set_parents(store, old.offset(), children, set, old.offset());

@@ -8,9 +8,6 @@
 
 namespace engine {
 
-// Longest name, in bytes, that a look-up by path can tell apart; longer ones are not stored.
-constexpr uint32_t longest_key_name = 259;
-
 enum class Inserted { failed, exists, created };
 
 // Makes the subkey of that name under the parent, or finds the one that is there. key receives its offset.

@@ -200,8 +200,12 @@ CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position) 
 
 Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
                    uint32_t& position, KeyView& key) {
-    if (store.sorted_key == parent && parent != CellOffset::none)
-        return search_by(store, index, name, compare_upper, position, key);
+    if (store.sorted_key == parent && parent != CellOffset::none) {
+        const Lookup lookup = search_by(store, index, name, compare_upper, position, key);
+        if (lookup != Lookup::unreadable)
+            return lookup;
+        store.sorted_key = CellOffset::none;  // an entry that could be read then cannot now
+    }
     if (search_by(store, index, name, order, position, key) == Lookup::found ||
         search_by(store, index, name, compare_upper, position, key) == Lookup::found)
         return Lookup::found;

@@ -23,15 +23,6 @@ bool write_data(Store& store, CellOffset cell, const NewValue& value) {
     return write_at(store, sig_none, record_position(cell), value.data, value.size) == value.size;
 }
 
-// Writes new data of the same size over old; a write that fails leaves the old.
-bool overwrite_data(Store& store, CellOffset offset, const NewValue& value) {
-    Cell cell;
-    const Block before(value.size);
-    return before.bytes != nullptr && find_used_cell(store, offset, cell) &&
-           read_part(store, cell, 0, before.bytes, value.size) &&
-           rewrite_at(store, record_position(offset), value.data, before.bytes, value.size) == Outcome::written;
-}
-
 // A new cell that holds the value's data; none on failure, nothing then being left allocated.
 CellOffset place_data(Store& store, const NewValue& value) {
     const CellOffset cell = allocate(store, value.size);
@@ -49,39 +40,69 @@ void put_inline(ValueRecord& record, const NewValue& value) {
     record.size = value.size | data_inline;
 }
 
-// New data in a new cell, to which the record then leads; moved is the record as it stands afterwards. The old data
-// cell is left as it is.
-bool move_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value,
-               ValueRecord& moved) {
-    const CellOffset cell = place_data(store, value);
-    if (cell == CellOffset::none)
-        return false;
-    moved = record;
-    moved.data = raw(cell);
-    const Outcome outcome = rewrite_value(store, old, moved);
+// Makes the record lead to a new data cell, which is freed where that surely failed; record is then as it stands.
+bool lead_to(Store& store, const ValueView& old, CellOffset cell, ValueRecord& record) {
+    record.data = raw(cell);
+    const Outcome outcome = rewrite_value(store, old, record);
     if (outcome == Outcome::unchanged)
         free_cell(store, cell);
     return outcome == Outcome::written;
 }
 
-// New data in the data cell that the value has and keeps. While the cell is being written, the value stands in a
-// spare one. In turn, and what the value reads as after a stop there:
-//   spare cell taken and written: as before; the record leads to the spare cell: as after;
-//   the own cell written: as after; the record leads back to it: as after; the spare cell freed.
-// Where size and type stay, one write of the data does it.
+// New data in a new cell, to which the record then leads. The old data cell is left as it is.
+bool move_data(Store& store, const ValueView& old, ValueRecord record, const NewValue& value) {
+    const CellOffset cell = place_data(store, value);
+    return cell != CellOffset::none && lead_to(store, old, cell, record);
+}
+
+// New data in the data cell that the value has and keeps, and the record after it. What fails is undone.
+bool rewrite_in_place(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value) {
+    const int64_t position = record_position(cell_offset(old.record.data));
+    Cell cell;
+    const Block before(value.size);
+    if (before.bytes == nullptr || !find_used_cell(store, cell_offset(old.record.data), cell) ||
+        !read_part(store, cell, 0, before.bytes, value.size) ||
+        rewrite_at(store, position, value.data, before.bytes, value.size) != Outcome::written)
+        return false;
+    if (memcmp(&record, &old.record, sizeof record) == 0)
+        return true;
+    const Outcome outcome = rewrite_value(store, old, record);
+    if (outcome == Outcome::unchanged)
+        write_at(store, sig_none, position, before.bytes, value.size);
+    return outcome == Outcome::written;
+}
+
+// The same where size or type change, so that data and record must change together. While the cell is being written,
+// the value stands in a spare one. In turn, and what the value reads as after a stop there: spare cell taken and
+// written: as before; the record leads to the spare cell: as after; the own cell written: as after; the record leads
+// back to it: as after; the spare cell freed. Where the own cell cannot be written, the value stays in the spare one.
+// Where none is to be had, on a full disk, the two are written one after the other.
 bool rewrite_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value) {
-    const CellOffset own = cell_offset(old.record.data);
-    if (old.size() == value.size && old.record.type == value.type)
-        return overwrite_data(store, own, value);
+    const CellOffset spare = place_data(store, value);
+    if (spare == CellOffset::none)
+        return rewrite_in_place(store, old, record, value);
     ValueView spared = old;
-    if (!move_data(store, old, record, value, spared.record) || !write_data(store, own, value))
+    spared.record = record;
+    if (!lead_to(store, old, spare, spared.record))
         return false;
     ValueRecord back = spared.record;
-    back.data = raw(own);
-    if (rewrite_value(store, spared, back) != Outcome::written)
-        return false;
-    free_cell(store, cell_offset(spared.record.data));
+    back.data = old.record.data;
+    if (write_data(store, cell_offset(back.data), value) && rewrite_value(store, spared, back) == Outcome::written)
+        free_cell(store, spare);
     return true;
+}
+
+// Whether what a data offset leads to is not data at all: a record, a list of values (which has no signature, but
+// leads to values), or a cell that is shorter than the data and tells of no pieces.
+bool is_no_data(Store& store, const ValueView& value, const Cell& cell) {
+    Le32 first;
+    Le16 signature;
+    ValueView listed;
+    if (is_record(store, cell) ||
+        (read_part(store, cell, 0, &first, sizeof first) && read_value(store, cell_offset(first), listed)))
+        return true;
+    return value.size() > cell.room() &&
+           !(read_part(store, cell, 0, &signature, sizeof signature) && signature == sig_big_data);
 }
 
 bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
@@ -97,13 +118,13 @@ bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
     record.size = value.size;
     const CellOffset data = cell_offset(old.record.data);
     Cell cell;
-    ValueRecord moved;
-    // An offset that leads to no cell, or to another record, is replaced; what lies there is left alone.
-    if (old.is_inline() || old.size() == 0 || !find_used_cell(store, data, cell) || is_record(store, cell))
-        return move_data(store, old, record, value, moved);
+    // An offset that leads to no cell, or to something else than data, is replaced; what lies there is left alone.
+    if (old.is_inline() || old.size() == 0 || !find_used_cell(store, data, cell) || is_no_data(store, old, cell))
+        return move_data(store, old, record, value);
     if (cell.room() >= value.size)
-        return rewrite_data(store, old, record, value);
-    if (!move_data(store, old, record, value, moved))
+        return old.size() == value.size && old.record.type == value.type ? rewrite_in_place(store, old, record, value)
+                                                                         : rewrite_data(store, old, record, value);
+    if (!move_data(store, old, record, value))
         return false;
     free_cell(store, data);
     return true;
@@ -266,25 +287,30 @@ CellOffset value_at(Store& store, const ValueList& list, uint32_t i) {
     return values_at(store, list, i, &offset, 1) == 1 ? offset : CellOffset::none;
 }
 
-int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value) {
+int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value, int32_t* begun) {
     // Slots are fetched many at a time, or the window would go to and fro between the list and the records.
     constexpr uint32_t most = 2048;
     CellOffset offsets[most];
     int32_t missing = list.whole ? no_value : unreadable_value;
+    int32_t first_begun = no_value;
     uint32_t position = 0;
     while (position < list.count) {
         const uint32_t count = values_at(store, list, position, offsets, most);
         if (count == 0)
             return unreadable_value;
         for (uint32_t i = 0; i < count; i++) {
-            const Named named = compare_value(store, offsets[i], name, value);
+            const Named named = compare_value(store, offsets[i], name, begun != nullptr, value);
             if (named == Named::so)
                 return static_cast<int32_t>(position + i);
             if (named == Named::unreadable)
                 missing = unreadable_value;
+            if (named == Named::begun && first_begun == no_value)
+                first_begun = static_cast<int32_t>(position + i);
         }
         position += count;
     }
+    if (begun != nullptr)
+        *begun = first_begun;
     return missing;
 }
 

@@ -22,9 +22,10 @@ CellOffset value_at(Store& store, const ValueList& list, uint32_t i);
 uint32_t values_at(Store& store, const ValueList& list, uint32_t i, CellOffset* offsets, uint32_t most);
 constexpr int32_t no_value = -1;
 constexpr int32_t unreadable_value = -2;
-// Position of the value of that name; no_value when there is none, unreadable_value when there may be one among records
-// that cannot be read.
-int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value);
+// Position of the value of that name; no_value when there is none, unreadable_value when there may be one among
+// records that cannot be read. begun, when given, receives the position of the first value whose name goes on behind a
+// zero byte after that name, or no_value.
+int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value, int32_t* begun = nullptr);
 
 struct NewValue {
     Name name;

@@ -113,6 +113,18 @@ TEST_F(Changing, a_path_that_cannot_be_made_gives_87) {
     EXPECT_TRUE(scene.Untouched());
 }
 
+TEST_F(Changing, a_name_too_long_to_be_stored_leads_to_no_key_that_begins_like_it) {
+    HiveLayout layout;
+    layout.root.add(std::string(600, 'm'));
+    Scene other(layout);
+    for (const size_t length : {260U, 519U, 520U, 521U, 600U}) {
+        Handle made;
+        EXPECT_EQ(RCreateKey(other.root(), std::string(length, 'm').c_str(), made.out(), nullptr), R_INVALID_PARAMETER);
+        EXPECT_FALSE(made);
+    }
+    EXPECT_TRUE(other.Untouched());
+}
+
 TEST_F(Changing, a_new_key_takes_time_class_and_security_from_its_parent) {
     HiveLayout layout = tree();
     layout.security_records = 2;
@@ -276,6 +288,34 @@ TEST_F(Changing, the_maxima_stay_as_they_were_when_a_value_cannot_be_stored) {
     EXPECT_EQ(get32(full.bytes(), LaidHive::position(record, 60)), 14U);
     EXPECT_EQ(get32(full.bytes(), LaidHive::position(record, 64)), 100U);
     EXPECT_EQ(full.Changes(), std::vector<std::string>());
+}
+
+TEST_F(Changing, data_that_fits_its_cell_needs_no_room_on_a_full_disk) {
+    HiveLayout layout = tree();
+    layout.no_free_space = true;
+    Scene full(layout);
+    full.file().capacity = full.bytes().size();
+    EXPECT_EQ(full.Set("Alpha", "Hundred", 3, pattern(50, 7)), 0);  // shorter
+    EXPECT_EQ(full.Set("Alpha", "Hundred", 9, pattern(50, 8)), 0);  // another type
+    EXPECT_EQ(full.Check(), "");
+    EXPECT_EQ(full.Changes().size(), 1U);
+    const Hive now = full.Read();
+    EXPECT_EQ(find_value(*now.find("Alpha"), "Hundred")->data, pattern(50, 8));
+    EXPECT_EQ(find_value(*now.find("Alpha"), "Hundred")->type, 9U);
+    EXPECT_EQ(full.Set("Alpha", "Hundred", 3, pattern(101)), R_FAILED);
+}
+
+// What the call says is what the file holds, whichever write fails.
+TEST_F(Changing, an_update_that_a_failed_write_cuts_short_says_whether_the_new_data_is_there) {
+    for (uint64_t nth = 1;; nth++) {
+        Scene other(tree());
+        other.file().arm({MemoryFile::Call::write, nth, false, false});
+        const int32_t status = other.Set("Alpha", "Hundred", 3, pattern(50, 7));
+        if (!other.file().failed())
+            break;
+        const Hive now = other.Read();
+        EXPECT_EQ(find_value(*now.find("Alpha"), "Hundred")->data == pattern(50, 7), status == 0) << nth;
+    }
 }
 
 TEST_F(Changing, data_that_begins_like_a_record_is_updated_in_its_own_cell) {

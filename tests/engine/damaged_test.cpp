@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
 #include <cstring>
 
 using namespace testkit;
@@ -194,6 +195,94 @@ TEST(Damaged, data_that_leads_to_its_own_value_does_not_destroy_it) {
     const Hive now = scene.Read();
     ASSERT_NE(find_value(*now.find("Alpha"), "Raw"), nullptr);
     EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->data, pattern(8, 5));
+}
+
+// A list of values has no signature.
+TEST(Damaged, data_that_leads_to_a_list_of_values_is_moved_and_the_list_stays) {
+    for (const char* owner : {"Alpha", "Beta"}) {     // its own key's list, and another's
+        for (const uint32_t said : {4U, 5U, 100U}) {  // the size that the damaged record states
+            for (const size_t size : {5U, 8U, 16U, 200U}) {
+                LaidHive hive = lay_out(tree());
+                hive.put32(hive.at("Alpha").values[1].record, 4, said);
+                hive.put32(hive.at("Alpha").values[1].record, 8, hive.at(owner).value_list);
+                Scene scene(hive.bytes);
+                EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(size, 5)), 0);
+                const Hive now = scene.Read();
+                ASSERT_NE(find_value(*now.find("Alpha"), "Raw"), nullptr);
+                EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->data, pattern(size, 5));
+                ASSERT_NE(find_value(*now.find("Alpha"), "Text"), nullptr);
+                EXPECT_EQ(find_value(*now.find("Alpha"), "Text")->data, text_data("hello"));
+                ASSERT_NE(find_value(*now.find("Beta"), "v"), nullptr);
+                EXPECT_EQ(find_value(*now.find("Beta"), "v")->data, pattern(40));
+            }
+        }
+    }
+}
+
+// Below A the key mm, which B lists as well, between others that stand in order.
+LaidHive listed_twice() {
+    HiveLayout layout;
+    layout.free_bytes = 600;
+    KeyLayout& a = layout.root.add("A");
+    for (const char* name : {"z", "y", "mm"})
+        a.add(name);
+    a.sorted = false;
+    KeyLayout& b = layout.root.add("B");
+    for (const char* name : {"c", "e", "m", "q", "s"})
+        b.add(name);
+    LaidHive hive = lay_out(layout);
+    hive.put32(hive.at("B").index, 4 + 2 * 8, hive.at("A\\mm").record);
+    return hive;
+}
+
+TEST(Damaged, a_list_that_another_keys_deletion_has_put_out_of_order_hides_none_of_its_keys) {
+    Scene scene(listed_twice().bytes);
+    EXPECT_FALSE(scene.OpenKey("B\\zz"));  // looks at the whole list, which is in order so far
+    EXPECT_EQ(scene.Delete("A\\mm"), 0);
+    for (const char* path : {"B\\c", "B\\e", "B\\q", "B\\s"})
+        EXPECT_TRUE(scene.OpenKey(path)) << path;
+    // What takes the cell stands in B's list too, out of order.
+    EXPECT_EQ(scene.Create("A\\ww"), 0);
+    uint32_t disposition = 9;
+    EXPECT_EQ(scene.Create("B\\q", &disposition), 0);
+    EXPECT_EQ(disposition, 1U);
+}
+
+TEST(Damaged, a_list_that_another_keys_rename_has_put_out_of_order_hides_none_of_its_keys) {
+    Scene scene(listed_twice().bytes);
+    EXPECT_FALSE(scene.OpenKey("B\\zz"));
+    Handle a = scene.OpenKey("A");
+    EXPECT_EQ(RRenameKey(a.get(), 2, "a name that needs a longer cell than before"), 0);
+    for (const char* path : {"B\\c", "B\\e", "B\\q", "B\\s"})
+        EXPECT_TRUE(scene.OpenKey(path)) << path;
+}
+
+TEST(Damaged, a_key_whose_cells_last_bytes_are_cut_off_with_the_files_end_is_read) {
+    HiveLayout layout;
+    layout.root.add("Alpha").add("Inner");
+    LaidHive hive = lay_out(layout);
+    // The key's record goes into the free cell that ends the last bin.
+    const uint32_t end = get32(hive.bytes, 40);
+    const uint32_t room = 96;
+    const uint32_t from = hive.at("Alpha\\Inner").record;
+    uint32_t last = end - 4096 + 32;
+    while (last + static_cast<uint32_t>(std::abs(hive.cell_size(last))) < end)
+        last += static_cast<uint32_t>(std::abs(hive.cell_size(last)));
+    const int32_t free_size = hive.cell_size(last);
+    ASSERT_GT(free_size, 200);
+    hive.set_cell_size(last, free_size - static_cast<int32_t>(room));
+    const uint32_t to = end - room;
+    hive.set_cell_size(to, -static_cast<int32_t>(room));
+    memcpy(hive.bytes.data() + 4100 + to, hive.bytes.data() + 4100 + from, 76 + 5);
+    hive.put32(hive.at("Alpha").index, 4, to);
+    hive.mark_free(from);
+    for (const uint32_t kept : {room - 4, 76U + 6U, 76U + 5U}) {
+        Scene scene(Bytes(hive.bytes.begin(), hive.bytes.begin() + 4100 + to + kept));
+        EXPECT_TRUE(scene.OpenKey("Alpha\\Inner")) << kept;
+    }
+    Scene scene(Bytes(hive.bytes.begin(), hive.bytes.begin() + 4100 + to + 76 + 4));
+    EXPECT_TRUE(scene.OpenKey("Alpha"));
+    EXPECT_FALSE(scene.OpenKey("Alpha\\Inner"));
 }
 
 TEST(Damaged, a_value_that_its_list_has_twice_keeps_its_record_until_both_are_gone) {

@@ -59,6 +59,31 @@ TEST(Names, a_stored_name_with_trailing_zero_bytes_is_found_without_them) {
     EXPECT_TRUE(scene.Untouched());
 }
 
+TEST(Names, a_value_name_counts_up_to_its_first_zero_byte_unless_another_value_has_just_that_name) {
+    HiveLayout layout;
+    KeyLayout& key = layout.root.add("Key");
+    for (const std::u16string& name :
+         {std::u16string(u"one\0", 4), std::u16string(u"two\0x", 5), std::u16string(u"two"),
+          std::u16string(u"wide\0", 5), std::u16string(u"\0z", 2)}) {
+        key.set("", 3, pattern(8));
+        key.values.back().name = name;
+        key.values.back().wide_name = name.starts_with(u"wide");
+    }
+    Scene scene(layout);
+    Handle handle = scene.OpenKey("Key");
+    EXPECT_EQ(RFindValueA(handle.get(), "ONE"), 0);
+    EXPECT_EQ(RFindValueA(handle.get(), "two"), 2);
+    EXPECT_EQ(RFindValueA(handle.get(), "wide"), -1);
+    EXPECT_EQ(RFindValueA(handle.get(), ""), 4);
+    EXPECT_EQ(RFindValueA(handle.get(), "on"), -1);
+    EXPECT_EQ(RDeleteValue(handle.get(), "one"), 0);
+    EXPECT_EQ(RDeleteValue(handle.get(), "two"), 0);
+    EXPECT_EQ(RFindValueA(handle.get(), "two"), 0);
+    // To store goes by the whole name: a value is added.
+    EXPECT_EQ(RSetValueExW(handle.get(), "two", 3, "data", 4), 0);
+    EXPECT_EQ(RFindValueA(handle.get(), "two"), 3);
+}
+
 // Puts the hooks back.
 struct Hooks {
     ~Hooks() {

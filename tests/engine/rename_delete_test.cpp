@@ -195,6 +195,18 @@ TEST_F(Moving, a_deletion_by_a_longer_path_reaches_the_last_component) {
     EXPECT_EQ(scene.Check(), "");
 }
 
+TEST_F(Moving, a_name_longer_than_a_path_can_tell_apart_deletes_no_key_that_begins_like_it) {
+    EXPECT_EQ(scene.Create("Top\\" + std::string(259, 'm')), 0);
+    EXPECT_EQ(scene.Create("Top\\" + std::string(259, 'm') + "\\below"), 0);
+    Handle top = scene.OpenKey("Top");
+    scene.MarkBase();
+    EXPECT_EQ(RDeleteKey(top.get(), std::string(260, 'm').c_str()), R_PATH_NOT_FOUND);
+    EXPECT_EQ(RDeleteKey(top.get(), "Alone\\"), R_PATH_NOT_FOUND);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(RDeleteKey(top.get(), (std::string(300, 'm') + "\\below").c_str()), 0);
+    EXPECT_EQ(RDeleteKey(top.get(), std::string(259, 'm').c_str()), 0);
+}
+
 TEST_F(Moving, the_last_key_of_a_security_record_takes_it_along) {
     HiveLayout layout;
     layout.security_records = 3;
@@ -225,6 +237,66 @@ TEST_F(Moving, whether_a_tree_can_be_deleted_is_told_without_writing) {
     EXPECT_NE(RCheckDeleteTree(top.get(), 9), 0);
     EXPECT_EQ(RCheckDeleteTree(scene.root(), 0), R_INVALID_HANDLE);
     EXPECT_TRUE(scene.Untouched());
+}
+
+// Whether the subkey of Top at a position has no subkeys.
+bool is_without_children(Scene& scene, uint32_t position) {
+    const Hive hive = scene.Read();
+    return hive.find("Top")->children.at(position).children.empty();
+}
+
+struct Refusing {
+    const char* rule;
+    std::u16string name;
+    uint16_t flags;
+    int32_t status;
+};
+
+class TreeRefused : public testing::TestWithParam<Refusing> {};
+
+// Each of these is one that RDeleteKey, which goes by path and by its parent's handle, refuses.
+TEST_P(TreeRefused, before_anything_is_deleted_wherever_it_stands) {
+    for (const bool nested : {false, true}) {
+        HiveLayout layout;
+        KeyLayout& top = layout.root.add("Top");
+        KeyLayout& key = nested ? top.add("Between") : top;
+        key.add("first");
+        key.children.push_back({});
+        key.children.back().name = GetParam().name;
+        key.children.back().flags = GetParam().flags;
+        key.children.back().add("below").set("v", 4, {1, 2, 3, 4});
+        Scene scene(layout);
+        ASSERT_TRUE(scene.is_open());
+        Handle handle = scene.OpenKey("Top");
+        uint32_t position = 0;
+        while (!nested && is_without_children(scene, position))
+            position++;
+        EXPECT_EQ(RCheckDeleteTree(handle.get(), position), GetParam().status);
+        EXPECT_TRUE(scene.Untouched());
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Rows, TreeRefused,
+                         testing::Values(Refusing{"empty", u"", 0, R_PATH_NOT_FOUND},
+                                         Refusing{"longer_than_a_path_tells_apart", std::u16string(260, u'm'), 0,
+                                                  R_PATH_NOT_FOUND},
+                                         Refusing{"zero_inside", std::u16string(u"m\0n", 3), 0, R_PATH_NOT_FOUND},
+                                         Refusing{"backslash", u"first\\n", 0, R_PATH_NOT_FOUND},
+                                         Refusing{"backslash_at_the_end", u"m\\", 0, R_PATH_NOT_FOUND},
+                                         Refusing{"link", u"link", 0x10, R_INVALID_HANDLE},
+                                         Refusing{"marked_as_root", u"root", 0x04, R_INVALID_HANDLE}),
+                         [](const auto& row) { return row.param.rule; });
+
+TEST_F(Moving, a_link_without_subkeys_and_a_name_of_259_characters_can_be_deleted) {
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    top.add("link").flags = 0x10;
+    top.add(std::string(259, 'm')).add("below");
+    Scene other(layout);
+    Handle handle = other.OpenKey("Top");
+    EXPECT_EQ(RCheckDeleteTree(handle.get(), 0), 0);
+    EXPECT_EQ(RCheckDeleteTree(handle.get(), 1), 0);
+    EXPECT_EQ(RDeleteKey(handle.get(), "link"), 0);
 }
 
 TEST_F(Moving, every_cut_of_a_rename_opens_and_keeps_what_it_did_not_name) {

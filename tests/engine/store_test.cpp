@@ -169,12 +169,37 @@ TEST_F(AllocatorRow, the_length_of_a_cell_is_absolute_and_a_multiple_of_eight) {
     EXPECT_EQ(engine::cell_length(store_of(scene), engine::cell_offset(row.cell[0])), 24);
     free_cell(row.cell[1]);
     EXPECT_EQ(engine::cell_length(store_of(scene), engine::cell_offset(row.cell[1])), 24);
-    set32(scene.file().bytes, 4096 + uint64_t{row.cell[0]}, static_cast<uint32_t>(-20));
-    scene.Reopen();
-    // The hive may be refused for it; then there is nothing to ask.
-    if (scene.is_open()) {
-        EXPECT_EQ(engine::cell_length(store_of(scene), engine::cell_offset(row.cell[0])), -1);
-    }
+    scene.file().bytes[4096 + row.cell[0]] = static_cast<uint8_t>(-20);
+    const uint8_t nothing = 0;
+    // The window is read anew.
+    engine::write_at(store_of(scene), engine::sig_none, 4096 + int64_t{row.cell[0]}, &nothing, 0);
+    EXPECT_EQ(engine::cell_length(store_of(scene), engine::cell_offset(row.cell[0])), -1);
+}
+
+// A bin whose cells are of 8 bytes each, two free ones before each used one. Returns the calls that freeing a used one
+// in the middle takes.
+uint64_t calls_to_free_among(uint32_t bin_bytes) {
+    HiveLayout layout;
+    layout.free_bytes = bin_bytes;
+    LaidHive hive = lay_out(layout);
+    const uint32_t end = get32(hive.bytes, 40);
+    uint32_t bin = 0;
+    while (bin + get32(hive.bytes, 4096 + uint64_t{bin} + 8) < end)
+        bin += get32(hive.bytes, 4096 + uint64_t{bin} + 8);
+    uint32_t place = 0;
+    for (uint32_t at = bin + 32; at < end; at += 8)
+        hive.set_cell_size(at, place++ % 3 == 2 ? -8 : 8);
+    Scene scene(hive.bytes);
+    scene.file().arm({});
+    EXPECT_TRUE(engine::free_cell(store_of(scene), engine::cell_offset(bin + 32 + 8 * 302)));
+    EXPECT_EQ(cells(scene.bytes(), bin)[0], 16);
+    EXPECT_EQ(cells(scene.bytes(), bin)[200], 40);
+    const MemoryFile::Counts& counts = scene.file().counts();
+    return counts.reads + counts.writes;
+}
+
+TEST(Allocator, freeing_among_small_cells_takes_calls_in_step_with_the_bin_and_not_with_its_square) {
+    EXPECT_LT(calls_to_free_among(64 * 1024 - 32), 5 * calls_to_free_among(16 * 1024 - 32));
 }
 
 // ---- the window
@@ -254,6 +279,24 @@ TEST_F(Window, a_key_record_one_byte_too_long_is_written_without_that_byte_and_t
     record[0] = 'x';
     EXPECT_EQ(write(80), 0U);
     EXPECT_TRUE(scene.Untouched());
+}
+
+// "vk" records keep the same rule as "nk" records.
+TEST_F(Window, a_value_record_one_byte_too_long_is_written_without_that_byte_and_two_are_refused) {
+    const int64_t place = static_cast<int64_t>(scene.bytes().size()) - 400;  // in the free cell
+    Bytes record(26, 0);
+    record[0] = 'v';
+    record[1] = 'k';
+    record[2] = 4;
+    const auto write = [&](uint32_t length) {
+        return engine::write_at(store_of(scene), engine::sig_value, place, record.data(), length);
+    };
+    scene.file().arm({});
+    EXPECT_EQ(write(25), 24U);
+    EXPECT_EQ(scene.file().counts().bytes_written, 24U);
+    EXPECT_EQ(write(26), 0U);
+    EXPECT_EQ(scene.file().counts().bytes_written, 24U);
+    EXPECT_EQ(write(24), 24U);
 }
 
 }  // namespace

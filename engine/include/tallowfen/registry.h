@@ -142,8 +142,9 @@ int32_t REnumValueA(RegistryKey* key, uint32_t index, char* name, uint32_t* name
 // the data cannot be read. Without a data buffer data_size becomes the stored size.
 int32_t REnumValueW(RegistryKey* key, uint32_t index, uint16_t* name, uint32_t* name_size, uint32_t* out_type,
                     void* data, uint32_t* data_size);
-// The position of the value of that name, case ignored; a null or empty name means the unnamed (default) value.
-// -1: none. A name stored in UTF-16 is compared as text, never as bytes.
+// The position of the value of that name, case ignored; a null or empty name means the unnamed (default) value. -1:
+// none. A name stored in UTF-16 is compared as text, never as bytes. A stored 8-bit name counts up to its first zero
+// byte, unless another value has just the name asked for.
 int32_t RFindValueA(RegistryKey* key, const char* name);
 // A value by name. 6: not a key. 2: no such value. Otherwise as REnumValueA / REnumValueW without a name.
 int32_t RQueryValueExA(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size);
@@ -184,7 +185,8 @@ int32_t RDeleteValue(RegistryKey* key, const char* name);
 // has its old name.
 int32_t RRenameKey(RegistryKey* key, uint32_t index, const char* new_name);
 // Deletes the key at `path`, which must have no subkeys. 1013: read-only. 6: a handle without flag 32. 3: not found,
-// listed below an index root, or listed elsewhere too. 145: it has subkeys. -1, 1003: a step failed.
+// listed below an index root, or listed elsewhere too; also where the path ends in a backslash or in a component of
+// more than 259 characters. 145: it has subkeys. -1, 1003: a step failed.
 int32_t RDeleteKey(RegistryKey* key, const char* path);
 // What RDeleteKey would say to the index-th subkey and to each key below it, leaves first; writes nothing. 0: the whole
 // subtree can be deleted key by key.
