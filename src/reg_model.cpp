@@ -135,18 +135,20 @@ bool RegModel::setData(const QModelIndex& index, const QVariant& value, int) {
     RegKey* const key = editable_key(parent);
     if (key == nullptr)
         return false;
-    const int row = key->rename_key(index.row(), value.toString());
+    const int old_row = index.row();
+    const int row = key->rename_key(old_row, value.toString());
     if (row < 0)
         return false;
-    if (row == index.row()) {
+    if (row == old_row) {
         emit dataChanged(index, index);
         return true;
     }
     // Announced without layoutAboutToBeChanged and ahead of the index's move: the tree sits directly on this model, and
     // what listens has come to rely on this order.
     emit layoutChanged();
-    move_persistent_indexes(index, this->index(row, 0, parent));
-    renumber_frames();
+    const QModelIndex moved = this->index(row, 0, parent);
+    move_persistent_indexes(index, moved);
+    let_frames_follow_rename(moved, old_row);
     return true;
 }
 
@@ -175,7 +177,7 @@ int RegModel::new_key(const QModelIndex& parent) {
         return -3;
     beginInsertRows(parent, row, row);
     endInsertRows();
-    renumber_frames();
+    let_frames_follow_new_key(index(row, 0, parent));
     return row;
 }
 

@@ -9,6 +9,7 @@
 
 #include <map>
 #include <memory>
+#include <set>
 #include <vector>
 
 class AbstractRegKey;
@@ -67,11 +68,13 @@ public:
     QModelIndex searched_key();
 
 private:
-    // A place of the search still to be visited: a key (value -1), or one row of a key's shown values.
+    // A place of the search still to be visited: a key, or one row of a key's shown values.
     struct Frame {
         QModelIndex key;
-        int value;
+        int value;  // the row, or one of the two below
     };
+    static constexpr int with_siblings = -1;  // the key, and its later siblings after it
+    static constexpr int alone = -2;          // the key without its siblings: a rename took it away from them
 
     static AbstractRegKey* key_of(const QModelIndex& index);
     QModelIndex index_of(AbstractRegKey* key) const;
@@ -81,16 +84,26 @@ private:
     bool remove_key(int row, const QModelIndex& parent);
     void move_persistent_indexes(const QModelIndex& renamed, const QModelIndex& moved);
 
+    void push_next_sibling(const QModelIndex& key);
     void push_key_frames(const Frame& frame, FindMode mode);
+    void push_value_frames(const QModelIndex& key, const std::vector<int>& rows);
+    void renew_value_frames();
     bool is_stopped();
+    std::vector<Frame>::iterator sibling_frame(const AbstractRegKey* parent);
     void forget_frames_below(const AbstractRegKey* key);
+    void let_frames_follow_rename(const QModelIndex& moved, int old_row);
+    void let_frames_follow_new_key(const QModelIndex& made);
     void renumber_frames();
 
     std::vector<std::unique_ptr<AbstractRegKey>> top_level_;
     std::vector<std::unique_ptr<RegHive>> hives_;
     std::vector<Frame> search_;  // the last one is visited next
-    QModelIndex searched_;       // set by find; the tree may have changed since
-    QMutex mutex_;               // guards stop_ alone
+    // Keys that a rename has put among those that a frame stands for, though they were visited or have frames alone.
+    std::set<const AbstractRegKey*> passed_over_;
+    // The shown value names that the rows of the value frames count in; those frames are one key's, always.
+    std::vector<QString> value_names_;
+    QModelIndex searched_;  // set by find; the tree may have changed since
+    QMutex mutex_;          // guards stop_ alone
     bool stop_ = false;
     // How many keys of each hive the search may still visit, and go further down from. A damaged hive can list a key
     // more often than the file has room for keys; twice what its size allows bounds the walk, the first half of it

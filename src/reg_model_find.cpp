@@ -12,6 +12,8 @@
 #include <QRegExp>
 
 #include <algorithm>
+#include <iterator>
+#include <numeric>
 
 namespace {
 
@@ -30,21 +32,14 @@ bool matches(const QString& text, const QString& term, int kind) {
     return text.indexOf(term, 0, Qt::CaseInsensitive) != -1;
 }
 
-// The shown value names of the key that the search is at: read and sorted once for all of its values.
-class CurrentNames {
-public:
-    const std::vector<QString>& of(RegKey* key) {
-        if (key != key_) {
-            names_ = shown_value_names(*key, ValuesModel::default_name());
-            key_ = key;
-        }
-        return names_;
-    }
-
-private:
-    RegKey* key_ = nullptr;
-    std::vector<QString> names_;
-};
+// Takes a name out of a collection of names that may hold it more than once. false: it does not hold it.
+bool take(std::multiset<QString>& names, const QString& name) {
+    const auto found = names.find(name);
+    if (found == names.end())
+        return false;
+    names.erase(found);
+    return true;
+}
 
 // Passes a lock where one thread leaves data to another.
 class HandOver {
@@ -62,8 +57,10 @@ private:
 
 void RegModel::begin_find(const QModelIndex& start) {
     search_.clear();
+    passed_over_.clear();
+    value_names_.clear();
     if (start.isValid())
-        search_.push_back({start, -1});
+        search_.push_back({start, with_siblings});
     keys_left_.clear();
     for (const auto& hive : hives_) {
         const qint64 most = most_keys(*hive);
@@ -84,6 +81,12 @@ bool RegModel::is_stopped() {
     return stop_;
 }
 
+void RegModel::push_next_sibling(const QModelIndex& key) {
+    const QModelIndex sibling = index(key.row() + 1, 0, parent(key));
+    if (sibling.isValid())
+        search_.push_back({sibling, with_siblings});
+}
+
 // What a key leads to, so that its values come first, then its subkeys, then its later siblings.
 void RegModel::push_key_frames(const Frame& frame, FindMode mode) {
     const AbstractRegKey* const visited = key_of(frame.key);
@@ -98,40 +101,78 @@ void RegModel::push_key_frames(const Frame& frame, FindMode mode) {
         goes_on = left.to_visit > 0 || in_hive == in_hive->hive()->root_key();
         goes_down = goes_down && left.to_descend > 0;
     }
-    const QModelIndex sibling = goes_on ? index(frame.key.row() + 1, 0, parent(frame.key)) : QModelIndex();
-    if (sibling.isValid())
-        search_.push_back({sibling, -1});
+    if (goes_on && frame.value == with_siblings)
+        push_next_sibling(frame.key);
     const QModelIndex child = goes_down ? index(0, 0, frame.key) : QModelIndex();
     if (child.isValid())
-        search_.push_back({child, -1});
+        search_.push_back({child, with_siblings});
     RegKey* const key = mode.testFlag(FindValues) ? editable_key(frame.key) : nullptr;
     if (key == nullptr)
         return;
-    const int rows = key->value_count() + (key->has_default_value() ? 0 : 1);
-    for (int row = rows - 1; row >= 0; row--)
-        search_.push_back({frame.key, row});
+    // Read and sorted once for all of the key's values.
+    value_names_ = shown_value_names(*key, ValuesModel::default_name());
+    std::vector<int> rows(value_names_.size());
+    std::iota(rows.begin(), rows.end(), 0);
+    push_value_frames(frame.key, rows);
+}
+
+void RegModel::push_value_frames(const QModelIndex& key, const std::vector<int>& rows) {
+    for (auto row = rows.rbegin(); row != rows.rend(); ++row)
+        search_.push_back({key, *row});
+}
+
+// The user may have changed the values of the key that the last hit was in, and with them the rows of the others. What
+// was not visited is visited in its row of now, and nothing else is; where a name is new, it may be what became of one
+// that is gone and was not visited: then it is visited too, at the price that another new name may be as well.
+void RegModel::renew_value_frames() {
+    if (search_.empty() || search_.back().value < 0)
+        return;
+    const QModelIndex key = search_.back().key;
+    std::vector<bool> is_awaited(value_names_.size(), false);
+    for (; !search_.empty() && search_.back().value >= 0; search_.pop_back())
+        is_awaited[static_cast<size_t>(search_.back().value)] = true;
+    std::multiset<QString> visited;
+    std::multiset<QString> awaited;
+    for (size_t row = 0; row < value_names_.size(); row++)
+        (is_awaited[row] ? awaited : visited).insert(value_names_[row]);
+    // Without its frames already: should the key throw, the search goes on behind it the next time.
+    searched_ = key;
+    value_names_ = shown_value_names(*editable_key(key), ValuesModel::default_name());
+    std::vector<int> rows;
+    std::vector<int> new_names;
+    for (size_t row = 0; row < value_names_.size(); row++) {
+        if (take(awaited, value_names_[row]))
+            rows.push_back(static_cast<int>(row));
+        else if (!take(visited, value_names_[row]))
+            new_names.push_back(static_cast<int>(row));
+    }
+    if (!awaited.empty())
+        rows.insert(rows.end(), new_names.begin(), new_names.end());
+    std::sort(rows.begin(), rows.end());
+    push_value_frames(key, rows);
 }
 
 RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mode, Qt::MatchFlags flags) {
     const QString text = term.toString();
     const int kind = static_cast<int>(flags) & 0xF;
-    CurrentNames names;
     // The stack is the worker's from here on and goes back at the end. The pool orders the two ends already, but in
     // code that the thread sanitizer cannot see.
     const HandOver hand_over(&mutex_);
+    if (mode.testFlag(FindValues))
+        renew_value_frames();
     int counter = 1;
     while (!search_.empty()) {
         const Frame frame = search_.back();
         search_.pop_back();
         searched_ = frame.key;
-        if (frame.value < 0) {
+        if (frame.value == with_siblings && passed_over_.erase(key_of(frame.key)) > 0) {
+            push_next_sibling(frame.key);
+        } else if (frame.value < 0) {
             push_key_frames(frame, mode);
             if (mode.testFlag(FindKeys) && matches(data(frame.key, Qt::DisplayRole).toString(), text, kind))
                 return {frame.key, -1};
         } else if (mode.testFlag(FindValues)) {
-            const std::vector<QString>& shown = names.of(editable_key(frame.key));
-            const auto row = static_cast<size_t>(frame.value);
-            if (row < shown.size() && matches(shown[row], text, kind))
+            if (matches(value_names_[static_cast<size_t>(frame.value)], text, kind))
                 return {frame.key, frame.value};
         }
         if (counter == frames_between_stop_checks) {
@@ -150,29 +191,73 @@ QModelIndex RegModel::searched_key() {
     return searched_;
 }
 
+// The frame of a key's children, which stands for one of them and all behind it. There is no other one.
+std::vector<RegModel::Frame>::iterator RegModel::sibling_frame(const AbstractRegKey* parent) {
+    return std::find_if(search_.begin(), search_.end(), [&](const Frame& frame) {
+        return frame.value == with_siblings && key_of(frame.key)->parent() == parent;
+    });
+}
+
 // The stack must never lead to a key that is gone.
 void RegModel::forget_frames_below(const AbstractRegKey* key) {
-    const auto is_below = [&](const Frame& frame) {
-        for (const AbstractRegKey* up = key_of(frame.key); up != nullptr; up = up->parent()) {
-            if (up == key)
-                return true;
-        }
-        return false;
+    const auto is_below = [&](const AbstractRegKey* up) {
+        while (up != nullptr && up != key)
+            up = up->parent();
+        return up == key;
     };
     // A deleted key's frame stands for its later siblings too; its successor takes that over.
     for (Frame& frame : search_) {
-        if (key_of(frame.key) != key || frame.value >= 0)
+        if (key_of(frame.key) != key || frame.value != with_siblings)
             continue;
         const QModelIndex next = index(frame.key.row() + 1, 0, parent(frame.key));
         if (next.isValid())
             frame.key = next;
     }
-    search_.erase(std::remove_if(search_.begin(), search_.end(), is_below), search_.end());
+    const auto is_gone = [&](const Frame& frame) { return is_below(key_of(frame.key)); };
+    search_.erase(std::remove_if(search_.begin(), search_.end(), is_gone), search_.end());
+    for (auto passed = passed_over_.begin(); passed != passed_over_.end();)
+        passed = is_below(*passed) ? passed_over_.erase(passed) : std::next(passed);
+}
+
+// The keys from the frame's row on are those still to be visited, and stay so: the frame stands for the first of them
+// again. Only the renamed key may have crossed that row.
+void RegModel::let_frames_follow_rename(const QModelIndex& moved, int old_row) {
+    const QModelIndex parent = this->parent(moved);
+    const AbstractRegKey* const key = key_of(moved);
+    const auto frame = sibling_frame(key->parent());
+    if (frame != search_.end()) {
+        const int row = frame->key.row();
+        int first = row;
+        if (old_row < row && moved.row() >= row)
+            first--;
+        else if (old_row >= row && moved.row() < row)
+            first++;
+        const bool is_among_them = moved.row() >= first;
+        const bool was_awaited = old_row >= row && passed_over_.erase(key) == 0;
+        if (!was_awaited && is_among_them)
+            passed_over_.insert(key);
+        const QModelIndex start = index(first, 0, parent);
+        const bool leaves = was_awaited && !is_among_them;
+        frame->key = start.isValid() ? start : moved;
+        if (leaves && start.isValid())
+            search_.insert(frame + 1, {moved, alone});
+        else if (leaves)
+            frame->value = alone;
+        else if (!start.isValid())
+            search_.erase(frame);
+    }
+    renumber_frames();
+}
+
+// A new key is visited where it comes to stand at or behind the first of those that are still to be visited.
+void RegModel::let_frames_follow_new_key(const QModelIndex& made) {
+    const auto frame = sibling_frame(key_of(made)->parent());
+    if (frame != search_.end() && frame->key.row() == made.row())
+        frame->key = made;
+    renumber_frames();
 }
 
 void RegModel::renumber_frames() {
-    for (Frame& frame : search_) {
-        if (frame.key.isValid())
-            frame.key = index_of(key_of(frame.key));
-    }
+    for (Frame& frame : search_)
+        frame.key = index_of(key_of(frame.key));
 }

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "hive_on_disk.h"
 #include "real_hives.h"
+#include "searched.h"
 
 #include "reg_key.h"
 #include "reg_model.h"
@@ -27,36 +28,6 @@ testkit::HiveLayout layout() {
     hive.root.add("prerun");
     return hive;
 }
-
-QString path_of(const QModelIndex& index) {
-    QStringList names;
-    for (QModelIndex up = index; up.isValid(); up = up.parent())
-        names.prepend(up.data().toString());
-    return names.join(QLatin1Char('/'));
-}
-
-struct Searched {
-    HiveOnDisk file;
-    RegModel model;
-
-    Searched() : file(layout()) { model.add_hive(QStringLiteral("TOP/HIVE"), file.path()); }
-    explicit Searched(const testkit::Bytes& bytes) : file(bytes) {
-        model.add_hive(QStringLiteral("TOP/HIVE"), file.path());
-    }
-
-    // Every hit of a search from the first group on, as "PATH" or "PATH : ROW".
-    QStringList all(const QString& term, RegModel::FindMode mode, Qt::MatchFlags flags = Qt::MatchContains) {
-        QStringList hits;
-        model.begin_find(model.index(0, 0));
-        for (;;) {
-            const RegModel::FindResult hit = model.find(term, mode, flags);
-            if (!hit.key.isValid())
-                return hits;
-            hits.append(path_of(hit.key) +
-                        (hit.value_row < 0 ? QString() : QStringLiteral(" : %1").arg(hit.value_row)));
-        }
-    }
-};
 
 QStringList list(std::initializer_list<const char*> names) {
     QStringList all;
@@ -98,37 +69,37 @@ class FindTest : public QObject {
 
 private slots:
     void a_substring_is_found_in_any_case() {
-        QCOMPARE(Searched().all(QStringLiteral("run"), RegModel::FindKeys),
+        QCOMPARE(Searched(layout()).all(QStringLiteral("run"), RegModel::FindKeys),
                  list({"TOP/HIVE/prerun", "TOP/HIVE/Software/RunOnce"}));
     }
 
     void a_whole_string_is_no_part_of_a_longer_one() {
-        Searched searched;
+        Searched searched(layout());
         QCOMPARE(searched.all(QStringLiteral("run"), RegModel::FindKeys, Qt::MatchFixedString), QStringList());
         QCOMPARE(searched.all(QStringLiteral("RUNONCE"), RegModel::FindKeys, Qt::MatchFixedString),
                  list({"TOP/HIVE/Software/RunOnce"}));
     }
 
     void a_wildcard_pattern_matches_the_whole_name() {
-        Searched searched;
+        Searched searched(layout());
         QCOMPARE(searched.all(QStringLiteral("*service?"), RegModel::FindKeys, Qt::MatchWildcard),
                  list({"TOP/HIVE/Software/MyServiceA"}));
         QCOMPARE(searched.all(QStringLiteral("service?"), RegModel::FindKeys, Qt::MatchWildcard), QStringList());
     }
 
     void the_default_value_is_in_every_key_that_shows_values() {
-        QCOMPARE(Searched().all(QStringLiteral("(Default)"), RegModel::FindValues),
+        QCOMPARE(Searched(layout()).all(QStringLiteral("(Default)"), RegModel::FindValues),
                  list({"TOP/HIVE/prerun : 0", "TOP/HIVE/Software : 0", "TOP/HIVE/Software/MyServiceA : 0",
                        "TOP/HIVE/Software/MyServiceAB : 0", "TOP/HIVE/Software/RunOnce : 0"}));
     }
 
     void a_key_comes_before_its_values() {
-        QCOMPARE(Searched().all(QStringLiteral("run"), RegModel::FindKeys | RegModel::FindValues),
+        QCOMPARE(Searched(layout()).all(QStringLiteral("run"), RegModel::FindKeys | RegModel::FindValues),
                  list({"TOP/HIVE/prerun", "TOP/HIVE/Software/RunOnce", "TOP/HIVE/Software/RunOnce : 1"}));
     }
 
     void a_hit_without_a_value_has_the_row_minus_one() {
-        Searched searched;
+        Searched searched(layout());
         searched.model.begin_find(searched.model.index(0, 0));
         const RegModel::FindResult hit =
             searched.model.find(QStringLiteral("HIVE"), RegModel::FindKeys, Qt::MatchContains);
@@ -137,13 +108,15 @@ private slots:
     }
 
     void nothing_found_ends_at_once_when_asked_again() {
-        Searched searched;
+        Searched searched(layout());
         QCOMPARE(searched.all(QStringLiteral("absent"), RegModel::FindKeys | RegModel::FindValues), QStringList());
         QVERIFY(!searched.model.find(QStringLiteral("run"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
         QCOMPARE(searched.all(QStringLiteral("run"), {}), QStringList());
     }
 
-    void an_empty_term_matches_every_name() { QCOMPARE(Searched().all(QString(), RegModel::FindKeys).size(), 7); }
+    void an_empty_term_matches_every_name() {
+        QCOMPARE(Searched(layout()).all(QString(), RegModel::FindKeys).size(), 7);
+    }
 
     // The flag is looked at after the tenth frame, and then after every eleventh.
     void a_stopped_search_ends_within_eleven_frames() {
@@ -164,7 +137,7 @@ private slots:
     }
 
     void a_search_survives_that_its_next_key_is_deleted() {
-        Searched searched;
+        Searched searched(layout());
         searched.model.begin_find(searched.model.index(0, 0));
         const auto next = [&] {
             return searched.model.find(QStringLiteral("service"), RegModel::FindKeys, Qt::MatchContains).key;
