@@ -130,10 +130,13 @@ RegKey* RegModel::editable_key(const QModelIndex& index) {
     return index.parent().parent().isValid() ? static_cast<RegKey*>(key_of(index)) : nullptr;
 }
 
+// Whether an index still says where its key is. What acts on a row must not act on another key that has come to it.
+bool RegModel::is_current(const QModelIndex& index) const { return row_of(key_of(index)) == index.row(); }
+
 bool RegModel::setData(const QModelIndex& index, const QVariant& value, int) {
     const QModelIndex parent = index.parent();
     RegKey* const key = editable_key(parent);
-    if (key == nullptr)
+    if (key == nullptr || !is_current(index))
         return false;
     const int old_row = index.row();
     const int row = key->rename_key(old_row, value.toString());
@@ -183,7 +186,7 @@ int RegModel::new_key(const QModelIndex& parent) {
 
 bool RegModel::removeRows(int row, int count, const QModelIndex& parent) {
     RegKey* const key = parent.isValid() ? editable_key(parent) : nullptr;
-    if (key == nullptr || count != 1 || row < 0 || row >= key->child_count())
+    if (key == nullptr || !is_current(parent) || count != 1 || row < 0 || row >= key->child_count())
         return false;
     // A refusal half-way would leave a branch without its leaves, so the engine is asked about all of it first.
     if (!key->can_delete_tree(row))

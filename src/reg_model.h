@@ -47,10 +47,10 @@ public:
     int rowCount(const QModelIndex& parent = QModelIndex()) const override;
     int columnCount(const QModelIndex& parent = QModelIndex()) const override;
     QVariant data(const QModelIndex& index, int role) const override;
-    // Renames a key. The role is not looked at.
+    // Renames a key. The role is not looked at. An index whose row is another key's by now changes nothing.
     bool setData(const QModelIndex& index, const QVariant& value, int role) override;
     Qt::ItemFlags flags(const QModelIndex& index) const override;
-    // Deletes one key with all below it, leaves first.
+    // Deletes one key with all below it, leaves first. A parent whose row is another key's by now loses nothing.
     bool removeRows(int row, int count, const QModelIndex& parent = QModelIndex()) override;
     // Makes a subkey; returns its row. -1: no parent; -2: not under this one; -3: refused.
     int new_key(const QModelIndex& parent);
@@ -79,6 +79,7 @@ private:
     static AbstractRegKey* key_of(const QModelIndex& index);
     QModelIndex index_of(AbstractRegKey* key) const;
     int row_of(const AbstractRegKey* key) const;
+    bool is_current(const QModelIndex& index) const;
     QVariant spoken_name(const QModelIndex& index) const;
     int key_depth(const QModelIndex& index) const;
     bool remove_key(int row, const QModelIndex& parent);

@@ -213,6 +213,29 @@ private slots:
         QVERIFY(mounted.names(mounted.at(control)).contains(QStringLiteral("rooted")));
     }
 
+    void an_index_whose_row_is_another_key_s_by_now_changes_nothing() {
+        Mounted mounted;
+        const QModelIndex leaf = mounted.at(control + QStringLiteral("/leaf"));
+        const QModelIndex branch = mounted.at(control + QStringLiteral("/branch"));
+        const QModelIndex deep = mounted.at(control + QStringLiteral("/branch/deep"));
+        const QPersistentModelIndex followed_leaf(leaf);
+        const QPersistentModelIndex followed_branch(branch);
+        QVERIFY(mounted.model.setData(branch, QStringLiteral("yy"), Qt::EditRole));
+        const testkit::Bytes before = mounted.file.bytes();
+        QVERIFY(!mounted.model.setData(leaf, QStringLiteral("new"), Qt::EditRole));
+        QVERIFY(!mounted.model.setData(branch, QStringLiteral("new"), Qt::EditRole));
+        QVERIFY(!mounted.model.removeRows(deep.row(), 1, branch));
+        QVERIFY(mounted.file.bytes() == before);
+        // What the model moves goes on working.
+        QVERIFY(mounted.model.setData(followed_leaf, QStringLiteral("leaf 2"), Qt::EditRole));
+        QVERIFY(mounted.model.setData(followed_branch, QStringLiteral("a"), Qt::EditRole));
+        QCOMPARE(followed_branch.row(), 0);
+        QVERIFY(mounted.model.removeRows(deep.row(), 1, followed_branch));
+        QCOMPARE(mounted.names(followed_branch), QStringList{QStringLiteral("other")});
+        QCOMPARE(mounted.names(mounted.at(control)), QStringList({QStringLiteral("a"), QStringLiteral("leaf 2"),
+                                                                  QStringLiteral("rooted"), QStringLiteral("zz")}));
+    }
+
     void a_child_that_cannot_be_opened_hides_no_sibling() {
         testkit::LaidHive laid = testkit::lay_out(layout());
         laid.put16(laid.at("Control\\leaf").record, 0, 0x7878);
