@@ -6,6 +6,8 @@
 
 #include <QIcon>
 
+#include <stdexcept>
+
 namespace {
 
 constexpr int most_cached_rows = 100;
@@ -95,10 +97,8 @@ bool ValuesModel::setData(const QModelIndex& index, const QVariant& value, int) 
     if (!index.isValid() || key_ == nullptr || index.row() >= rowCount())
         return false;
     if (index.column() == NameColumn) {
-        if (!value.canConvert<QString>() || !key_->rename_value(index.row(), value.toString()))
+        if (!value.canConvert<QString>() || !rename(index.row(), value.toString()))
             return false;
-        // A renamed value moves to the end of the list, and every row behind it moves up.
-        forget_from(index.row());
         emit dataChanged(index, this->index(rowCount() - 1, NameColumn));
         return true;
     }
@@ -107,6 +107,39 @@ bool ValuesModel::setData(const QModelIndex& index, const QVariant& value, int) 
     cache_.remove(index.row());
     emit dataChanged(index, index);
     return true;
+}
+
+// A renamed value moves to the end of the list, and every row behind it moves up. One that could only be stored under
+// its new name, and not be taken away under the old one, is there twice.
+bool ValuesModel::rename(int row, const QString& name) {
+    const int rows = rowCount();
+    bool renamed = false;
+    try {
+        renamed = key_->rename_value(row, name);
+    } catch (...) {
+        forget_from(row);
+        announce_new_rows(rows);
+        throw;
+    }
+    forget_from(row);
+    announce_new_rows(rows);
+    return renamed;
+}
+
+int ValuesModel::rows_now(int otherwise) const {
+    try {
+        return rowCount();
+    } catch (const std::runtime_error&) {
+        return otherwise;
+    }
+}
+
+void ValuesModel::announce_new_rows(int before) {
+    const int rows = rows_now(before);
+    if (rows <= before)
+        return;
+    beginInsertRows(QModelIndex(), before, rows - 1);
+    endInsertRows();
 }
 
 bool ValuesModel::store(int row, const QVariant& value) {
@@ -156,58 +189,70 @@ bool ValuesModel::can_remove(int row) const {
 bool ValuesModel::removeRows(int row, int count, const QModelIndex& parent) {
     if (count != 1 || parent.isValid() || !can_remove(row))
         return false;
+    const int rows = rowCount();
+    const auto end = [&] {
+        endRemoveRows();
+        if (rows_now(rows) == rows) {
+            // The row is still there: whoever heard that it went hears that it came back.
+            beginInsertRows(parent, row, row);
+            endInsertRows();
+        }
+    };
     beginRemoveRows(parent, row, row);
     forget_from(row);
-    const bool removed = key_->delete_value(row);
-    endRemoveRows();
-    if (!removed) {
-        // The row is still there: whoever heard that it went hears that it came back.
-        beginInsertRows(parent, row, row);
-        endInsertRows();
+    bool removed = false;
+    try {
+        removed = key_->delete_value(row);
+    } catch (...) {
+        end();
+        throw;
     }
+    end();
     return removed;
 }
 
-bool ValuesModel::add_value(int type) {
+bool ValuesModel::insert_at_end(const std::function<bool()>& make) {
     if (key_ == nullptr)
         return false;
     const int row = rowCount();
     beginInsertRows(QModelIndex(), row, row);
-    const QString name = key_->new_value_name();
-    bool added = false;
-    if (!name.isNull()) {
-        switch (type) {
-        case REG_SZ:
-        case REG_EXPAND_SZ:
-        case REG_LINK:
-            added = key_->set_string_value(name, QString(), static_cast<uint>(type));
-            break;
-        case REG_BINARY:
-            added = key_->set_binary_value(name, QByteArray(), REG_BINARY);
-            break;
-        case REG_DWORD:
-            added = key_->set_dword_value(name, 0, little_endian_order);
-            break;
-        case REG_MULTI_SZ:
-            added = key_->set_multi_string_value(name, QStringList());
-            break;
-        case REG_QWORD:
-            added = key_->set_qword_value(name, 0);
-            break;
-        default:
-            break;
-        }
+    bool made = false;
+    try {
+        made = make();
+    } catch (...) {
+        endInsertRows();
+        throw;
     }
     endInsertRows();
-    return added;
+    return made;
+}
+
+bool ValuesModel::add_value(int type) {
+    return insert_at_end([&] {
+        const QString name = key_->new_value_name();
+        return !name.isNull() && make_empty(name, type);
+    });
+}
+
+bool ValuesModel::make_empty(const QString& name, int type) {
+    switch (type) {
+    case REG_SZ:
+    case REG_EXPAND_SZ:
+    case REG_LINK:
+        return key_->set_string_value(name, QString(), static_cast<uint>(type));
+    case REG_BINARY:
+        return key_->set_binary_value(name, QByteArray(), REG_BINARY);
+    case REG_DWORD:
+        return key_->set_dword_value(name, 0, little_endian_order);
+    case REG_MULTI_SZ:
+        return key_->set_multi_string_value(name, QStringList());
+    case REG_QWORD:
+        return key_->set_qword_value(name, 0);
+    default:
+        return false;
+    }
 }
 
 bool ValuesModel::add_default_value(const QString& data) {
-    if (key_ == nullptr)
-        return false;
-    const int row = rowCount();
-    beginInsertRows(QModelIndex(), row, row);
-    const bool added = key_->set_string_value(QString(), data, REG_SZ);
-    endInsertRows();
-    return added;
+    return insert_at_end([&] { return key_->set_string_value(QString(), data, REG_SZ); });
 }

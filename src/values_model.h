@@ -9,6 +9,8 @@
 #include <QAbstractTableModel>
 #include <QCache>
 
+#include <functional>
+
 class RegKey;
 
 class ValuesModel : public QAbstractTableModel {
@@ -47,6 +49,11 @@ public:
 private:
     const RegValue* lookup(int row) const;
     bool store(int row, const QVariant& value);
+    bool rename(int row, const QString& name);
+    bool insert_at_end(const std::function<bool()>& make);
+    bool make_empty(const QString& name, int type);
+    int rows_now(int otherwise) const;  // otherwise: where the key cannot say
+    void announce_new_rows(int before);
     void forget_from(int row);
 
     RegKey* key_;

@@ -7,8 +7,11 @@
 #include "values_model.h"
 
 #include <QIcon>
+#include <QScopedValueRollback>
 
 #include <algorithm>
+#include <exception>
+#include <stdexcept>
 
 ValuesProxyModel::ValuesProxyModel() : default_name_(tr("(Default)")) {}
 
@@ -123,18 +126,9 @@ Qt::ItemFlags ValuesProxyModel::flags(const QModelIndex& index) const {
 bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, int role) {
     if (!index.isValid() || sourceModel() == nullptr)
         return false;
-    if (is_synthetic(index.row())) {
-        auto* values = qobject_cast<ValuesModel*>(sourceModel());
-        if (index.column() != ValuesModel::DataColumn || values == nullptr)
-            return false;
-        const bool added = values->add_default_value(value.toString());
-        ask_for_default();
-        sort(ValuesModel::NameColumn, Qt::AscendingOrder);
-        if (added)
-            emit dataChanged(index, index);
-        return added;
-    }
-    if (!sourceModel()->setData(mapToSource(index), value, role))
+    if (is_synthetic(index.row()))
+        return make_default(index, value);
+    if (!change_source([&] { return sourceModel()->setData(mapToSource(index), value, role); }))
         return false;
     if (index.column() == ValuesModel::NameColumn) {
         move_to_end(index.row());
@@ -142,6 +136,55 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
     }
     emit dataChanged(index, index);
     return true;
+}
+
+// The made-up row's place is taken by the unnamed value, which the source has at its end: for this model's rows nothing
+// was inserted.
+bool ValuesProxyModel::make_default(const QModelIndex& index, const QVariant& value) {
+    auto* values = qobject_cast<ValuesModel*>(sourceModel());
+    if (index.column() != ValuesModel::DataColumn || values == nullptr)
+        return false;
+    const bool added = change_source([&] {
+        const bool made = values->add_default_value(value.toString());
+        ask_for_default();
+        return made;
+    });
+    sort(ValuesModel::NameColumn, Qt::AscendingOrder);
+    if (added)
+        emit dataChanged(index, index);
+    return added;
+}
+
+int ValuesProxyModel::rows_now(int otherwise) const {
+    try {
+        return rowCount();
+    } catch (const std::runtime_error&) {
+        return otherwise;
+    }
+}
+
+// Changes the source without passing on what it says of its rows. A change that failed may have left a row all the
+// same: it is announced, in this model's own numbers.
+bool ValuesProxyModel::change_source(const std::function<bool()>& change) {
+    const int rows = rowCount();
+    const auto announce_new_rows = [&] {
+        const int now = rows_now(rows);
+        if (now > rows) {
+            beginInsertRows(QModelIndex(), rows, now - 1);
+            endInsertRows();
+        }
+    };
+    bool changed = false;
+    try {
+        const QScopedValueRollback quiet(is_source_quiet_, true);
+        changed = change();
+    } catch (...) {
+        announce_new_rows();
+        throw;
+    }
+    if (!changed)
+        announce_new_rows();
+    return changed;
 }
 
 // After a rename: the source has the value at its end now, and those behind it one row higher. The shown row stays
@@ -162,10 +205,13 @@ void ValuesProxyModel::move_to_end(int row) {
 }
 
 bool ValuesProxyModel::removeRows(int row, int count, const QModelIndex& parent) {
-    if (sourceModel() == nullptr || parent.isValid() || count != 1 || row < 0 || row >= rowCount())
+    if (sourceModel() == nullptr || parent.isValid())
         return false;
+    // Nothing to remove, however many rows are meant.
     if (is_synthetic(row))
         return true;
+    if (count != 1 || row < 0 || row >= rowCount())
+        return false;
     auto* values = qobject_cast<ValuesModel*>(sourceModel());
     const int source = source_row(row);
     if (values == nullptr || !values->can_remove(source))
@@ -179,33 +225,41 @@ bool ValuesProxyModel::removeRows(int row, int count, const QModelIndex& parent)
 bool ValuesProxyModel::remove_from_source(int row, int source) {
     const int rows = rowCount();
     // What the source says of a row that stayed after all is not passed on: this model says it itself.
-    disconnect(sourceModel(), &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
+    const QScopedValueRollback quiet(is_source_quiet_, true);
     beginRemoveRows(QModelIndex(), row, row);
     bool removed = false;
     try {
         removed = sourceModel()->removeRows(source, 1);
-        if (removed) {
-            const auto position = static_cast<size_t>(row - offset());
-            if (position < mapping_.size())
-                mapping_.erase(mapping_.begin() + static_cast<std::ptrdiff_t>(position));
-            for (int& mapped : mapping_)
-                mapped -= mapped > source ? 1 : 0;
-        }
     } catch (...) {
-        endRemoveRows();
-        connect(sourceModel(), &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
+        end_removal(row, source, rows);
         throw;
     }
+    end_removal(row, source, rows);
+    return removed;
+}
+
+void ValuesProxyModel::end_removal(int row, int source, int rows_before) {
+    if (rows_now(rows_before) < rows_before) {
+        const auto position = static_cast<size_t>(row - offset());
+        if (position < mapping_.size())
+            mapping_.erase(mapping_.begin() + static_cast<std::ptrdiff_t>(position));
+        for (int& mapped : mapping_)
+            mapped -= mapped > source ? 1 : 0;
+    }
     endRemoveRows();
-    connect(sourceModel(), &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
-    if (removed)
+    std::exception_ptr failure;
+    try {
         ask_for_default();
-    if (rowCount() == rows) {
+    } catch (...) {
+        failure = std::current_exception();
+    }
+    if (rows_now(rows_before) == rows_before) {
         // The row is there again: it was refused, or the made-up row has taken the unnamed value's place.
         beginInsertRows(QModelIndex(), row, row);
         endInsertRows();
     }
-    return removed;
+    if (failure)
+        std::rethrow_exception(failure);
 }
 
 void ValuesProxyModel::announce_layout() {
@@ -234,17 +288,24 @@ bool ValuesProxyModel::add_value(int type) {
     auto* values = qobject_cast<ValuesModel*>(sourceModel());
     if (values == nullptr)
         return false;
-    const bool added = values->add_value(type);
-    if (added)
+    // Announced only once it is there: a view cannot be told that a row did not come, and would have moved its current
+    // row past the end for it.
+    const int row = values->rowCount();
+    const bool added = change_source([&] { return values->add_value(type); });
+    if (added) {
         mapping_.push_back(static_cast<int>(mapping_.size()));
-    else
-        announce_layout();  // a row was announced that did not come
+        on_rows_inserted(QModelIndex(), row, row);
+    } else {
+        announce_layout();
+    }
     return added;
 }
 
 // With the source's row numbers as they are, without the offset: the rows are announced where they always were, and
 // what matters to a view, their number, is right.
 void ValuesProxyModel::on_rows_inserted(const QModelIndex&, int first, int last) {
+    if (is_source_quiet_)
+        return;
     beginInsertRows(QModelIndex(), first, last);
     endInsertRows();
 }

@@ -6,6 +6,7 @@
 
 #include <QAbstractProxyModel>
 
+#include <functional>
 #include <vector>
 
 class RegKey;
@@ -50,12 +51,17 @@ private:
     bool is_synthetic(int row) const { return synthetic_default_ && row == 0; }
     int source_row(int row) const;
     void ask_for_default();
+    bool change_source(const std::function<bool()>& change);
+    bool make_default(const QModelIndex& index, const QVariant& value);
+    int rows_now(int otherwise) const;  // otherwise: where the key cannot say
     void announce_layout();
     void move_to_end(int row);
     bool remove_from_source(int row, int source_row);
+    void end_removal(int row, int source_row, int rows_before);
 
     std::vector<int> mapping_;  // source row by position; empty until the first sort
     bool synthetic_default_ = false;
     int unnamed_ = -1;  // source row of the unnamed value
     QString default_name_;
+    bool is_source_quiet_ = false;  // what the source says of its rows is not passed on
 };

@@ -9,6 +9,7 @@
 
 #include <QAbstractItemModelTester>
 #include <QHeaderView>
+#include <QRegularExpression>
 #include <QSignalSpy>
 #include <QTableView>
 #include <QTest>
@@ -40,9 +41,18 @@ struct Shown {
     explicit Shown(int key) : source(new ValuesModel(static_cast<RegKey*>(hive.root_key()->child(key)))) {
         proxy.setSourceModel(source.get());
         proxy.sort(0, Qt::AscendingOrder);
+        // As the window has it.
+        view.setSelectionBehavior(QAbstractItemView::SelectItems);
+        view.setSelectionMode(QAbstractItemView::SingleSelection);
         view.setModel(&proxy);
     }
     ~Shown() { view.setModel(nullptr); }
+
+    // The current row, where it is also the one that is selected.
+    int current() const {
+        const QModelIndexList selected = view.selectionModel()->selectedIndexes();
+        return selected == QModelIndexList{view.currentIndex()} ? view.currentIndex().row() : -1;
+    }
 
     QStringList names() {
         QStringList all;
@@ -166,7 +176,11 @@ private slots:
     void the_made_up_row_cannot_be_deleted_and_says_so_to_nobody() {
         Shown shown(Bare);
         const testkit::Bytes before = shown.file.bytes();
-        QVERIFY(shown.proxy.removeRows(0, 1));
+        QSignalSpy removed(&shown.proxy, &QAbstractItemModel::rowsAboutToBeRemoved);
+        for (const int count : {0, 1, 2})
+            QVERIFY(shown.proxy.removeRows(0, count));
+        QVERIFY(!shown.proxy.removeRows(1, 2));
+        QCOMPARE(removed.count(), 0);
         QVERIFY(shown.file.bytes() == before);
         QCOMPARE(shown.proxy.rowCount(), 4);
     }
@@ -208,6 +222,55 @@ private slots:
         QCOMPARE(inserted[0][1].toInt(), 3);
         QCOMPARE(inserted[0][2].toInt(), 3);
         QCOMPARE(shown.view.verticalHeader()->count(), 5);
+    }
+
+    // The views of two keys: one whose only row is made up, and one with values below it.
+    void setting_the_made_up_row_keeps_the_current_row_data() {
+        QTest::addColumn<int>("key");
+        QTest::addColumn<int>("current");
+        QTest::newRow("the only row") << int(Empty) << 0;
+        QTest::newRow("the first row") << int(Bare) << 0;
+        QTest::newRow("a row between") << int(Bare) << 1;
+        QTest::newRow("the last row") << int(Bare) << 3;
+    }
+
+    void setting_the_made_up_row_keeps_the_current_row() {
+        QFETCH(int, key);
+        QFETCH(int, current);
+        QTest::failOnWarning(QRegularExpression(QStringLiteral(".")));
+        Shown shown(key);
+        shown.view.setCurrentIndex(shown.proxy.index(current, 0));
+        const QStringList names = shown.names();
+        QSignalSpy inserted(&shown.proxy, &QAbstractItemModel::rowsInserted);
+        QVERIFY(shown.proxy.setData(shown.proxy.index(0, 2), QStringLiteral("made"), Qt::DisplayRole));
+        QCOMPARE(inserted.count(), 0);
+        QCOMPARE(shown.names(), names);
+        QCOMPARE(shown.current(), current);
+        QCOMPARE(shown.view.currentIndex().data().toString(), names[current]);
+    }
+
+    void a_value_that_was_not_made_keeps_the_current_row_data() {
+        QTest::addColumn<int>("key");
+        QTest::addColumn<int>("current");
+        QTest::newRow("the only row") << int(Empty) << 0;
+        QTest::newRow("a row between") << int(Bare) << 2;
+        QTest::newRow("the last row") << int(Bare) << 3;
+        QTest::newRow("the last row, none made up") << int(Full) << 3;
+    }
+
+    void a_value_that_was_not_made_keeps_the_current_row() {
+        QFETCH(int, key);
+        QFETCH(int, current);
+        QTest::failOnWarning(QRegularExpression(QStringLiteral(".")));
+        Shown shown(key);
+        shown.view.setCurrentIndex(shown.proxy.index(current, 0));
+        QSignalSpy of_the_source(shown.source.get(), &QAbstractItemModel::rowsInserted);
+        QSignalSpy layout_changed(&shown.proxy, &QAbstractItemModel::layoutChanged);
+        QVERIFY(!shown.proxy.add_value(8));
+        QCOMPARE(of_the_source.count(), 1);
+        QCOMPARE(layout_changed.count(), 1);
+        QCOMPARE(shown.current(), current);
+        QCOMPARE(shown.view.verticalHeader()->count(), shown.proxy.rowCount());
     }
 
     void a_value_that_was_not_made_leaves_the_view_right() {
