@@ -188,8 +188,14 @@ private slots:
         QCOMPARE(changed.count(), 1);
         QCOMPARE(changed[0][0].toModelIndex(), opened.model.index(2, 0));
         QCOMPARE(changed[0][1].toModelIndex(), opened.model.index(7, 0));
-        QCOMPARE(opened.text(2, 0), QStringLiteral("bytes"));
-        QCOMPARE(opened.text(7, 0), QStringLiteral("moved"));
+        // What was cached for a row shows in type and data too.
+        ValuesModel afresh(opened.key);
+        const char* const names[] = {"(Default)", "(Default)", "bytes", "bad", "odd type", "list", "qword", "moved"};
+        for (int row = 0; row < 8; row++) {
+            QCOMPARE(opened.text(row, 0), QString::fromLatin1(names[row]));
+            for (const int column : {1, 2})
+                QCOMPARE(opened.model.index(row, column).data(), afresh.index(row, column).data());
+        }
         QCOMPARE(opened.model.index(7, 2).data(), QVariant(258U));
     }
 
