@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "reg_hive.h"
 
+#include "device_calls.h"
 #include "reg_key.h"
 
 #include <QFileInfo>
@@ -11,6 +12,7 @@
 #include <sys/file.h>
 #include <sys/stat.h>
 
+#include <cassert>
 #include <cerrno>
 #include <cstdio>
 #include <set>
@@ -34,28 +36,6 @@ FileIdentity identity(const QFile& file) {
     if (fstat(file.handle(), &status) != 0 || !S_ISREG(status.st_mode))
         throw std::runtime_error("Cannot open file");
     return {status.st_dev, status.st_ino};
-}
-
-int32_t narrowed(qint64 count) { return count < 0 || count > INT32_MAX ? -1 : static_cast<int32_t>(count); }
-
-int32_t read_device(void* device, void* buffer, int32_t length) {
-    return narrowed(static_cast<QIODevice*>(device)->read(static_cast<char*>(buffer), length));
-}
-
-int32_t write_device(void* device, const void* buffer, int32_t length) {
-    return narrowed(static_cast<QIODevice*>(device)->write(static_cast<const char*>(buffer), length));
-}
-
-int32_t seek_device(void* device, int32_t offset, int32_t whence) {
-    auto* file = static_cast<QIODevice*>(device);
-    qint64 target = offset;
-    if (whence == 1)
-        target += file->pos();
-    else if (whence == 2)
-        target += file->size();
-    else if (whence != 0)
-        return -1;
-    return file->seek(target) ? static_cast<int32_t>(target) : -1;
 }
 
 }  // namespace
@@ -96,7 +76,8 @@ RegHive::~RegHive() {
     clear_handle_cache();
     {
         const std::lock_guard locker(api_mutex_);
-        RCloseKey(root_handle_);
+        [[maybe_unused]] const int32_t closed = RCloseKey(root_handle_);
+        assert(closed == R_SUCCESS);
     }
     root_.reset();
     struct stat status = {};
@@ -149,6 +130,11 @@ RegistryKey* RegHive::open_child_handle(const RegKey* key, const RegKey* parent,
         const std::lock_guard api(api_mutex_);
         if (index < 0 || ROpenSubKey(parent_handle, static_cast<uint32_t>(index), &handle) != R_SUCCESS)
             throw std::runtime_error("ROpenSubKey failed");
+        // After a failed read, or in a damaged hive, the parent's list may have moved under its slots.
+        if (key->offset_ != UINT32_MAX && key->offset_ != RKeyOffset(handle)) {
+            RCloseKey(handle);
+            throw std::runtime_error("ROpenSubKey failed");
+        }
     }
     handle_cache_.insert(key, new KeyHandleHolder(this, handle), 1);
     return handle;

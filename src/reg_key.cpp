@@ -5,11 +5,14 @@
 #include "reg_hive.h"
 #include "stored_text.h"
 
+#include <QtEndian>
+
 #include <tallowfen/registry.h>
 
 #include <algorithm>
 #include <array>
 #include <cstdio>
+#include <cstring>
 #include <stdexcept>
 
 namespace {
@@ -20,9 +23,10 @@ constexpr int longest_key_name = 255;  // characters, as Windows has it
 using NameBuffer = std::array<char, 513>;
 constexpr uint32_t name_room = NameBuffer().size() - 1;
 
-int32_t subkey_name(RegistryKey* handle, uint32_t index, NameBuffer& name) {
+// size receives the name's length in bytes.
+int32_t subkey_name(RegistryKey* handle, uint32_t index, NameBuffer& name, uint32_t& size) {
     name.fill('\0');
-    uint32_t size = name_room;
+    size = name_room;
     return REnumKeyInfoA(handle, index, name.data(), &size, nullptr, nullptr, nullptr, nullptr);
 }
 
@@ -154,9 +158,16 @@ QString RegKey::name() {
     if (size == 0 && this != hive_->root_key()) {
         // The engine names no key that is a symbolic link; its parent's list does, and a row needs a name.
         NameBuffer listed;
+        uint32_t length = 0;
         RegistryKey* parent = hive_->key_handle(static_cast<RegKey*>(parent_));
-        if (subkey_name(parent, static_cast<uint32_t>(child_number()), listed) == R_SUCCESS)
+        const int32_t status = subkey_name(parent, static_cast<uint32_t>(child_number()), listed, length);
+        if (status == R_SUCCESS)
             return QString::fromLatin1(listed.data());
+        if (status == R_INVALID_NAME) {  // handed out as stored, in UTF-16
+            QString wide(static_cast<qsizetype>(length / 2), Qt::Uninitialized);
+            qFromLittleEndian<char16_t>(listed.data(), wide.size(), wide.data());
+            return wide;
+        }
     }
     return QString(reinterpret_cast<const QChar*>(buffer.data()), static_cast<qsizetype>(size / 2));
 }
@@ -198,7 +209,7 @@ int RegKey::default_value_position() {
         const int32_t status = REnumValueW(handle, i, name.data(), &size, nullptr, nullptr, nullptr);
         if (status == R_NO_MORE_ITEMS)
             return -1;
-        if (size == 0)
+        if (size < sizeof name[0])  // an odd last byte is no character
             return static_cast<int>(i);
     }
 }
@@ -211,13 +222,20 @@ int RegKey::find_child_position(RegistryKey* handle, const QByteArray& name) {
     while (low <= high) {
         const size_t middle = low + (high - low) / 2;
         NameBuffer listed;
-        if (subkey_name(handle, static_cast<uint32_t>(middle), listed) != R_SUCCESS) {
+        uint32_t length = 0;
+        if (subkey_name(handle, static_cast<uint32_t>(middle), listed, length) != R_SUCCESS) {
             result = -1;
             break;
         }
         const int order = qstricmp(name.constData(), listed.data());
-        if (order == 0)
-            return static_cast<int>(middle);
+        if (order == 0) {
+            // A stored name may go on behind a zero, and is another one then; zeros at its end do not count.
+            while (length > 0 && listed[length - 1] == '\0')
+                length--;
+            if (length == static_cast<uint32_t>(name.size()))
+                return static_cast<int>(middle);
+            break;
+        }
         if (order > 0)
             low = middle + 1;
         else if (middle == 0)
@@ -256,10 +274,13 @@ int RegKey::new_key() {
         std::snprintf(name, sizeof name, "New Key #%i", i);
         RegistryKey* made = nullptr;
         uint32_t existed = 1;
-        if (RCreateKey(handle, name, &made, &existed) != R_SUCCESS)
+        const int32_t status = RCreateKey(handle, name, &made, &existed);
+        if (made != nullptr)
+            RCloseKey(made);
+        if (status != R_SUCCESS && slots_agree(handle))
             return -1;
-        RCloseKey(made);
-        if (existed == 0)
+        // A key that was made but could not be read back is there all the same.
+        if (status != R_SUCCESS || existed == 0)
             break;
     }
     const int position = find_child_position(handle, name);
@@ -281,10 +302,12 @@ bool RegKey::delete_key(int index) {
     RegistryKey* handle = hive_->key_handle(this);
     NameBuffer name = {};
     uint32_t size = name_room;
-    // Only the key at this position is meant: a name that leads to another one deletes nothing.
+    // Only the key at this position is meant: a name that leads to another one deletes nothing. One with a backslash
+    // is no name to the engine, but a path.
     if (!is_shown_at(handle, index) || !slots_agree(handle) ||
         REnumKeyExA(handle, static_cast<uint32_t>(index), name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
-        position_by_path(handle, name.data()) != index || RDeleteKey(handle, name.data()) != R_SUCCESS)
+        std::strchr(name.data(), '\\') != nullptr || position_by_path(handle, name.data()) != index ||
+        RDeleteKey(handle, name.data()) != R_SUCCESS)
         return false;
     const auto slot = children_.begin() + index;
     const std::unique_ptr<AbstractRegKey> gone(*slot);
@@ -294,7 +317,27 @@ bool RegKey::delete_key(int index) {
 
 bool RegKey::can_delete_tree(int index) {
     const RegHive::Dialogue dialogue(hive_);
-    return index >= 0 && RCheckDeleteTree(hive_->key_handle(this), static_cast<uint32_t>(index)) == R_SUCCESS;
+    RegistryKey* handle = hive_->key_handle(this);
+    return index >= 0 && slots_agree(handle) && is_shown_at(handle, index) &&
+           RCheckDeleteTree(handle, static_cast<uint32_t>(index)) == R_SUCCESS && agrees_below(index);
+}
+
+// Whether the objects that there are for a subkey and the keys below it show what the engine lists there. Where a
+// damaged hive lists one key twice, what was done through one object is not what another one shows.
+bool RegKey::agrees_below(int index) {
+    const auto position = static_cast<size_t>(index);
+    auto* key = position < children_.size() ? static_cast<RegKey*>(children_[position]) : nullptr;
+    if (key == nullptr)
+        return true;
+    RegistryKey* handle = hive_->key_handle(key);
+    if (!key->slots_agree(handle))
+        return false;
+    for (int i = 0; i < static_cast<int>(key->children_.size()); i++) {
+        // The handle may have been evicted for those below.
+        if (!key->is_shown_at(hive_->key_handle(key), i) || !key->agrees_below(i))
+            return false;
+    }
+    return true;
 }
 
 int RegKey::rename_key(int index, const QString& new_name) {
@@ -314,8 +357,11 @@ int RegKey::rename_key(int index, const QString& new_name) {
     if (position < 0)
         return -2;
     AbstractRegKey* renamed = children_[static_cast<size_t>(index)];
-    if (renamed != nullptr)
-        static_cast<RegKey*>(renamed)->offset_ = UINT32_MAX;
+    RegistryKey* moved = nullptr;
+    if (renamed != nullptr && ROpenSubKey(handle, static_cast<uint32_t>(position), &moved) == R_SUCCESS) {
+        static_cast<RegKey*>(renamed)->offset_ = RKeyOffset(moved);
+        RCloseKey(moved);
+    }
     children_.erase(children_.begin() + index);
     children_.insert(children_.begin() + position, renamed);
     return position;

@@ -124,14 +124,16 @@ private:
 
     std::recursive_mutex* children_lock() const override;
     void refresh_children(RegistryKey* handle);
-    // Whether there is a slot for each subkey that the engine counts, so that its positions are those of the slots.
     bool is_shown_at(RegistryKey* handle, int index) const;
+    bool agrees_below(int index);
+    // Whether there is a slot for each subkey that the engine counts, so that its positions are those of the slots.
     bool slots_agree(RegistryKey* handle) const;
     int find_child_position(RegistryKey* handle, const QByteArray& name);
     bool store_value(const QString& name, uint type, const QByteArray& data, int index);
 
     RegHive* hive_;  // not owned
-    // Where the engine found the key, UINT32_MAX when it has not been asked since the key was made or renamed.
+    // Where the engine found the key, UINT32_MAX when it has not been asked since the key was made. What the parent
+    // lists at this object's place is only taken for its key when it lies there.
     uint32_t offset_ = UINT32_MAX;
 };
 

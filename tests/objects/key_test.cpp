@@ -93,6 +93,107 @@ private slots:
             QVERIFY2(read.find(name) != nullptr, name);
     }
 
+    // What the inner object makes takes the outer one's keys to other places; their values are still only theirs.
+    void a_key_that_lists_itself_changes_no_value_of_another_key() {
+        testkit::HiveLayout two = layout();
+        for (testkit::KeyLayout& key : two.root.children[0].children)
+            key.set("v", 4, testkit::pattern(4));
+        testkit::LaidHive laid = testkit::lay_out(two);
+        laid.put32(laid.at("Parent").index, 4 + 8, laid.at("Parent").record);  // for the second of the five
+        const HiveOnDisk file(laid.bytes);
+        const testkit::Hive before = file.read();
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        auto* outer = static_cast<RegKey*>(hive.root_key()->child(1));
+        auto* inner = static_cast<RegKey*>(outer->child(1));
+        auto* shown = static_cast<RegKey*>(outer->child(3));
+        QCOMPARE(shown->name(), QStringLiteral("Zulu"));
+        QVERIFY(inner->new_key() >= 0);
+        hive.clear_handle_cache();
+        QCOMPARE(thrown<std::runtime_error>([&] { shown->set_dword_value(QStringLiteral("v"), 99, 4, 0); }),
+                 QStringLiteral("ROpenSubKey failed"));
+        QVERIFY(!outer->can_delete_tree(3));
+        QVERIFY(testkit::diff(before, file.read()).size() == 1);  // the key that was made
+    }
+
+    void a_key_whose_name_holds_a_backslash_deletes_none_that_the_path_would_lead_to() {
+        testkit::HiveLayout odd;
+        testkit::KeyLayout& parent = odd.root.add("Parent");
+        parent.add("a").add("0");
+        parent.children[0].add("b").set("v", 4, testkit::pattern(4));
+        parent.add("a\\b");
+        const HiveOnDisk file(odd);
+        const testkit::Bytes before = file.bytes();
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        auto* shown = static_cast<RegKey*>(hive.root_key()->child(0));
+        QCOMPARE(shown->child(1)->name(), QStringLiteral("a\\b"));
+        QVERIFY(!shown->can_delete_tree(1));
+        QVERIFY(!shown->delete_key(1));
+        QVERIFY(file.bytes() == before);
+    }
+
+    // The sibling's name is another one, which goes on behind a zero.
+    void a_rename_beside_a_name_with_a_zero_inside_moves_the_object_to_its_own_place() {
+        testkit::HiveLayout odd;
+        testkit::KeyLayout& parent = odd.root.add("Parent");
+        parent.add("").set("v", 4, {2, 0, 0, 0});
+        parent.children[0].name = std::u16string(u"abc\0def", 7);
+        parent.add("x").set("v", 4, {1, 0, 0, 0});
+        const HiveOnDisk file(odd);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        auto* shown = static_cast<RegKey*>(hive.root_key()->child(0));
+        auto* renamed = static_cast<RegKey*>(shown->child(1));
+        const int row = shown->rename_key(1, QStringLiteral("abc"));
+        QCOMPARE(row, 0);
+        QCOMPARE(shown->child(row), renamed);
+        QCOMPARE(renamed->name(), QStringLiteral("abc"));
+        QVERIFY(renamed->set_dword_value(QStringLiteral("v"), 99, 4, 0));
+        QCOMPARE(file.stored("Parent\\abc", "v"), QByteArray("\x63\0\0\0", 4));
+    }
+
+    void a_link_is_named_in_either_storage() {
+        testkit::HiveLayout odd;
+        for (const char* name : {"Narrow", "Wide"})
+            odd.root.add(name).flags = 0x10;
+        odd.root.children[1].wide_name = true;
+        const HiveOnDisk file(odd);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        QCOMPARE(Opened::names(hive.root_key()), QStringList({QStringLiteral("Narrow"), QStringLiteral("Wide")}));
+    }
+
+    void a_value_whose_name_is_half_a_character_is_the_default_value() {
+        testkit::HiveLayout odd;
+        odd.root.add("Key").set("b", 1, testkit::text_data("one text"));
+        testkit::LaidHive laid = testkit::lay_out(odd);
+        laid.put16(laid.at("Key").values[0].record, 16, 0);  // said to be UTF-16
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        QCOMPARE(static_cast<RegKey*>(hive.root_key()->child(0))->default_value_position(), 0);
+    }
+
+    void a_value_whose_name_goes_on_behind_a_zero_can_be_deleted_and_renamed_but_not_written_as_another() {
+        testkit::HiveLayout odd;
+        for (const char* name : {"Deleted", "Renamed"}) {
+            odd.root.add(name).set("", 4, testkit::pattern(4));
+            odd.root.children.back().values[0].name = std::u16string(u"one\0", 4);
+        }
+        const HiveOnDisk file(odd);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        auto* deleted = static_cast<RegKey*>(hive.root_key()->child(0));
+        auto* renamed = static_cast<RegKey*>(hive.root_key()->child(1));
+        QVERIFY(!renamed->set_dword_value(renamed->read_value_name(0).name, 99, 4, 0));
+        QVERIFY(renamed->rename_value(0, QStringLiteral("plain")));
+        QCOMPARE(file.stored("Renamed", "plain").size(), 4);
+        QCOMPARE(renamed->value_count(), 1);
+        QVERIFY(deleted->delete_value(0));
+        QCOMPARE(deleted->value_count(), 0);
+    }
+
     void a_dummy_key_has_its_label_no_parent_and_the_children_it_was_given() {
         DummyRegKey top(QStringLiteral("TOP"));
         DummyRegKey other(QStringLiteral("other"));
@@ -286,6 +387,17 @@ private slots:
         QCOMPARE(Opened::names(parent), QStringList({QStringLiteral("New Key #1"), QStringLiteral("r2"),
                                                      QStringLiteral("r3"), QStringLiteral("s1")}));
         QCOMPARE(opened.file.faults(), std::string());
+    }
+
+    // The engine refuses to close a hive while one of its handles is open; the hive's end insists that it does not.
+    void a_hive_that_was_browsed_closes_its_handles_before_the_root() {
+        const HiveOnDisk file(layout());
+        for (int i = 0; i < 2; i++) {
+            DummyRegKey top(QStringLiteral("TOP"));
+            RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+            Opened::names(hive.root_key()->child(1));
+            QVERIFY(hive.cached_handles() > 3);
+        }
     }
 
     void a_subtree_is_asked_about_without_a_write() {
