@@ -274,18 +274,29 @@ testkit::WalkLimits judged_limits(size_t file_size) {
 namespace {
 
 void add_values_of(const FoundKey& key, std::vector<Change>& all) {
-    std::vector<std::string> names = {new_name};
+    struct Asked {
+        std::string name;     // as a call takes it, up to a zero
+        std::string deleted;  // the value that a deletion by that name is about
+    };
+    std::vector<Asked> names = {{new_name, new_name}};
     for (const std::string& value : key.values) {
         std::string narrow;
-        if (value != "?" && as_8bit(value, narrow) && std::find(names.begin(), names.end(), narrow) == names.end())
-            names.push_back(narrow);
+        if (value == "?" || !as_8bit(value, narrow))
+            continue;
+        const auto same =
+            std::find_if(names.begin(), names.end(), [&](const Asked& name) { return name.name == narrow; });
+        const bool is_exact = value == testkit::utf8(testkit::widen(narrow));
+        if (same == names.end())
+            names.push_back({narrow, value});
+        else if (is_exact)
+            same->deleted = value;  // of two that begin alike the one with just that name
     }
-    for (const std::string& name : names) {
+    for (const auto& [name, deleted] : names) {
         const std::vector<std::string> named = {key.place + "|" + testkit::utf8(testkit::widen(name))};
         for (const uint32_t size : {0U, 4U, 5U, 100U, 16344U})
             all.push_back({Kind::set_value, key.way, key.place, name, 0, size, named});
         if (name != new_name)
-            all.push_back({Kind::delete_value, key.way, key.place, name, 0, 0, named});
+            all.push_back({Kind::delete_value, key.way, key.place, name, 0, 0, {key.place + "|" + deleted}});
     }
 }
 
