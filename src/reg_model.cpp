@@ -178,9 +178,11 @@ int RegModel::new_key(const QModelIndex& parent) {
     const int row = key->new_key();
     if (row < 0)
         return -3;
-    beginInsertRows(parent, row, row);
+    // The key is the one that was meant, also where its index has an old row; views know it by the row of now.
+    const QModelIndex current = index_of(key);
+    beginInsertRows(current, row, row);
     endInsertRows();
-    let_frames_follow_new_key(index(row, 0, parent));
+    let_frames_follow_new_key(index(row, 0, current));
     return row;
 }
 

@@ -226,6 +226,11 @@ private slots:
         QVERIFY(!mounted.model.setData(branch, QStringLiteral("new"), Qt::EditRole));
         QVERIFY(!mounted.model.removeRows(deep.row(), 1, branch));
         QVERIFY(mounted.file.bytes() == before);
+        // A new key needs no row: it is made in the key that is meant, and announced where that key is now.
+        QSignalSpy inserted(&mounted.model, &QAbstractItemModel::rowsInserted);
+        QCOMPARE(mounted.model.new_key(branch), 1);
+        QCOMPARE(inserted[0][0].toModelIndex(), QModelIndex(followed_branch));
+        QVERIFY(mounted.model.removeRows(1, 1, followed_branch));
         // What the model moves goes on working.
         QVERIFY(mounted.model.setData(followed_leaf, QStringLiteral("leaf 2"), Qt::EditRole));
         QVERIFY(mounted.model.setData(followed_branch, QStringLiteral("a"), Qt::EditRole));
