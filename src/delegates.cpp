@@ -97,6 +97,13 @@ void tell_refused(QWidget* main_window, const QString& text) {
     QMessageBox::critical(main_window, QCoreApplication::applicationName(), text, QMessageBox::Ok);
 }
 
+// An exception must not pass the view, which would take the editor for one being committed from then on, and commit no
+// other. Told each time: the user has typed a name that is not there now.
+void tell_lost_name(QWidget* main_window, const QString& key_path, const std::exception& failure) {
+    const QString reason = QString::fromLocal8Bit(failure.what());
+    tell_failure(main_window, FailureReport::instance().told_elsewhere(key_path, reason));
+}
+
 // The rows of the values table belong to the key that the user is at.
 void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_current(failure); }
 
@@ -113,8 +120,12 @@ QString ValueDelegate::displayText(const QVariant& value, const QLocale& /*local
 }
 
 void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
-    if (!commit(*this, *editor, *model, index)) {
-        tell_refused(m_main_window, tr("The specified value name already exists."));
+    try {
+        if (!commit(*this, *editor, *model, index)) {
+            tell_refused(m_main_window, tr("The specified value name already exists."));
+        }
+    } catch (const std::exception& failure) {
+        tell_lost_name(m_main_window, FailureReport::instance().current_key(), failure);
     }
 }
 
@@ -149,8 +160,12 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
 KeyDelegate::KeyDelegate(QWidget* main_window) : m_main_window(main_window) {}
 
 void KeyDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
-    if (!commit(*this, *editor, *model, index)) {
-        tell_refused(m_main_window, tr("The specified key name already exists."));
+    try {
+        if (!commit(*this, *editor, *model, index)) {
+            tell_refused(m_main_window, tr("The specified key name already exists."));
+        }
+    } catch (const std::exception& failure) {
+        tell_lost_name(m_main_window, key_path_of(index), failure);
     }
 }
 

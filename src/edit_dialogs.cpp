@@ -76,31 +76,34 @@ QString text_of(const QTextDocument& document, bool had_line_separators) {
 
 }  // namespace
 
-void edit_string(QAbstractItemModel& model, const QString& value_name, const QString& data,
-                 const QModelIndex& data_index) {
+bool edit_string(QAbstractItemModel& model, const QString& value_name, const QString& data,
+                 const QPersistentModelIndex& data_index) {
     QLineEdit edit;
     take_any_length(edit);
     edit.setText(data);
-    if (run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit)) {
-        model.setData(data_index, edit.isModified() ? edit.text() : data, Qt::DisplayRole);
+    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit)) {
+        return true;
     }
+    return model.setData(data_index, edit.isModified() ? edit.text() : data, Qt::DisplayRole);
 }
 
-void edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
-                 const QModelIndex& data_index) {
+bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
+                 const QPersistentModelIndex& data_index) {
     QLineEdit edit;
     take_any_length(edit);
     edit.setText(QString::fromLatin1(data.toHex()));
     // One class of characters instead of three alternatives: the same language, without a match step per digit on
     // the matcher's stack, which runs out at some ten thousand digits.
     edit.setValidator(new QRegularExpressionValidator(QRegularExpression(QStringLiteral("[a-fA-F0-9]*")), &edit));
-    if (run_editor(QCoreApplication::translate("ValuesView", "Edit Binary Value", "dialog title"), value_name, &edit)) {
-        model.setData(data_index, QByteArray::fromHex(edit.text().toLatin1()), Qt::DisplayRole);
+    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Binary Value", "dialog title"), value_name,
+                    &edit)) {
+        return true;
     }
+    return model.setData(data_index, QByteArray::fromHex(edit.text().toLatin1()), Qt::DisplayRole);
 }
 
-void edit_multi_string(QAbstractItemModel& model, const QString& value_name, const QStringList& data,
-                       const QModelIndex& data_index) {
+bool edit_multi_string(QAbstractItemModel& model, const QString& value_name, const QStringList& data,
+                       const QPersistentModelIndex& data_index) {
     QTextEdit edit;
     edit.setAcceptRichText(false);
     edit.setTabChangesFocus(true);
@@ -108,9 +111,11 @@ void edit_multi_string(QAbstractItemModel& model, const QString& value_name, con
     const QString given = data.join(QLatin1Char('\n'));
     edit.setPlainText(given);
     edit.document()->setModified(false);
-    if (run_editor(QCoreApplication::translate("ValuesView", "Edit Multi-String", "dialog title"), value_name, &edit)) {
-        const QString text = text_of(*edit.document(), given.contains(QChar::LineSeparator));
-        const bool untouched = !edit.document()->isModified() && !data.isEmpty();
-        model.setData(data_index, untouched ? data : text.split(QLatin1Char('\n')), Qt::DisplayRole);
+    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Multi-String", "dialog title"), value_name,
+                    &edit)) {
+        return true;
     }
+    const QString text = text_of(*edit.document(), given.contains(QChar::LineSeparator));
+    const bool untouched = !edit.document()->isModified() && !data.isEmpty();
+    return model.setData(data_index, untouched ? data : text.split(QLatin1Char('\n')), Qt::DisplayRole);
 }

@@ -9,14 +9,15 @@
 #include <QStringList>
 
 class QAbstractItemModel;
-class QModelIndex;
+class QPersistentModelIndex;
 
 // Each shows the value's name and its data and returns when it is closed. Ok writes the new data to `data_index` of
-// `model` with setData and Qt::DisplayRole; anything else writes nothing. A datum that the user left alone is
-// written back exactly as it was given, also where its characters do not survive the editing widget.
-void edit_string(QAbstractItemModel& model, const QString& value_name, const QString& data,
-                 const QModelIndex& data_index);
-void edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
-                 const QModelIndex& data_index);
-void edit_multi_string(QAbstractItemModel& model, const QString& value_name, const QStringList& data,
-                       const QModelIndex& data_index);
+// `model` with setData and Qt::DisplayRole; anything else writes nothing. False when the model refused it. A datum that
+// the user left alone is written back exactly as it was given, also where its characters do not survive the editing
+// widget.
+bool edit_string(QAbstractItemModel& model, const QString& value_name, const QString& data,
+                 const QPersistentModelIndex& data_index);
+bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
+                 const QPersistentModelIndex& data_index);
+bool edit_multi_string(QAbstractItemModel& model, const QString& value_name, const QStringList& data,
+                       const QPersistentModelIndex& data_index);

@@ -36,6 +36,7 @@ public:
 
     // The key that the user's last gesture was about.
     void set_current_key(const QString& key_path) { m_current_key = key_path; }
+    QString current_key() const { return m_current_key; }
 
 private:
     explicit FailureReport(QObject* parent);

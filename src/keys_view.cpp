@@ -3,6 +3,7 @@
 #include "keys_view.h"
 
 #include "failure_report.h"
+#include "finish_editing.h"
 #include "reg_model.h"
 #include "shared_actions.h"
 
@@ -35,6 +36,21 @@ void KeysView::setModel(QAbstractItemModel* model) {
     header()->setStretchLastSection(false);
 }
 
+QModelIndex KeysView::in_place(const QModelIndex& key) {
+    const QAbstractItemModel* model = key.model();
+    if (!model || model->index(key.row(), 0, key.parent()) == key) {
+        return key;
+    }
+    const QModelIndex parent = key.parent();
+    for (int row = 0; row < model->rowCount(parent); ++row) {
+        const QModelIndex sibling = model->index(row, 0, parent);
+        if (sibling.internalPointer() == key.internalPointer()) {
+            return sibling;
+        }
+    }
+    return {};
+}
+
 void KeysView::show_keys_context_menu(QPoint point) {
     const QModelIndex index = indexAt(point);
     if (!index.isValid() || index.column() != 0) {
@@ -50,8 +66,11 @@ void KeysView::show_keys_context_menu(QPoint point) {
 
 void KeysView::run_new_key_action(bool /*checked*/) {
     auto* keys = qobject_cast<RegModel*>(model());
+    if (!keys || !may_change_rows(*this)) {
+        return;
+    }
     const QModelIndex current = currentIndex();
-    if (!keys || !current.isValid()) {
+    if (!current.isValid()) {
         return;
     }
     const int row = keys->new_key(current);
@@ -66,10 +85,18 @@ void KeysView::run_new_key_action(bool /*checked*/) {
 
 void KeysView::run_delete_key_action(bool /*checked*/) {
     // The values table answers the same action.
-    if (!hasFocus() || !model() || !currentIndex().isValid() || !confirm_remove()) {
+    if (!hasFocus() || !model() || !may_change_rows(*this)) {
         return;
     }
-    const QModelIndex current = currentIndex();
+    // What is deleted is the key that was asked about.
+    const QPersistentModelIndex asked = currentIndex();
+    if (!asked.isValid() || !confirm_remove()) {
+        return;
+    }
+    const QModelIndex current = in_place(asked);
+    if (!current.isValid()) {
+        return;
+    }
     const QPersistentModelIndex parent = current.parent();
     const int row = current.row();
     const int rows = model()->rowCount(parent);
@@ -93,8 +120,11 @@ bool KeysView::confirm_remove() {
 }
 
 void KeysView::run_rename_key_action(bool /*checked*/) {
+    if (!hasFocus() || !may_change_rows(*this)) {
+        return;
+    }
     const QModelIndex current = currentIndex();
-    if (!hasFocus() || !current.isValid()) {
+    if (!current.isValid()) {
         return;
     }
     setCurrentIndex(current);

@@ -14,6 +14,9 @@ public:
 
     void setModel(QAbstractItemModel* model) override;
 
+    // The index of the same key at the row where the key stands now.
+    static QModelIndex in_place(const QModelIndex& key);
+
 public slots:
     void show_keys_context_menu(QPoint point);
     void run_new_key_action(bool checked);

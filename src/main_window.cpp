@@ -3,6 +3,7 @@
 #include "main_window.h"
 
 #include "failure_report.h"
+#include "finish_editing.h"
 #include "keys_view.h"
 #include "shared_actions.h"
 #include "values_model.h"
@@ -152,6 +153,8 @@ void MainWindow::update_statusbar(const QModelIndex& top_left, const QModelIndex
 }
 
 void MainWindow::reload_values(const QModelIndex& current) {
+    // The name being typed belongs to a value of the key that goes.
+    finish_editing(*values_table);
     show_status(current);
     place_splitter();
     show_values_of(current);
@@ -209,7 +212,23 @@ void MainWindow::value_selected(const QModelIndex& current, const QModelIndex& /
     value_selected(current);
 }
 
-void MainWindow::refresh_views() { values_proxy->sort(0, Qt::AscendingOrder); }
+void MainWindow::refresh_views() {
+    if (!may_change_rows(*this)) {
+        return;
+    }
+    // The proxy leaves the current index at its row; the user's next key is meant for the value, not for its place.
+    const QModelIndex current = values_proxy->mapToSource(values_table->currentIndex());
+    values_proxy->sort(0, Qt::AscendingOrder);
+    if (current.isValid()) {
+        values_table->setCurrentIndex(values_proxy->mapFromSource(current));
+    }
+}
+
+void MainWindow::closeEvent(QCloseEvent* event) {
+    // A name that is refused is told while there is a window to tell it over.
+    finish_editing(*this);
+    QMainWindow::closeEvent(event);
+}
 
 void MainWindow::resizeEvent(QResizeEvent* event) {
     QMainWindow::resizeEvent(event);

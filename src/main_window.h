@@ -47,6 +47,7 @@ public slots:
     void show_find_result();
 
 protected:
+    void closeEvent(QCloseEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
     // Follows the menu bar and the status bar, whose heights change without a resize of the window.

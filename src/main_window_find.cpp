@@ -4,6 +4,7 @@
 
 #include "failure_report.h"
 #include "find_dialog.h"
+#include "finish_editing.h"
 #include "keys_view.h"
 #include "main_window.h"
 #include "values_proxy_model.h"
@@ -37,6 +38,9 @@ QString failure_of(QFuture<RegModel::FindResult> future) {
 }  // namespace
 
 void MainWindow::show_find_dialog() {
+    if (!may_change_rows(*this)) {
+        return;
+    }
     FindRequest request{find_term, find_mode, find_flags};
     if (!ask_find_request(request)) {
         return;
@@ -57,7 +61,9 @@ void MainWindow::find_next() {
 
 // An invalid start goes on where the model's last search stopped.
 void MainWindow::start_search(const QModelIndex& start, const QString& term) {
-    if (!key_model) {
+    // First of all: the search's dialog would take the keyboard from an open editor, and its commit would change the
+    // tree under the worker's feet.
+    if (!key_model || !may_change_rows(*this)) {
         return;
     }
     if (start.isValid()) {
@@ -114,10 +120,11 @@ void MainWindow::show_find_result() {
 }
 
 void MainWindow::show_hit(const RegModel::FindResult& hit) {
-    for (QModelIndex step = hit.key; step.isValid(); step = step.parent()) {
+    const QModelIndex key = KeysView::in_place(hit.key);
+    for (QModelIndex step = key; step.isValid(); step = step.parent()) {
         keys_tree->setExpanded(step, true);
     }
-    keys_tree->setCurrentIndex(hit.key);
+    keys_tree->setCurrentIndex(key);
     if (hit.value_row >= 0) {
         // The row is one of the sorted table, which a value added or renamed since has left unsorted.
         values_proxy->sort(0, Qt::AscendingOrder);

@@ -5,6 +5,7 @@
 #include "edit_dialogs.h"
 #include "edit_number_dialog.h"
 #include "failure_report.h"
+#include "finish_editing.h"
 #include "shared_actions.h"
 #include "values_proxy_model.h"
 
@@ -81,54 +82,59 @@ void ValuesView::size_columns(int old_count, int new_count) {
 }
 
 void ValuesView::value_double_clicked(QModelIndex index) {
-    if (!index.isValid() || !model() || index.column() != name_column) {
+    if (!index.isValid() || !model() || index.column() != name_column || !may_change_rows(*this)) {
         return;
     }
     const QString name = index.data(Qt::DisplayRole).toString();
-    const QModelIndex data_index = model()->index(index.row(), data_column);
+    // Should the table show another key's values by the time the editor is left, this leads nowhere.
+    const QPersistentModelIndex data_index = model()->index(index.row(), data_column);
     const QVariant datum = data_index.data(Qt::DisplayRole);
+    if (datum.typeId() >= QMetaType::User) {
+        if (!edit_string(*model(), name, QString(), data_index)) {
+            tell_refused(tr("The value could not be created."));
+        }
+        return;
+    }
+    bool stored = true;
     switch (datum.typeId()) {
     case QMetaType::QString:
-        edit_string(*model(), name, datum.toString(), data_index);
-        return;
+        stored = edit_string(*model(), name, datum.toString(), data_index);
+        break;
     case QMetaType::QByteArray:
-        edit_binary(*model(), name, datum.toByteArray(), data_index);
-        return;
+        stored = edit_binary(*model(), name, datum.toByteArray(), data_index);
+        break;
     case QMetaType::QStringList:
-        edit_multi_string(*model(), name, datum.toStringList(), data_index);
-        return;
+        stored = edit_multi_string(*model(), name, datum.toStringList(), data_index);
+        break;
     case QMetaType::UInt:
-        edit_dword(name, datum.toUInt(), data_index);
-        return;
+        stored = edit_dword(name, datum.toUInt(), data_index);
+        break;
     case QMetaType::ULongLong:
-        edit_qword(name, datum.toULongLong(), data_index);
-        return;
+        stored = edit_qword(name, datum.toULongLong(), data_index);
+        break;
     default:
+        tell_refused(tr("Data type cannot be edited yet"));
         break;
     }
-    if (datum.typeId() >= QMetaType::User) {
-        edit_string(*model(), name, QString(), data_index);
-    } else {
-        tell_refused(tr("Data type cannot be edited yet"));
+    if (!stored) {
+        tell_refused(tr("The value could not be changed."));
     }
 }
 
-void ValuesView::edit_dword(const QString& value_name, quint32 number, const QModelIndex& data_index) {
+bool ValuesView::edit_dword(const QString& value_name, quint32 number, const QPersistentModelIndex& data_index) {
     EditDwordDialog dialog(value_name);
     dialog.setWindowTitle(tr("Edit DWORD (32-bit) Value", "dialog title"));
     dialog.set_value(number);
-    if (dialog.exec() == QDialog::Accepted) {
-        model()->setData(data_index, QVariant(dialog.value()), Qt::DisplayRole);
-    }
+    return dialog.exec() != QDialog::Accepted ||
+           model()->setData(data_index, QVariant(dialog.value()), Qt::DisplayRole);
 }
 
-void ValuesView::edit_qword(const QString& value_name, quint64 number, const QModelIndex& data_index) {
+bool ValuesView::edit_qword(const QString& value_name, quint64 number, const QPersistentModelIndex& data_index) {
     EditQwordDialog dialog(value_name);
     dialog.setWindowTitle(tr("Edit QWORD (64-bit) Value", "dialog title"));
     dialog.set_value(number);
-    if (dialog.exec() == QDialog::Accepted) {
-        model()->setData(data_index, QVariant(dialog.value()), Qt::DisplayRole);
-    }
+    return dialog.exec() != QDialog::Accepted ||
+           model()->setData(data_index, QVariant(dialog.value()), Qt::DisplayRole);
 }
 
 void ValuesView::keyPressEvent(QKeyEvent* event) {
@@ -167,7 +173,7 @@ void ValuesView::show_values_context_menu(QPoint point) {
 void ValuesView::run_new_value_action(QAction* action) {
     auto* values = qobject_cast<ValuesProxyModel*>(model());
     const int type = type_created_by(action);
-    if (!values || type < 0 || !values->has_key()) {
+    if (!values || type < 0 || !values->has_key() || !may_change_rows(*this)) {
         return;
     }
     if (!values->add_value(type)) {
@@ -175,36 +181,50 @@ void ValuesView::run_new_value_action(QAction* action) {
         return;
     }
     const QModelIndex created = values->index(values->rowCount() - 1, name_column);
-    setCurrentIndex(created);
+    make_current(created);
     edit(created);
+}
+
+// By way of no current index, so that the actions follow also where the rows have moved the current index there
+// unheard.
+void ValuesView::make_current(const QModelIndex& index) {
+    setCurrentIndex(QModelIndex());
+    setCurrentIndex(index);
 }
 
 void ValuesView::run_delete_value_action(bool /*checked*/) {
     // The key tree answers the same action.
-    if (!hasFocus() || !model() || !currentIndex().isValid()) {
+    if (!hasFocus() || !model() || !may_change_rows(*this)) {
+        return;
+    }
+    // What is deleted is the value that was asked about.
+    const QPersistentModelIndex asked = currentIndex();
+    if (!asked.isValid()) {
         return;
     }
     if (QMessageBox::question(this, tr("Confirm Value Removal"), tr("Are you sure you want to delete this value?"),
                               QMessageBox::Yes | QMessageBox::No) != QMessageBox::Yes) {
         return;
     }
-    const int row = currentIndex().row();
+    if (!asked.isValid()) {
+        return;
+    }
+    const int row = asked.row();
     if (!model()->removeRows(row, 1, QModelIndex())) {
         tell_refused(tr("The value could not be deleted."));
         return;
     }
-    // The proxy announces a removal as a new layout: the selection is put on what stands there now, by way of no
-    // selection, so that the actions follow.
-    const int rows = model()->rowCount();
-    setCurrentIndex(QModelIndex());
-    if (rows > 0) {
-        setCurrentIndex(model()->index(qMin(row, rows - 1), name_column));
-    }
+    // The current index has moved to a neighbour as the row went, and the table was sorted since: it goes to what
+    // stands in the deleted row's place now, also where that is the row of a default value that is no longer set.
+    make_current(model()->index(qMin(row, model()->rowCount() - 1), name_column));
 }
 
 void ValuesView::run_rename_value_action(bool /*checked*/) {
+    if (!hasFocus() || !may_change_rows(*this)) {
+        return;
+    }
     const QModelIndex current = currentIndex();
-    if (!hasFocus() || !current.isValid()) {
+    if (!current.isValid()) {
         return;
     }
     setCurrentIndex(current);

@@ -28,7 +28,9 @@ protected:
 
 private:
     void size_columns(int old_count, int new_count);
-    void edit_dword(const QString& value_name, quint32 number, const QModelIndex& data_index);
-    void edit_qword(const QString& value_name, quint64 number, const QModelIndex& data_index);
+    void make_current(const QModelIndex& index);
+    // False when what was entered could not be stored.
+    bool edit_dword(const QString& value_name, quint32 number, const QPersistentModelIndex& data_index);
+    bool edit_qword(const QString& value_name, quint64 number, const QPersistentModelIndex& data_index);
     void tell_refused(const QString& text);
 };

@@ -317,6 +317,10 @@
         <translation>Der Wert konnte nicht erstellt werden.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>Der Wert konnte nicht geändert werden.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Löschen des Werts bestätigen</translation>
     </message>

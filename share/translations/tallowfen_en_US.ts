@@ -317,6 +317,10 @@
         <translation>The value could not be created.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>The value could not be changed.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Confirm Value Removal</translation>
     </message>

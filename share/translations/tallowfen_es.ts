@@ -317,6 +317,10 @@
         <translation>No se pudo crear el valor.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>No se pudo modificar el valor.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Confirmar eliminación de valor</translation>
     </message>

@@ -317,6 +317,10 @@
         <translation>La valeur n&apos;a pas pu être créée.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>La valeur n&apos;a pas pu être modifiée.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Confirmation de la suppression de la valeur</translation>
     </message>

@@ -317,6 +317,10 @@
         <translation>Impossibile creare il valore.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>Impossibile modificare il valore.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Conferma eliminazione valore</translation>
     </message>

@@ -317,6 +317,10 @@
         <translation>値を作成できませんでした。</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>値を変更できませんでした。</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>値の削除の確認</translation>
     </message>

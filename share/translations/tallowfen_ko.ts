@@ -317,6 +317,10 @@
         <translation>값을 만들 수 없습니다.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>값을 변경할 수 없습니다.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>값 삭제 확인</translation>
     </message>

@@ -317,6 +317,10 @@
         <translation>De waarde kan niet worden gemaakt.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>De waarde kan niet worden gewijzigd.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Verwijderen van waarde bevestigen</translation>
     </message>

@@ -317,6 +317,10 @@
         <translation>Nie można utworzyć wartości.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>Nie można zmienić wartości.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Potwierdzenie usunięcia wartości</translation>
     </message>

@@ -317,6 +317,10 @@
         <translation>Não foi possível criar o valor.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>Não foi possível alterar o valor.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Confirmar exclusão de valor</translation>
     </message>

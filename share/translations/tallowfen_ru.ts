@@ -317,6 +317,10 @@
         <translation>Не удалось создать параметр.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>Не удалось изменить параметр.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Подтверждение удаления параметра</translation>
     </message>

@@ -317,6 +317,10 @@
         <translation>Değer oluşturulamadı.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>Değer değiştirilemedi.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Değer Silmeyi Onayla</translation>
     </message>

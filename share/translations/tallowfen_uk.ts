@@ -317,6 +317,10 @@
         <translation>Не вдалося створити параметр.</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>Не вдалося змінити параметр.</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>Підтвердження видалення параметра</translation>
     </message>

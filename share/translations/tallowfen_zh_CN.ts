@@ -317,6 +317,10 @@
         <translation>无法创建该值。</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>无法更改该值。</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>确认删除数值</translation>
     </message>

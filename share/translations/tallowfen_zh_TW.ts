@@ -317,6 +317,10 @@
         <translation>無法建立值。</translation>
     </message>
     <message>
+        <source>The value could not be changed.</source>
+        <translation>無法變更值。</translation>
+    </message>
+    <message>
         <source>Confirm Value Removal</source>
         <translation>確認刪除值</translation>
     </message>

@@ -43,7 +43,9 @@ testkit::HiveLayout layout() {
 
 }  // namespace
 
-Scene::Scene() : m_laid(testkit::lay_out(layout())) { write(m_laid.bytes); }
+Scene::Scene() : Scene(layout()) {}
+
+Scene::Scene(const testkit::HiveLayout& layout) : m_laid(testkit::lay_out(layout)) { write(m_laid.bytes); }
 
 void Scene::write(const testkit::Bytes& all) const {
     QFile out(file());
@@ -56,6 +58,12 @@ void Scene::write(const testkit::Bytes& all) const {
 void Scene::damage_key(const std::string& path) {
     testkit::LaidHive damaged = m_laid;
     damaged.put16(damaged.at(path).record, 0, 0x7878);
+    write(damaged.bytes);
+}
+
+void Scene::damage_value(const std::string& path, size_t place) {
+    testkit::LaidHive damaged = m_laid;
+    damaged.put16(damaged.at(path).values.at(place).record, 0, 0x7878);
     write(damaged.bytes);
 }
 

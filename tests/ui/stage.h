@@ -27,10 +27,13 @@
 class Scene {
 public:
     Scene();
+    explicit Scene(const testkit::HiveLayout& layout);
 
     QString file() const { return m_directory.filePath(QStringLiteral("hive")); }
     // Writes the file anew with the signature of one key's record overwritten.
     void damage_key(const std::string& path);
+    // The same for one value of a key, by its place in the key's list.
+    void damage_value(const std::string& path, size_t place);
     QByteArray bytes() const;
     testkit::Bytes file_bytes() const;
 
