@@ -104,8 +104,7 @@ void tell_lost_name(QWidget* main_window, const QString& key_path, const std::ex
     tell_failure(main_window, FailureReport::instance().told_elsewhere(key_path, reason));
 }
 
-// The rows of the values table belong to the key that the user is at.
-void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_current(failure); }
+void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_shown(failure); }
 
 void report_key_failure(const QModelIndex& index, const std::exception& failure) {
     FailureReport::instance().report(key_path_of(index), failure);
@@ -125,7 +124,7 @@ void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, con
             tell_refused(m_main_window, tr("The specified value name already exists."));
         }
     } catch (const std::exception& failure) {
-        tell_lost_name(m_main_window, FailureReport::instance().current_key(), failure);
+        tell_lost_name(m_main_window, FailureReport::instance().shown_key(), failure);
     }
 }
 

@@ -6,6 +6,7 @@
 #include <QCoreApplication>
 #include <QDialog>
 #include <QDialogButtonBox>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QRegularExpressionValidator>
@@ -63,15 +64,31 @@ bool run_editor(const QString& title, const QString& value_name, QWidget* data_w
 // Registry text is longer than a line edit takes by default.
 void take_any_length(QLineEdit& edit) { edit.setMaxLength(std::numeric_limits<int>::max()); }
 
+// Shift+Return is a new line as Return is, and not a separator inside of one.
+class LinesEdit : public QTextEdit {
+protected:
+    void keyPressEvent(QKeyEvent* event) override {
+        if (event->matches(QKeySequence::InsertLineSeparator)) {
+            textCursor().insertBlock();
+            ensureCursorVisible();
+        } else {
+            QTextEdit::keyPressEvent(event);
+        }
+    }
+};
+
+// A text ends at its first zero, and what is behind one would never be seen again; a clipboard can hold some.
+QString without_zeros(QString text) { return text.remove(QChar::Null); }
+
 // The document's text with its lines parted by "\n". Not toPlainText: that turns a non-breaking space into a blank.
 QString text_of(const QTextDocument& document, bool had_line_separators) {
     QString text = document.toRawText();
     text.replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
     if (!had_line_separators) {
-        // Shift+Return puts one; the user means a line.
+        // Pasted; the user means a line.
         text.replace(QChar::LineSeparator, QLatin1Char('\n'));
     }
-    return text;
+    return without_zeros(text);
 }
 
 }  // namespace
@@ -84,7 +101,7 @@ bool edit_string(QAbstractItemModel& model, const QString& value_name, const QSt
     if (!run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit)) {
         return true;
     }
-    return model.setData(data_index, edit.isModified() ? edit.text() : data, Qt::DisplayRole);
+    return model.setData(data_index, edit.isModified() ? without_zeros(edit.text()) : data, Qt::DisplayRole);
 }
 
 bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
@@ -104,7 +121,7 @@ bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QBy
 
 bool edit_multi_string(QAbstractItemModel& model, const QString& value_name, const QStringList& data,
                        const QPersistentModelIndex& data_index) {
-    QTextEdit edit;
+    LinesEdit edit;
     edit.setAcceptRichText(false);
     edit.setTabChangesFocus(true);
     // Plain text, and not line by line: what looks like markup is data, and so is an empty first line.

@@ -6,6 +6,8 @@
 #include <QMessageBox>
 #include <QPointer>
 
+#include <algorithm>
+
 namespace {
 
 // A hive can hold thousands of damaged keys; a box must still fit the screen.
@@ -51,13 +53,21 @@ QString FailureReport::told_elsewhere(const QString& key_path, const QString& re
 
 void FailureReport::report_at_current(const std::exception& failure, bool from_gesture) {
     const QString reason = QString::fromLocal8Bit(failure.what());
-    const QString below = m_current_key + QLatin1Char('\\');
-    for (const auto& [key_path, told_reason] : std::as_const(m_told)) {
-        if (told_reason == reason && (!from_gesture || key_path.startsWith(below))) {
-            return;
-        }
+    if (!is_told_below(from_gesture ? m_current_key + QLatin1Char('\\') : QString(), reason)) {
+        report(m_current_key, failure);
     }
-    report(m_current_key, failure);
+}
+
+void FailureReport::report_at_shown(const std::exception& failure) {
+    if (!is_told_below(m_shown_key + QLatin1Char('\\'), QString::fromLocal8Bit(failure.what()))) {
+        report(m_shown_key, failure);
+    }
+}
+
+bool FailureReport::is_told_below(const QString& key_path, const QString& reason) const {
+    return std::any_of(m_told.cbegin(), m_told.cend(), [&](const QPair<QString, QString>& told) {
+        return told.second == reason && told.first.startsWith(key_path);
+    });
 }
 
 void FailureReport::show_pending() {

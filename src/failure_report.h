@@ -31,18 +31,25 @@ public:
     // for a row's name, need not have to do with the current key: there any key that was told with the reason counts.
     void report_at_current(const std::exception& failure, bool from_gesture = true);
 
+    // The same for the values that are shown: a gesture on another key leaves them where they are.
+    void report_at_shown(const std::exception& failure);
+
     // The line for a key that the caller tells about itself, in a box of its own; it is not told here again.
     QString told_elsewhere(const QString& key_path, const QString& reason);
 
     // The key that the user's last gesture was about.
     void set_current_key(const QString& key_path) { m_current_key = key_path; }
-    QString current_key() const { return m_current_key; }
+    // The key whose values are shown; the gesture that showed them was about it.
+    void set_shown_key(const QString& key_path) { m_current_key = m_shown_key = key_path; }
+    QString shown_key() const { return m_shown_key; }
 
 private:
     explicit FailureReport(QObject* parent);
     void show_pending();
+    bool is_told_below(const QString& key_path, const QString& reason) const;
 
     QString m_current_key;
+    QString m_shown_key;
     QSet<QPair<QString, QString>> m_told;              // key path and reason
     QHash<QPair<QString, QString>, int> m_told_below;  // path of the key above, and reason
     QStringList m_pending;

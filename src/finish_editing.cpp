@@ -9,7 +9,7 @@
 
 namespace {
 
-void finish_editors_of(const QAbstractItemView& view) {
+void end_editors_of(const QAbstractItemView& view, bool stores) {
     QAbstractItemDelegate* delegate = view.itemDelegate();
     // The views put nothing but editors into their viewports. One that is closed is hidden until it is deleted.
     for (QWidget* child : view.viewport()->findChildren<QWidget*>(QString(), Qt::FindDirectChildrenOnly)) {
@@ -18,23 +18,29 @@ void finish_editors_of(const QAbstractItemView& view) {
             continue;
         }
         // By the delegate's signals, as when the editor loses the keyboard: it need not have it now.
-        emit delegate->commitData(editor);
+        if (stores) {
+            emit delegate->commitData(editor);
+        }
         if (editor) {
             emit delegate->closeEditor(editor, QAbstractItemDelegate::NoHint);
         }
     }
 }
 
-}  // namespace
-
-void finish_editing(const QWidget& part) {
+void end_editors_below(const QWidget& part, bool stores) {
     if (const auto* view = qobject_cast<const QAbstractItemView*>(&part)) {
-        finish_editors_of(*view);
+        end_editors_of(*view, stores);
     }
     for (const QAbstractItemView* view : part.findChildren<QAbstractItemView*>()) {
-        finish_editors_of(*view);
+        end_editors_of(*view, stores);
     }
 }
+
+}  // namespace
+
+void finish_editing(const QWidget& part) { end_editors_below(part, true); }
+
+void drop_editing(const QWidget& part) { end_editors_below(part, false); }
 
 bool may_change_rows(const QWidget& part) {
     if (QApplication::activeModalWidget()) {

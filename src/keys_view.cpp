@@ -8,11 +8,14 @@
 #include "shared_actions.h"
 
 #include <QAction>
-#include <QCoreApplication>
+#include <QApplication>
 #include <QHeaderView>
+#include <QKeyEvent>
 #include <QMenu>
 #include <QMessageBox>
 #include <QMouseEvent>
+
+#include <deque>
 
 KeysView::KeysView(QWidget* parent) : QTreeView(parent) {
     setContextMenuPolicy(Qt::CustomContextMenu);
@@ -131,10 +134,96 @@ void KeysView::run_rename_key_action(bool /*checked*/) {
     edit(current);
 }
 
+// The tree's own asks every shown key for its name, and ends at the first that cannot be read.
+void KeysView::keyboardSearch(const QString& typed) {
+    if (!model() || model()->rowCount() == 0 || typed.isEmpty()) {
+        return;
+    }
+    const bool goes_on = m_since_typed.isValid() && m_since_typed.elapsed() <= QApplication::keyboardInputInterval() &&
+                         !m_typed.isEmpty();
+    m_typed = goes_on ? m_typed + typed : typed;
+    m_since_typed.start();
+    // One letter again and again goes from match to match.
+    const bool is_repeated = m_typed.count(m_typed[0]) == m_typed.size();
+    const QString wanted = is_repeated ? m_typed.left(1) : m_typed;
+    const QModelIndex current = currentIndex();
+    if (!is_repeated && select_if_named(current, wanted)) {
+        return;
+    }
+    // To the end, and once again from the top: the current key may stand in a closed branch, and not be met.
+    for (QModelIndex key = indexBelow(current); key.isValid(); key = indexBelow(key)) {
+        if (select_if_named(key, wanted)) {
+            return;
+        }
+    }
+    for (QModelIndex key = model()->index(0, 0); key.isValid() && key != current; key = indexBelow(key)) {
+        if (select_if_named(key, wanted)) {
+            return;
+        }
+    }
+}
+
+bool KeysView::select_if_named(const QModelIndex& key, const QString& beginning) {
+    try {
+        if (!key.data(Qt::DisplayRole).toString().startsWith(beginning, Qt::CaseInsensitive)) {
+            return false;
+        }
+    } catch (const std::exception&) {
+        // Told when it comes into sight.
+        return false;
+    }
+    setCurrentIndex(key);
+    return true;
+}
+
+// All below a key, the nearest first, and no more keys than the hives have room for: a damaged one can list some of its
+// keys again and again.
+void KeysView::expand_below(const QModelIndex& top) {
+    const auto* keys = qobject_cast<const RegModel*>(model());
+    if (!keys || !top.isValid()) {
+        return;
+    }
+    // One layout for all of them, instead of one for each.
+    scheduleDelayedItemsLayout();
+    qint64 left = keys->most_keys();
+    std::deque<QModelIndex> branches{top};
+    while (!branches.empty() && left > 0) {
+        const QModelIndex branch = branches.front();
+        branches.pop_front();
+        try {
+            const int rows = keys->rowCount(branch);
+            left -= rows;
+            if (rows > 0) {
+                expand(branch);
+            }
+            for (int row = 0; row < rows; ++row) {
+                branches.push_back(keys->index(row, 0, branch));
+            }
+        } catch (const std::exception& failure) {
+            FailureReport::instance().report(key_path_of(branch), failure);
+        }
+    }
+}
+
+void KeysView::keyPressEvent(QKeyEvent* event) {
+    if (event->key() != Qt::Key_Asterisk) {
+        QTreeView::keyPressEvent(event);
+        return;
+    }
+    expand_below(currentIndex());
+    // Past the tree's own expansion, which knows no end.
+    QAbstractItemView::keyPressEvent(event);
+}
+
 void KeysView::mousePressEvent(QMouseEvent* event) {
     // A branch is opened without becoming current: what it throws is about this key.
     const QModelIndex index = indexAt(event->position().toPoint());
     if (index.isValid()) {
+        // The context menu's actions are about the current key, so it must be the one that was clicked, also where that
+        // was on its branch.
+        if (event->button() == Qt::RightButton) {
+            setCurrentIndex(index);
+        }
         FailureReport::instance().set_current_key(key_path_of(index));
     }
     QTreeView::mousePressEvent(event);

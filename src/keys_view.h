@@ -4,6 +4,7 @@
 
 // The key tree: its context menu, and the key commands of the shared actions.
 
+#include <QElapsedTimer>
 #include <QTreeView>
 
 class KeysView : public QTreeView {
@@ -17,6 +18,9 @@ public:
     // The index of the same key at the row where the key stands now.
     static QModelIndex in_place(const QModelIndex& key);
 
+    // Moves to the next shown key whose name begins with what is being typed; passes over those without a name.
+    void keyboardSearch(const QString& typed) override;
+
 public slots:
     void show_keys_context_menu(QPoint point);
     void run_new_key_action(bool checked);
@@ -24,10 +28,16 @@ public slots:
     void run_rename_key_action(bool checked);
 
 protected:
+    void keyPressEvent(QKeyEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
 
 private:
     bool confirm_remove();
+    void expand_below(const QModelIndex& top);
+    bool select_if_named(const QModelIndex& key, const QString& beginning);
     void tell_refused(const QString& text);
+
+    QString m_typed;
+    QElapsedTimer m_since_typed;
 };

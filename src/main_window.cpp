@@ -49,6 +49,8 @@ MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
     status_label->setMinimumWidth(1);
     // Key names are data: what looks like markup in one is shown as it is.
     status_label->setTextFormat(Qt::PlainText);
+    // Of a name with line feeds in it the first line shows.
+    status_label->setAlignment(Qt::AlignLeft | Qt::AlignTop);
     statusBar()->addWidget(status_label, 0);
     connect(values_table, &QAbstractItemView::activated, this,
             qOverload<const QModelIndex&>(&MainWindow::value_selected));
@@ -57,12 +59,15 @@ MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
     connect(&find_watcher, &QFutureWatcherBase::finished, this, &MainWindow::show_find_result);
     // A program that ends by another way than this window must not leave a search behind, either.
     connect(qApp, &QCoreApplication::aboutToQuit, this, &MainWindow::end_search);
+    connect(qApp, &QCoreApplication::aboutToQuit, this, [this] { finish_editing(*this); });
     make_menus();
     menuBar()->installEventFilter(this);
     statusBar()->installEventFilter(this);
 }
 
 MainWindow::~MainWindow() {
+    // The key model is gone, and with it the keys that a name would be stored in.
+    drop_editing(*values_table);
     // The view must not ask a proxy that is destroyed before it.
     values_table->setModel(nullptr);
 }
@@ -138,10 +143,11 @@ void MainWindow::set_model(RegModel* model) {
 
 void MainWindow::show_status(const QModelIndex& key) {
     const QString path = key_path_of(key);
+    status_label->setMaximumHeight(status_label->fontMetrics().height());
     status_label->setText(path);
     // Made into a paragraph here, so that the tip takes no name for markup.
     status_label->setToolTip(path.isEmpty() ? path : Qt::convertFromPlainText(path));
-    FailureReport::instance().set_current_key(path);
+    FailureReport::instance().set_shown_key(path);
 }
 
 void MainWindow::update_statusbar() { show_status(keys_tree->currentIndex()); }

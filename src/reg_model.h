@@ -58,6 +58,9 @@ public:
     // The key behind an index at depth 3 or more, else null.
     static RegKey* editable_key(const QModelIndex& index);
 
+    // How many keys the hives have room for. More are met only where a damaged hive lists some again and again.
+    qint64 most_keys() const;
+
     // Begins a search at a key: its subtree and its later siblings with theirs.
     void begin_find(const QModelIndex& start);
     // Makes a running find return early. From any thread.

@@ -21,7 +21,7 @@ constexpr int frames_between_stop_checks = 10;
 // A key takes at least its record and its cell's size word in the file.
 constexpr qint64 smallest_key = 80;
 
-qint64 most_keys(const RegHive& hive) { return 1 + hive.file_size() / smallest_key; }
+qint64 most_keys_in(const RegHive& hive) { return 1 + hive.file_size() / smallest_key; }
 
 // Every kind of match ignores case. The low four bits of the flags say which kind.
 bool matches(const QString& text, const QString& term, int kind) {
@@ -55,6 +55,11 @@ private:
 
 }  // namespace
 
+qint64 RegModel::most_keys() const {
+    return std::accumulate(hives_.begin(), hives_.end(), static_cast<qint64>(top_level_.size()),
+                           [](qint64 sum, const auto& hive) { return sum + most_keys_in(*hive); });
+}
+
 void RegModel::begin_find(const QModelIndex& start) {
     search_.clear();
     passed_over_.clear();
@@ -63,7 +68,7 @@ void RegModel::begin_find(const QModelIndex& start) {
         search_.push_back({start, with_siblings});
     keys_left_.clear();
     for (const auto& hive : hives_) {
-        const qint64 most = most_keys(*hive);
+        const qint64 most = most_keys_in(*hive);
         keys_left_[hive.get()] = {2 * most, most};
     }
     // Last, so that the lock hands the stack over to the worker as well.

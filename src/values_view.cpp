@@ -210,7 +210,10 @@ void ValuesView::run_delete_value_action(bool /*checked*/) {
         return;
     }
     const int row = asked.row();
+    const int column = asked.column();
     if (!model()->removeRows(row, 1, QModelIndex())) {
+        // A removal that was announced and then refused has moved the selection to a neighbour.
+        make_current(model()->index(row, column));
         tell_refused(tr("The value could not be deleted."));
         return;
     }
@@ -236,7 +239,7 @@ void ValuesView::paintEvent(QPaintEvent* event) {
     try {
         QTableView::paintEvent(event);
     } catch (const std::exception& failure) {
-        FailureReport::instance().report_at_current(failure);
+        FailureReport::instance().report_at_shown(failure);
     }
 }
 

@@ -33,6 +33,7 @@ class KeysViewTest : public QObject {
 
 private slots:
     void the_context_menu_of_a_key();
+    void a_right_click_on_a_branch_is_about_its_key();
     void no_context_menu_below_the_last_key();
     void a_new_key_is_named_in_place();
     void a_new_key_keeps_its_proposed_name();
@@ -47,6 +48,10 @@ private slots:
     void an_escaped_rename_writes_nothing();
     void a_rename_to_a_sibling_s_name_is_told();
     void actions_of_the_other_view_do_nothing_here();
+    void typing_passes_over_a_key_without_a_name();
+    void typing_from_a_closed_branch_ends();
+    void an_asterisk_opens_all_below();
+    void an_asterisk_on_a_hive_without_end_ends();
 };
 
 void KeysViewTest::the_context_menu_of_a_key() {
@@ -61,6 +66,30 @@ void KeysViewTest::the_context_menu_of_a_key() {
         QCOMPARE(menu.parentWidget(), nullptr);
     });
     QVERIFY(shown);
+}
+
+void KeysViewTest::a_right_click_on_a_branch_is_about_its_key() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.keys->expand(stage.key(alpha));
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    stage.keys->setFocus();
+    const QModelIndex deep = stage.key(alpha + QStringLiteral("\\Deep"));
+    const QRect name = stage.keys->visualRect(deep);
+    const QPoint branch(name.left() - stage.keys->indentation() / 2, name.center().y());
+    QCOMPARE(stage.keys->indexAt(branch), deep);
+    QTest::mousePress(stage.keys->viewport(), Qt::RightButton, {}, branch);
+    DialogHand hand;
+    hand.then_press(QMessageBox::Yes);
+    QVERIFY(with_context_menu(*stage.keys, branch, [](QMenu& menu) { menu.actions()[1]->trigger(); }));
+    QVERIFY(hand.is_done());
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Leaf Zeta"));
+    // The other button opens the branch and leaves the current key.
+    stage.select_key(alpha);
+    const QRect root = stage.keys->visualRect(stage.key(QStringLiteral("MACHINE\\SYSTEM")));
+    QTest::mouseClick(stage.keys->viewport(), Qt::LeftButton, {},
+                      QPoint(root.left() - stage.keys->indentation() / 2, root.center().y()));
+    QCOMPARE(stage.status(), alpha);
 }
 
 void KeysViewTest::no_context_menu_below_the_last_key() {
@@ -292,6 +321,84 @@ void KeysViewTest::actions_of_the_other_view_do_nothing_here() {
     QCOMPARE(QApplication::activeModalWidget(), nullptr);
     QVERIFY(!stage.keys->findChild<QLineEdit*>());
     QCOMPARE(scene.bytes(), before);
+}
+
+void KeysViewTest::typing_passes_over_a_key_without_a_name() {
+    Scene scene;
+    scene.damage_key("Alpha\\Leaf");
+    Stage stage(scene);
+    DialogHand hand;
+    // The damaged key itself, as it comes into sight.
+    hand.then_press(QMessageBox::Ok);
+    stage.keys->expand(stage.key(alpha));
+    stage.select_key(alpha + QStringLiteral("\\Deep"));
+    QTRY_VERIFY(hand.is_done());
+    stage.return_to(*stage.keys);
+    QTest::keyClicks(stage.keys, QStringLiteral("ze"));
+    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));
+    QCoreApplication::processEvents();
+    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    // Round the end, past it again.
+    stage.keys->keyboardSearch(QStringLiteral("ta"));
+    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));
+}
+
+void KeysViewTest::typing_from_a_closed_branch_ends() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.keys->expand(stage.key(alpha));
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    stage.keys->collapse(stage.key(alpha));
+    stage.return_to(*stage.keys);
+    QTest::keyClicks(stage.keys, QStringLiteral("q"));
+    stage.select_key(alpha);
+    // Every letter begins anew; one again and again goes from match to match.
+    const int interval = QApplication::keyboardInputInterval();
+    QApplication::setKeyboardInputInterval(-1);
+    for (const char* name : {"MACHINE\\SYSTEM\\Beta", "MACHINE\\SYSTEM\\Beta"}) {
+        QTest::keyClicks(stage.keys, QStringLiteral("b"));
+        QCOMPARE(stage.status(), QString::fromLatin1(name));
+    }
+    QApplication::setKeyboardInputInterval(interval);
+}
+
+void KeysViewTest::an_asterisk_opens_all_below() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.keys->setFocus();
+    stage.select_key(QStringLiteral("MACHINE"));
+    QTest::keyClick(stage.keys, Qt::Key_Asterisk);
+    for (const QString& branch :
+         {QStringLiteral("MACHINE"), QStringLiteral("MACHINE\\SYSTEM"), alpha, alpha + QStringLiteral("\\Deep")}) {
+        QVERIFY2(stage.keys->isExpanded(stage.key(branch)), qPrintable(branch));
+    }
+    QVERIFY(stage.keys->visualRect(stage.key(alpha + QStringLiteral("\\Deep\\Deeper"))).isValid());
+}
+
+void KeysViewTest::an_asterisk_on_a_hive_without_end_ends() {
+    // Each step lists the next one twice, so that the rows double on each of the forty levels.
+    constexpr int levels = 40;
+    testkit::HiveLayout ladder;
+    testkit::KeyLayout* step = &ladder.root;
+    for (int i = 0; i < levels; ++i) {
+        step->add("twin");
+        step = &step->add("step");
+    }
+    const Scene scene(ladder, [](testkit::LaidHive& laid) {
+        std::string path;
+        for (int i = 0; i < levels; ++i) {
+            const uint32_t index = laid.at(path).index;
+            laid.put32(index, 12, laid.get32(index, 4));
+            path += path.empty() ? "step" : "\\step";
+        }
+    });
+    Stage stage(scene);
+    stage.keys->setFocus();
+    stage.select_key(QStringLiteral("MACHINE"));
+    QTest::keyClick(stage.keys, Qt::Key_Asterisk);
+    const QModelIndex root = stage.key(QStringLiteral("MACHINE\\SYSTEM"));
+    QVERIFY(stage.keys->isExpanded(root));
+    QVERIFY(stage.keys->isExpanded(stage.model->index(0, 0, root)));
 }
 
 UI_TEST_MAIN(KeysViewTest)

@@ -45,7 +45,13 @@ testkit::HiveLayout layout() {
 
 Scene::Scene() : Scene(layout()) {}
 
-Scene::Scene(const testkit::HiveLayout& layout) : m_laid(testkit::lay_out(layout)) { write(m_laid.bytes); }
+Scene::Scene(const testkit::HiveLayout& layout, const std::function<void(testkit::LaidHive&)>& change)
+    : m_laid(testkit::lay_out(layout)) {
+    if (change) {
+        change(m_laid);
+    }
+    write(m_laid.bytes);
+}
 
 void Scene::write(const testkit::Bytes& all) const {
     QFile out(file());

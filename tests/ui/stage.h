@@ -13,6 +13,7 @@
 #include <QString>
 #include <QTemporaryDir>
 
+#include <functional>
 #include <memory>
 
 // A hive file that the engine had no hand in.
@@ -27,7 +28,8 @@
 class Scene {
 public:
     Scene();
-    explicit Scene(const testkit::HiveLayout& layout);
+    // `change` may damage the bytes.
+    explicit Scene(const testkit::HiveLayout& layout, const std::function<void(testkit::LaidHive&)>& change = {});
 
     QString file() const { return m_directory.filePath(QStringLiteral("hive")); }
     // Writes the file anew with the signature of one key's record overwritten.
