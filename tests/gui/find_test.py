@@ -115,7 +115,7 @@ def finding(scratch):
 
 def cancelling(scratch):
     """A long search, cancelled by its button and by Escape"""
-    with Session(make_sample(os.path.join(scratch, "SYSTEM"), extra_keys=100000)) as session:
+    with Session(make_sample(os.path.join(scratch, "SYSTEM"), extra_keys=160000)) as session:
         program = session.program
         session.open_key(["Select"])
         before = (program.tree_rows(session.tree), session.rows(), session.status())
