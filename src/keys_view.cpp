@@ -139,7 +139,7 @@ void KeysView::keyboardSearch(const QString& typed) {
     if (!model() || model()->rowCount() == 0 || typed.isEmpty()) {
         return;
     }
-    const bool goes_on = m_since_typed.isValid() && m_since_typed.elapsed() <= QApplication::keyboardInputInterval() &&
+    const bool goes_on = m_since_typed.isValid() && m_since_typed.elapsed() < QApplication::keyboardInputInterval() &&
                          !m_typed.isEmpty();
     m_typed = goes_on ? m_typed + typed : typed;
     m_since_typed.start();
