@@ -212,7 +212,7 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
     }
     expand_below(currentIndex());
     // Past the tree's own expansion, which knows no end.
-    QAbstractItemView::keyPressEvent(event);
+    QAbstractItemView::keyPressEvent(event);  // NOLINT(bugprone-parent-virtual-call)
 }
 
 void KeysView::mousePressEvent(QMouseEvent* event) {
