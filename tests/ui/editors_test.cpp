@@ -140,6 +140,9 @@ private slots:
     void the_base_switch_converts();
     void an_empty_number_is_zero();
     void a_line_made_by_shift_return_is_a_line();
+    void a_line_beside_a_separator_is_a_line();
+    void an_emptied_list_is_one_empty_text();
+    void zeros_are_left_out();
 };
 
 void EditorsTest::the_layout() {
@@ -377,6 +380,9 @@ void EditorsTest::the_base_switch_converts() {
         edit->clear();
         to_decimal->setChecked(true);
         QCOMPARE(edit->text(), QStringLiteral("0"));
+        edit->clear();
+        to_hexadecimal->setChecked(true);
+        QCOMPARE(edit->text(), QStringLiteral("0"));
     };
     EditQwordDialog qword(QStringLiteral("n"));
     qword.set_value(number);
@@ -391,10 +397,13 @@ void EditorsTest::the_base_switch_converts() {
 }
 
 void EditorsTest::an_empty_number_is_zero() {
-    for (Editor editor : {DwordEditor, QwordEditor}) {
+    for (const auto& [editor, base] : {std::pair(DwordEditor, "Hexadecimal"), std::pair(QwordEditor, "Hexadecimal"),
+                                       std::pair(DwordEditor, "Decimal"), std::pair(QwordEditor, "Decimal")}) {
         NotingModel model;
         DialogHand hand;
+        const QString base_text = QString::fromLatin1(base);
         hand.then([&](QWidget* dialog) {
+            find_by_text<QRadioButton>(*dialog, base_text)->setChecked(true);
             qobject_cast<QLineEdit*>(data_field(*dialog))->clear();
             press(*dialog, QDialogButtonBox::Ok);
         });
@@ -425,6 +434,48 @@ void EditorsTest::a_line_made_by_shift_return_is_a_line() {
     hand.then([&](QWidget* dialog) { press(*dialog, QDialogButtonBox::Ok); });
     edit_multi_string(model, QStringLiteral("n"), {}, model.index(0, 2));
     QCOMPARE(model.written, QVariantList{lines({""})});
+}
+
+void EditorsTest::a_line_beside_a_separator_is_a_line() {
+    NotingModel model;
+    const QStringList data{QStringLiteral("a\u2028b")};
+    DialogHand hand;
+    hand.then([&](QWidget* dialog) {
+        QWidget* field = data_field(*dialog);
+        QTest::keyClick(field, Qt::Key_End, Qt::ControlModifier);
+        QTest::keyClick(field, Qt::Key_Return, Qt::ShiftModifier);
+        QTest::keyClicks(field, QStringLiteral("c"));
+        press(*dialog, QDialogButtonBox::Ok);
+    });
+    edit_multi_string(model, QStringLiteral("n"), data, model.index(0, 2));
+    const QStringList wanted{data[0], QStringLiteral("c")};
+    QCOMPARE(model.written, QVariantList{wanted});
+}
+
+void EditorsTest::an_emptied_list_is_one_empty_text() {
+    NotingModel model;
+    DialogHand hand;
+    hand.then([&](QWidget* dialog) {
+        set_text(*dialog, QString());
+        press(*dialog, QDialogButtonBox::Ok);
+    });
+    edit_multi_string(model, QStringLiteral("n"), lines({"a", "b"}), model.index(0, 2));
+    QCOMPARE(model.written, QVariantList{lines({""})});
+}
+
+void EditorsTest::zeros_are_left_out() {
+    NotingModel model;
+    const QString pasted = QStringLiteral("a") + QChar(QChar::Null) + QStringLiteral("b");
+    for (Editor editor : {StringEditor, MultiStringEditor}) {
+        DialogHand hand;
+        hand.then([&](QWidget* dialog) {
+            set_text(*dialog, pasted);
+            press(*dialog, QDialogButtonBox::Ok);
+        });
+        run(editor, model, QVariant());
+    }
+    const QVariantList wanted{QStringLiteral("ab"), lines({"ab"})};
+    QCOMPARE(model.written, wanted);
 }
 
 UI_TEST_MAIN(EditorsTest)

@@ -101,6 +101,7 @@ private slots:
     void a_key_that_throws_is_told_and_passed();
     void cancelled_and_started_again_fifty_times();
     void the_end_of_the_program_ends_the_search();
+    void a_search_without_a_start_goes_on_and_does_not_begin_one();
 };
 
 void SearchTest::the_dialog() {
@@ -405,6 +406,40 @@ void SearchTest::the_end_of_the_program_ends_the_search() {
     QCOMPARE(QCoreApplication::exec(), 7);
     QVERIFY(hand.is_done());
     QVERIFY(model.is_left_alone());
+}
+
+// A model that seems empty to the window, and not to its search.
+class HidingModel : public RegModel {
+public:
+    QModelIndex index(int row, int column, const QModelIndex& parent = QModelIndex()) const override {
+        const bool is_asked_by_window = QThread::currentThread() == thread();
+        return hides && is_asked_by_window && !parent.isValid() ? QModelIndex() : RegModel::index(row, column, parent);
+    }
+
+    bool hides = false;
+};
+
+void SearchTest::a_search_without_a_start_goes_on_and_does_not_begin_one() {
+    const Scene scene;
+    Stage stage(scene, std::make_unique<HidingModel>());
+    auto& model = static_cast<HidingModel&>(*stage.model);
+    model.begin_find(stage.key(alpha));
+    model.hides = true;
+    DialogHand hand;
+    hand.then(ask({QStringLiteral("zeta")}));
+    stage.window.show_find_dialog();
+    QVERIFY(hand.is_done());
+    model.hides = false;
+    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));
+    // It was the model's own search that went on: "Find next" asks.
+    QString title;
+    hand.then([&](QWidget* dialog) {
+        title = dialog->windowTitle();
+        escape(dialog);
+    });
+    stage.window.find_next();
+    QVERIFY(hand.is_done());
+    QCOMPARE(title, QStringLiteral("Find"));
 }
 
 UI_TEST_MAIN(SearchTest)
