@@ -9,7 +9,7 @@
 
 namespace {
 
-void end_editors_of(const QAbstractItemView& view, bool stores) {
+void finish_editors_of(const QAbstractItemView& view) {
     QAbstractItemDelegate* delegate = view.itemDelegate();
     // The views put nothing but editors into their viewports. One that is closed is hidden until it is deleted.
     for (QWidget* child : view.viewport()->findChildren<QWidget*>(QString(), Qt::FindDirectChildrenOnly)) {
@@ -18,29 +18,23 @@ void end_editors_of(const QAbstractItemView& view, bool stores) {
             continue;
         }
         // By the delegate's signals, as when the editor loses the keyboard: it need not have it now.
-        if (stores) {
-            emit delegate->commitData(editor);
-        }
+        emit delegate->commitData(editor);
         if (editor) {
             emit delegate->closeEditor(editor, QAbstractItemDelegate::NoHint);
         }
     }
 }
 
-void end_editors_below(const QWidget& part, bool stores) {
-    if (const auto* view = qobject_cast<const QAbstractItemView*>(&part)) {
-        end_editors_of(*view, stores);
-    }
-    for (const QAbstractItemView* view : part.findChildren<QAbstractItemView*>()) {
-        end_editors_of(*view, stores);
-    }
-}
-
 }  // namespace
 
-void finish_editing(const QWidget& part) { end_editors_below(part, true); }
-
-void drop_editing(const QWidget& part) { end_editors_below(part, false); }
+void finish_editing(const QWidget& part) {
+    if (const auto* view = qobject_cast<const QAbstractItemView*>(&part)) {
+        finish_editors_of(*view);
+    }
+    for (const QAbstractItemView* view : part.findChildren<QAbstractItemView*>()) {
+        finish_editors_of(*view);
+    }
+}
 
 bool may_change_rows(const QWidget& part) {
     if (QApplication::activeModalWidget()) {

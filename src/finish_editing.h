@@ -11,9 +11,6 @@ class QWidget;
 // before this returns.
 void finish_editing(const QWidget& part);
 
-// Closes the editors below `part` and forgets what was typed: for when what they stand on is gone.
-void drop_editing(const QWidget& part);
-
 // What a command that changes rows asks first: false while a dialog is open, which a screen reader can press menu items
 // behind; else the editors in the whole window of `part` are finished.
 bool may_change_rows(const QWidget& part);

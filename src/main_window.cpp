@@ -66,8 +66,8 @@ MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
 }
 
 MainWindow::~MainWindow() {
-    // The key model is gone, and with it the keys that a name would be stored in.
-    drop_editing(*values_table);
+    // The key model is gone, and with it the key behind the rows: an open name editor is closed without it.
+    values_proxy->setSourceModel(nullptr);
     // The view must not ask a proxy that is destroyed before it.
     values_table->setModel(nullptr);
 }

@@ -9,6 +9,7 @@
 
 #include <QDialogButtonBox>
 #include <QLineEdit>
+#include <QStyledItemDelegate>
 #include <QTextEdit>
 
 namespace {
@@ -89,6 +90,13 @@ private slots:
     void a_rename_in_place();
     void a_rename_to_another_value_s_name_is_told();
     void actions_of_the_other_view_do_nothing_here();
+    void a_refused_edit_is_told_data();
+    void a_refused_edit_is_told();
+    void a_refused_creation_is_told_data();
+    void a_refused_creation_is_told();
+    void a_refused_deletion_is_told_and_keeps_the_row();
+    void the_first_value_beside_the_unset_default_can_be_renamed();
+    void no_bytes_show_as_such();
 };
 
 void ValuesViewTest::the_editor_follows_the_data_data() {
@@ -496,6 +504,140 @@ void ValuesViewTest::actions_of_the_other_view_do_nothing_here() {
     shared_actions().rename_action->trigger();
     QVERIFY(!stage.values->findChild<QLineEdit*>());
     QCOMPARE(scene.bytes(), before);
+}
+
+// A key with a value under a name that 8 bits do not carry, and one of a type without a name.
+testkit::HiveLayout odd_values() {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout& key = hive.root.add("Key");
+    testkit::ValueLayout& wide = key.set("wide", 1, testkit::text_data("text"));
+    wide.name = u"\u65e5\u672c";
+    wide.wide_name = true;
+    key.set("odd", 12, {1, 2});
+    return hive;
+}
+
+const QString odd_key = QStringLiteral("MACHINE\\SYSTEM\\Key");
+
+void ValuesViewTest::a_refused_edit_is_told_data() {
+    QTest::addColumn<QString>("name");
+    QTest::newRow("a name in UTF-16") << QString::fromUtf8("日本");
+    QTest::newRow("a type without a name") << QStringLiteral("odd");
+}
+
+void ValuesViewTest::a_refused_edit_is_told() {
+    QFETCH(QString, name);
+    const Scene scene(odd_values());
+    Stage stage(scene);
+    stage.select_key(odd_key);
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    // Left alone, there is nothing to refuse.
+    hand.then([](QWidget* dialog) { press(*dialog, QDialogButtonBox::Ok); });
+    double_click(stage, stage.value(name));
+    QVERIFY(hand.is_done());
+    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    hand.then([](QWidget* dialog) {
+        QTest::keyClicks(QApplication::focusWidget(), QStringLiteral("ab"));
+        press(*dialog, QDialogButtonBox::Ok);
+    });
+    hand.then_press(QMessageBox::Ok);
+    stage.values->value_double_clicked(stage.value(name));
+    QVERIFY(hand.is_done());
+    QCOMPARE(hand.icon, QMessageBox::Critical);
+    QCOMPARE(hand.title, QStringLiteral("Registry Editor"));
+    QCOMPARE(hand.text, QStringLiteral("The value could not be changed."));
+    QCOMPARE(hand.parent, stage.values);
+    QCOMPARE(scene.bytes(), before);
+}
+
+void ValuesViewTest::a_refused_creation_is_told_data() {
+    QTest::addColumn<bool>("is_default");
+    QTest::newRow("the default value") << true;
+    QTest::newRow("a new value") << false;
+}
+
+void ValuesViewTest::a_refused_creation_is_told() {
+    QFETCH(bool, is_default);
+    Scene scene(odd_values());
+    // Whether a record that cannot be read has the new value's name cannot be known.
+    scene.damage_value("Key", 0);
+    Stage stage(scene);
+    stage.select_key(odd_key);
+    const QByteArray before = scene.bytes();
+    stage.values->setCurrentIndex(stage.value(QStringLiteral("odd")));
+    const QStringList shown = stage.value_names();
+    // The record itself is told too, at a time of its own, and once in all rows of this test.
+    QStringList told;
+    QTimer presser;
+    connect(&presser, &QTimer::timeout, &presser, [&] {
+        if (auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget())) {
+            told.append(box->text());
+            QTest::mouseClick(box->button(QMessageBox::Ok), Qt::LeftButton);
+        } else if (QWidget* dialog = QApplication::activeModalWidget()) {
+            press(*dialog, QDialogButtonBox::Ok);
+        }
+    });
+    presser.start(1);
+    if (is_default) {
+        stage.values->value_double_clicked(stage.values->model()->index(0, 0));
+    } else {
+        shared_actions().new_string_action->trigger();
+    }
+    QCOMPARE(told.count(QStringLiteral("The value could not be created.")), 1);
+    QCOMPARE(stage.value_names(), shown);
+    QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("odd")));
+    QCOMPARE(scene.bytes(), before);
+}
+
+void ValuesViewTest::a_refused_deletion_is_told_and_keeps_the_row() {
+    const Scene scene(odd_values());
+    Stage stage(scene);
+    stage.select_key(odd_key);
+    stage.values->setFocus();
+    const QModelIndex wide = stage.value(QString::fromUtf8("日本"));
+    stage.values->setCurrentIndex(wide);
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    hand.then_press(QMessageBox::Yes).then_press(QMessageBox::Ok);
+    shared_actions().delete_action->trigger();
+    QVERIFY(hand.is_done());
+    QCOMPARE(hand.icon, QMessageBox::Critical);
+    QCOMPARE(hand.text, QStringLiteral("The value could not be deleted."));
+    QCOMPARE(stage.values->currentIndex(), stage.value(QString::fromUtf8("日本")));
+    QCOMPARE(stage.values->selectionModel()->selectedIndexes(), QModelIndexList{stage.values->currentIndex()});
+    QCOMPARE(scene.bytes(), before);
+}
+
+void ValuesViewTest::the_first_value_beside_the_unset_default_can_be_renamed() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(beta);
+    stage.values->setFocus();
+    stage.values->setCurrentIndex(stage.values->model()->index(0, 0));
+    QVERIFY(!shared_actions().rename_action->isEnabled());
+    shared_actions().new_string_action->trigger();
+    QVERIFY(shared_actions().rename_action->isEnabled());
+    stage.press_in_editor(QStringLiteral("first"), Qt::Key_Return);
+    QTRY_VERIFY(stored(stage, QStringLiteral("first")));
+    QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("first")));
+}
+
+void ValuesViewTest::no_bytes_show_as_such() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha);
+    DialogHand hand;
+    hand.then([](QWidget* dialog) {
+        qobject_cast<QLineEdit*>(QApplication::focusWidget())->clear();
+        press(*dialog, QDialogButtonBox::Ok);
+    });
+    double_click(stage, stage.value(QStringLiteral("bytes")));
+    QVERIFY(hand.is_done());
+    QCOMPARE(stored(stage, QStringLiteral("bytes"))->data, QVariant(QByteArray("")));
+    const auto* delegate = qobject_cast<const QStyledItemDelegate*>(stage.values->itemDelegate());
+    QCOMPARE(delegate->displayText(stage.value(QStringLiteral("bytes"), 2).data(), QLocale()),
+             QStringLiteral("(zero-length binary value)"));
 }
 
 UI_TEST_MAIN(ValuesViewTest)

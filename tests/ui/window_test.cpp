@@ -71,6 +71,8 @@ private slots:
     void many_failures_share_a_box();
     void rows_that_come_into_sight_bring_no_endless_row_of_boxes();
     void the_model_may_go_before_the_window();
+    void the_model_may_go_while_a_name_is_typed();
+    void a_name_of_many_lines_takes_one();
 };
 
 void WindowTest::before_anything_is_selected_only_the_window_s_own_actions_are_enabled() {
@@ -502,6 +504,40 @@ void WindowTest::the_model_may_go_before_the_window() {
     stage.keys->expandAll();
     stage.model.reset();
     // The stage's window goes now, and must leave the keys alone: the sanitizers look on.
+}
+
+void WindowTest::the_model_may_go_while_a_name_is_typed() {
+    const Scene scene;
+    const QByteArray before = scene.bytes();
+    {
+        Stage stage(scene);
+        stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Alpha"));
+        stage.values->setFocus();
+        stage.values->setCurrentIndex(stage.value(QStringLiteral("text")));
+        shared_actions().rename_action->trigger();
+        auto* editor = qobject_cast<QLineEdit*>(QApplication::focusWidget());
+        QVERIFY(editor);
+        editor->setText(QStringLiteral("other"));
+        stage.model.reset();
+    }
+    QCOMPARE(scene.bytes(), before);
+}
+
+void WindowTest::a_name_of_many_lines_takes_one() {
+    testkit::HiveLayout hive;
+    hive.root.add("Key").add("b" + std::string(200, '\n'));
+    const Scene scene(hive);
+    Stage stage(scene);
+    const QModelIndex key = stage.key(QStringLiteral("MACHINE\\SYSTEM\\Key"));
+    stage.keys->setCurrentIndex(key);
+    const QSize size = stage.window.size();
+    const int height = stage.window.statusBar()->height();
+    stage.keys->setCurrentIndex(stage.model->index(0, 0, key));
+    QVERIFY(stage.status().endsWith(QString(200, QLatin1Char('\n'))));
+    QCoreApplication::sendPostedEvents();
+    QCoreApplication::processEvents();
+    QCOMPARE(stage.window.size(), size);
+    QCOMPARE(stage.window.statusBar()->height(), height);
 }
 
 UI_TEST_MAIN(WindowTest)
