@@ -142,6 +142,32 @@ def values_session(session):
         session.unchanged("Escape")
 
 
+def commands_in_a_name(session):
+    """Refresh and Find next while a name is typed"""
+    program = session.program
+    go(session, MADE)
+    pick_new(session, 1)
+    session.value_set("a new value", MADE, "New Value #1", 1, text_data(""))
+    program.type("An early name")
+    until(lambda: text_of(program.editor()) == "An early name", "the name")
+    program.keys("F5")
+    session.value_renamed("F5 in the name", MADE, "New Value #1", "An early name")
+    program.keys("ctrl+f")
+    program.dialog("Find")
+    program.type("tcpip")
+    program.keys("Return")
+    session.selected(["ControlSet001", "Services", "Tcpip"])
+    program.alone(TITLE)
+    until(lambda: has(session.tree, State.FOCUSED) or focus_tree(session), "the keyboard in the tree")
+    program.keys("F2")
+    program.type("Tcpip6")
+    until(lambda: text_of(program.editor()) == "Tcpip6", "the name")
+    program.keys("F3")
+    session.key_renamed("F3 in the name", ["ControlSet001", "Services", "Tcpip"], "Tcpip6")
+    session.selected(["ControlSet002", "Services", "Tcpip"])
+    program.alone(TITLE)
+
+
 def number_base(session):
     """The base of a number switched by keyboard"""
     program = session.program
@@ -189,11 +215,12 @@ def finding(session):
     """Find, find next, the end of the search"""
     program = session.program
     program.keys("ctrl+f")
-    dialog = program.dialog("Find")
+    program.dialog("Find")
+    program.keys("ctrl+a")
     program.type("tcpip")
     program.keys("Return")
-    for control_set in ("ControlSet001", "ControlSet002"):
-        session.selected([control_set, "Services", "Tcpip"])
+    for hit in (["ControlSet001", "Services", "Tcpip6"], ["ControlSet002", "Services", "Tcpip"]):
+        session.selected(hit)
         program.alone(TITLE)
         program.keys("F3")
     box = program.dialog(TITLE)
@@ -207,7 +234,7 @@ def finding(session):
 def whole_session(scratch):
     """The session with the keyboard alone"""
     with Session(make_sample(os.path.join(scratch, "SYSTEM"))) as session:
-        for scene in (keys_session, values_session, number_base, deleting, finding):
+        for scene in (keys_session, values_session, commands_in_a_name, number_base, deleting, finding):
             step(scene.__doc__)
             scene(session)
         session.program.keys("alt+f")
