@@ -7,6 +7,7 @@
 #include "security.h"
 #include "stored_name.h"
 #include "subkey_change.h"
+#include "tree_check.h"
 
 #include <cstdlib>
 #include <cstring>
@@ -66,11 +67,6 @@ void free_key(Store& store, const KeyView& key, CellOffset parent) {
     free_cell(store, key.offset());
 }
 
-// Whether the key's own lists are such that it can be deleted once it has no subkeys.
-int32_t check_lists(Store& store, const KeyView& key) {
-    return find_value_list(store, key.record).whole && is_own_cell(store, key.offset()) ? R_SUCCESS : R_FAILED;
-}
-
 // In turn, and what a stop after each leaves:
 //   the entry taken out of the list, the parent's count: the key is gone, with all that it held;
 //   its cells freed, the security record's count lowered: fewer cells out of reach.
@@ -90,7 +86,7 @@ int32_t delete_at(RegistryKey& handle, const PathEnd& end) {
         status = R_PATH_NOT_FOUND;
     else if (index.whole && index.total == parent.record.subkey_count &&
              subkey_at(store, index, end.position) == end.key)
-        status = check_lists(store, key);
+        status = check_own_lists(store, key);
     if (status == R_SUCCESS && !remove_subkey(store, end.parent, parent.record, index, end.position))
         status = R_FAILED;
     free_index(index);
@@ -98,75 +94,6 @@ int32_t delete_at(RegistryKey& handle, const PathEnd& end) {
         free_key(store, key, end.parent);
     if (end.parent == handle.info->own)
         reread_counts(handle);
-    return status;
-}
-
-// One level of the walk that RCheckDeleteTree makes.
-struct Level {
-    KeyView key;
-    SubkeyIndex children;
-    uint32_t next;  // the child to look at
-};
-
-// Whether a path can lead to a key of this name.
-bool is_component(const Name& name) {
-    return name.length > 0 && name.length <= longest_key_name && memchr(name.bytes, '\\', name.length) == nullptr &&
-           memchr(name.bytes, '\0', name.length) == nullptr;
-}
-
-// Whether the entry at a position can be deleted by its name: stored in 8 bits, fit for a path, and met first by it.
-int32_t check_entry(Store& store, const Level& parent, uint32_t position, KeyView& key) {
-    if (parent.children.is_root)
-        return R_PATH_NOT_FOUND;
-    if (!read_key(store, subkey_at(store, parent.children, position), key))
-        return R_FAILED;
-    if (key.wide())
-        return R_INVALID_NAME;
-    const Name name = key.searchable();
-    KeyView met;
-    uint32_t where;
-    if (!is_component(name) ||
-        find_subkey(store, parent.children, parent.key.offset(), name, compare_signed, where, met) != Lookup::found ||
-        where != position || has_other_parent(store, parent.key.offset(), key))
-        return R_PATH_NOT_FOUND;
-    return check_lists(store, key);
-}
-
-bool enter(Store& store, Level& level) {
-    level.next = 0;
-    return load_key_index(store, level.key.record, level.children);
-}
-
-// Walks the subtree with a stack of its own; the hive's size bounds the steps, the depth limit the stack.
-int32_t check_tree(Store& store, Level* levels, uint32_t room, const Level& parent, uint32_t position) {
-    auto steps = static_cast<uint32_t>(static_cast<uint32_t>(store.bins_size) / sizeof(KeyRecord));
-    int32_t status = check_entry(store, parent, position, levels[0].key);
-    if (status != R_SUCCESS)
-        return status;
-    if (!enter(store, levels[0]))
-        return R_NOT_ENOUGH_MEMORY;
-    uint32_t depth = 1;
-    while (depth > 0 && status == R_SUCCESS) {
-        Level& level = levels[depth - 1];
-        if (!level.children.whole || level.children.total != level.key.record.subkey_count) {
-            status = R_FAILED;
-        } else if (level.children.total > 0 && (level.key.record.flags & (key_is_link | key_is_root)) != 0) {
-            status = R_INVALID_HANDLE;  // nothing is deleted below such a key
-        } else if (level.next == level.children.total) {
-            free_index(level.children);
-            depth--;
-        } else if (depth == room || steps-- == 0) {
-            status = R_FAILED;
-        } else {
-            status = check_entry(store, level, level.next++, levels[depth].key);
-            if (status == R_SUCCESS && enter(store, levels[depth]))
-                depth++;
-            else if (status == R_SUCCESS)
-                status = R_NOT_ENOUGH_MEMORY;
-        }
-    }
-    while (depth > 0)
-        free_index(levels[--depth].children);
     return status;
 }
 
@@ -217,11 +144,12 @@ int32_t RRenameKey(RegistryKey* key, uint32_t index, const char* new_name) {
     const int32_t opened = ROpenSubKey(key, index, &subkey);
     if (opened != R_SUCCESS)
         return opened == R_NOT_ENOUGH_MEMORY ? opened : int32_t{R_PATH_NOT_FOUND};
+    const CellOffset meant = subkey->info->own;
     RCloseKey(subkey);
     const StoredName stored(new_name);
     if (stored.text() == nullptr)
         return R_NOT_ENOUGH_MEMORY;
-    const int32_t status = rename_subkey(*key->store, key->info->own, index, name_of(stored.text()));
+    const int32_t status = rename_subkey(*key->store, key->info->own, index, meant, name_of(stored.text()));
     reread_counts(*key);
     return status;
 }
@@ -257,20 +185,5 @@ int32_t RCheckDeleteTree(RegistryKey* key, uint32_t index) {
         return R_CANTWRITE;
     if ((key->flags & R_HANDLE_KEY) == 0)
         return R_INVALID_HANDLE;
-    Store& store = *key->store;
-    const uint32_t room = depth_limit - key->depth;
-    const Block memory(static_cast<uint32_t>((room + 1) * sizeof(Level)));
-    if (memory.bytes == nullptr)
-        return R_NOT_ENOUGH_MEMORY;
-    auto* levels = reinterpret_cast<Level*>(memory.bytes);
-    Level& parent = levels[room];
-    int32_t status = R_FAILED;
-    if (!read_key(store, key->info->own, parent.key))
-        return status;
-    if (!enter(store, parent))
-        return R_NOT_ENOUGH_MEMORY;
-    if (parent.children.whole && parent.children.total == parent.key.record.subkey_count && room > 0)
-        status = check_tree(store, levels, room, parent, index);
-    free_index(parent.children);
-    return status;
+    return check_tree(*key->store, key->info->own, key->depth, index);
 }

@@ -67,12 +67,13 @@ int32_t RDeleteValue(RegistryKey* key, const char* name) {
     const StoredName stored(name != nullptr ? name : "");
     if (stored.text() == nullptr)
         return R_NOT_ENOUGH_MEMORY;
-    const int32_t position = RFindValueA(key, stored.text());
-    if (position < 0 || static_cast<uint32_t>(position) >= key->info->value_count)
-        return R_CAN_NOT_COMPLETE;
+    // Looked for in the list as it is now: the handle's may be older than a change through another one.
     KeyView view;
     if (!read_key(*key->store, key->info->own, view))
         return R_FAILED;
+    const int32_t position = position_of_value(*key->store, find_value_list(*key->store, view.record), stored.text());
+    if (position < 0)
+        return R_CAN_NOT_COMPLETE;
     const int32_t status = remove_value(*key->store, key->info->own, view.record, static_cast<uint32_t>(position));
     reread_counts(*key);
     return status;

@@ -140,13 +140,7 @@ int32_t REnumValueW(RegistryKey* key, uint32_t index, uint16_t* name, uint32_t* 
 int32_t RFindValueA(RegistryKey* key, const char* name) {
     if (!is_key(key))
         return R_FAILED;
-    ValueView value;
-    int32_t begun = no_value;
-    const int32_t position =
-        find_value(*key->store, current_values(*key), name_of(name != nullptr ? name : ""), value, &begun);
-    if (position >= 0)
-        return position;
-    return begun >= 0 ? begun : int32_t{R_FAILED};
+    return position_of_value(*key->store, current_values(*key), name);
 }
 
 int32_t RQueryValueExA(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size) {

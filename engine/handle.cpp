@@ -75,6 +75,24 @@ bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record) {
     return true;
 }
 
+// The counts that the handle knows, over the lists as they lie now: a list that was moved through another handle has
+// left its cell to whatever came next.
+KeyRecord snapshot(RegistryKey& handle) {
+    KeyRecord record = {};
+    record.subkey_count = handle.info->subkey_count;
+    record.subkey_index = raw(handle.info->subkey_index);
+    record.value_count = handle.info->value_count;
+    record.value_list = raw(handle.info->value_list);
+    KeyView key;
+    if (read_key(*handle.store, handle.info->own, key)) {
+        record.subkey_index = key.record.subkey_index;
+        record.value_list = key.record.value_list;
+        if (key.record.value_count < record.value_count)
+            record.value_count = key.record.value_count;
+    }
+    return record;
+}
+
 }  // namespace
 
 uint32_t handle_flags(const KeyInfo& info) {
@@ -137,18 +155,12 @@ bool current_index(RegistryKey& handle) {
     if (handle.index.generation == handle.store->generation)
         return true;
     free_index(handle.index);
-    KeyRecord record = {};
-    record.subkey_count = handle.info->subkey_count;
-    record.subkey_index = raw(handle.info->subkey_index);
-    return take_index(handle, *handle.store, record);
+    return take_index(handle, *handle.store, snapshot(handle));
 }
 
 ValueList& current_values(RegistryKey& handle) {
     if (handle.values_generation != handle.store->generation) {
-        KeyRecord record = {};
-        record.value_count = handle.info->value_count;
-        record.value_list = raw(handle.info->value_list);
-        take_values(handle, *handle.store, record);
+        take_values(handle, *handle.store, snapshot(handle));
     }
     return handle.values;
 }

@@ -163,35 +163,48 @@ Outcome add_to_leaf(Store& store, CellOffset parent_offset, KeyRecord& parent, c
     return outcome;
 }
 
-// Takes one entry out of its leaf; an emptied leaf of a root goes out of the root, since no other reader expects one.
-Outcome take_out(Store& store, const SubkeyIndex& index, uint32_t position) {
-    const uint32_t number = leaf_holding(index, position);
-    const Leaf& leaf = index.leaf(number);
-    if (index.is_root && leaf.count == 1) {
-        Leaf root = {};  // a root's entries are offsets, as an "li" leaf's are
-        root.cell = index.cell;
-        root.signature = sig_index_leaf;
-        root.count = index.leaf_count;
-        LeafBytes now(root);
-        LeafBytes before(root);
-        if (!read_leaf_bytes(store, root, now) || !read_leaf_bytes(store, root, before))
+// A root's entries are offsets, as an "li" leaf's are.
+Leaf root_as_leaf(const SubkeyIndex& index) {
+    Leaf root = {};
+    root.cell = index.cell;
+    root.signature = sig_index_leaf;
+    root.count = index.leaf_count;
+    return root;
+}
+
+// One entry that goes out of its leaf; an emptied leaf of a root goes out of the root, since no other reader expects
+// one. Takes its memory when it is made, so that it can be made before a change that it has to follow.
+class Removal {
+public:
+    Removal(const SubkeyIndex& index, uint32_t position)
+        : empties_(index.is_root && index.leaf(leaf_holding(index, position)).count == 1),
+          leaf_(index.leaf(leaf_holding(index, position))), list_(empties_ ? root_as_leaf(index) : leaf_),
+          at_(empties_ ? leaf_holding(index, position) : position - leaf_.first), now_(list_), before_(list_) {}
+
+    bool has_memory() const { return now_.block.bytes != nullptr && before_.block.bytes != nullptr; }
+
+    // Once. The list must have as many entries as when the removal was made.
+    Outcome write(Store& store) {
+        if (!is_own_cell(store, list_.cell.offset) || !read_leaf_bytes(store, list_, now_) ||
+            !read_leaf_bytes(store, list_, before_))
             return Outcome::unchanged;
-        now.remove(number);
+        now_.remove(at_);
+        // Only the lowered count's worth is written: behind it the old last entry stays.
         const Outcome outcome =
-            rewrite_at(store, record_position(root.cell.offset), now.block.bytes, before.block.bytes, now.used());
-        if (outcome == Outcome::written)
-            free_leaf(store, leaf.cell.offset);
+            rewrite_at(store, record_position(list_.cell.offset), now_.block.bytes, before_.block.bytes, now_.used());
+        if (empties_ && outcome == Outcome::written)
+            free_leaf(store, leaf_.cell.offset);
         return outcome;
     }
-    LeafBytes now(leaf);
-    LeafBytes before(leaf);
-    if (!is_own_cell(store, leaf.cell.offset) || !read_leaf_bytes(store, leaf, now) ||
-        !read_leaf_bytes(store, leaf, before))
-        return Outcome::unchanged;
-    now.remove(position - leaf.first);
-    // Only the lowered count's worth is written: behind it the old last entry stays.
-    return rewrite_at(store, record_position(leaf.cell.offset), now.block.bytes, before.block.bytes, now.used());
-}
+
+private:
+    bool empties_;
+    Leaf leaf_;
+    Leaf list_;
+    uint32_t at_;
+    LeafBytes now_;
+    LeafBytes before_;
+};
 
 // Whether an entry that moves to a place has it in its own leaf.
 bool stays_in_leaf(const SubkeyIndex& index, uint32_t position, uint32_t place) {
@@ -210,15 +223,15 @@ Outcome move_within(Store& store, const Leaf& leaf, uint32_t from, uint32_t to, 
     return write_leaf(store, leaf, now, before);
 }
 
-// Takes the entry that leads to a key out of a root's leaves, after a change that has moved one of them.
-bool take_out_key(Store& store, CellOffset root, CellOffset key) {
+// Takes the entry that leads to a key out of a root's leaves again, one of which may have moved for it.
+bool take_back_key(Store& store, CellOffset root, CellOffset key) {
     SubkeyIndex index;
     if (!load_index(store, root, index))
         return false;
     bool done = false;
-    for (uint32_t i = 0; i < index.total && !done; i++) {
+    for (uint32_t i = 0; index.whole && i < index.total; i++) {
         if (subkey_at(store, index, i) == key) {
-            done = take_out(store, index, i) == Outcome::written;
+            done = Removal(index, i).write(store) == Outcome::written;
             break;
         }
     }
@@ -236,19 +249,19 @@ Outcome move_between(Store& store, CellOffset parent_offset, KeyRecord& parent, 
     KeyRecord counted = parent;
     counted.subkey_count = counted.subkey_count + 1;
     LeafBytes now(target);
-    const CellOffset old = subkey_at(store, index, position);
-    if (!is_own_cell(store, target.cell.offset) || !is_own_cell(store, index.cell.offset) ||
+    Removal removal(index, position);  // the entry has it from another leaf than the one that it goes to
+    if (!is_own_cell(store, target.cell.offset) || !is_own_cell(store, index.cell.offset) || !removal.has_memory() ||
         !read_leaf_bytes(store, target, now))
         return Outcome::unchanged;
     now.insert(place - target.first, entry_for(target.signature, key, name));
     const Outcome outcome = add_to_leaf(store, parent_offset, parent, counted, index, number, now);
     if (outcome != Outcome::written)
         return outcome;
-    const bool moved = take_out_key(store, index.cell.offset, old);
-    const bool undone = !moved && take_out_key(store, index.cell.offset, key);
-    if (moved || undone)
+    const Outcome removed = removal.write(store);
+    const bool undone = removed == Outcome::unchanged && take_back_key(store, index.cell.offset, key);
+    if (removed == Outcome::written || undone)
         rewrite_key(store, parent_offset, parent, before);
-    return moved ? Outcome::written : undone ? Outcome::unchanged : Outcome::unknown;
+    return removed == Outcome::unchanged && !undone ? Outcome::unknown : removed;
 }
 
 }  // namespace
@@ -295,7 +308,7 @@ Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, 
     if (!read_leaf_bytes(store, leaf, before) || !read_leaf_bytes(store, leaf, now))
         return Outcome::unchanged;
     now.remove(position);
-    const Outcome outcome = take_out(store, index, position);
+    const Outcome outcome = Removal(index, position).write(store);
     if (outcome != Outcome::written)
         return outcome;
     KeyRecord changed = parent;

@@ -177,7 +177,7 @@ bool remove_subkey(Store& store, CellOffset parent_offset, KeyRecord& parent, co
 //   the parent's longest name: an upper bound as before;
 //   the entry moved, see move_entry: the key under its new name;
 //   the old record's cell freed.
-int32_t rename_subkey(Store& store, CellOffset parent_offset, uint32_t position, const Name& name) {
+int32_t rename_subkey(Store& store, CellOffset parent_offset, uint32_t position, CellOffset meant, const Name& name) {
     KeyView parent;
     KeyView old;
     SubkeyIndex index = {};
@@ -187,9 +187,8 @@ int32_t rename_subkey(Store& store, CellOffset parent_offset, uint32_t position,
         load_key_index(store, parent.record, index)) {
         KeyView sibling;
         uint32_t sibling_position;
-        if (!index.whole || index.total != parent.record.subkey_count ||
-            !read_key(store, subkey_at(store, index, position), old) ||
-            belongs_elsewhere(store, parent_offset, index, old) ||
+        if (!index.whole || index.total != parent.record.subkey_count || subkey_at(store, index, position) != meant ||
+            !read_key(store, meant, old) || belongs_elsewhere(store, parent_offset, index, old) ||
             find_subkey(store, index, parent_offset, name, compare_index, sibling_position, sibling) != Lookup::absent)
             status = R_FAILED;
         else if (load_key_index(store, old.record, children))

@@ -18,7 +18,8 @@ Inserted insert_subkey(Store& store, CellOffset parent, const Name& name, bool n
 bool remove_subkey(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
                    uint32_t position);
 
-// Gives the subkey at a position another name: a new record takes the old one's place. Status as RRenameKey's.
-int32_t rename_subkey(Store& store, CellOffset parent, uint32_t position, const Name& name);
+// Gives the subkey at a position another name: a new record takes the old one's place. Refused where another key than
+// the one that is meant stands there by now. Status as RRenameKey's.
+int32_t rename_subkey(Store& store, CellOffset parent, uint32_t position, CellOffset meant, const Name& name);
 
 }  // namespace engine

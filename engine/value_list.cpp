@@ -76,7 +76,7 @@ bool rewrite_in_place(Store& store, const ValueView& old, const ValueRecord& rec
 // the value stands in a spare one. In turn, and what the value reads as after a stop there: spare cell taken and
 // written: as before; the record leads to the spare cell: as after; the own cell written: as after; the record leads
 // back to it: as after; the spare cell freed. Where the own cell cannot be written, the value stays in the spare one.
-// Where none is to be had, on a full disk, the two are written one after the other.
+// Where none is to be had, as on a full disk, the two are written one after the other.
 bool rewrite_data(Store& store, const ValueView& old, const ValueRecord& record, const NewValue& value) {
     const CellOffset spare = place_data(store, value);
     if (spare == CellOffset::none)
@@ -87,9 +87,12 @@ bool rewrite_data(Store& store, const ValueView& old, const ValueRecord& record,
         return false;
     ValueRecord back = spared.record;
     back.data = old.record.data;
-    if (write_data(store, cell_offset(back.data), value) && rewrite_value(store, spared, back) == Outcome::written)
+    Outcome outcome = Outcome::unchanged;
+    if (write_data(store, cell_offset(back.data), value))
+        outcome = rewrite_value(store, spared, back);
+    if (outcome == Outcome::written)
         free_cell(store, spare);
-    return true;
+    return outcome != Outcome::unknown;
 }
 
 // Whether what a data offset leads to is not data at all: a record, a list of values (which has no signature, but
@@ -312,6 +315,15 @@ int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueV
     if (begun != nullptr)
         *begun = first_begun;
     return missing;
+}
+
+int32_t position_of_value(Store& store, const ValueList& list, const char* name) {
+    ValueView value;
+    int32_t begun = no_value;
+    const int32_t position = find_value(store, list, name_of(name != nullptr ? name : ""), value, &begun);
+    if (position >= 0)
+        return position;
+    return begun >= 0 ? begun : int32_t{R_FAILED};
 }
 
 // A new value, in turn: its data cell, its record, its slot in the list (in a longer copy of the list, where that has

@@ -27,6 +27,10 @@ constexpr int32_t unreadable_value = -2;
 // zero byte after that name, or no_value.
 int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value, int32_t* begun = nullptr);
 
+// The same for a name from a call, null being the empty one: the value that has it, else the first whose name it
+// begins, else -1.
+int32_t position_of_value(Store& store, const ValueList& list, const char* name);
+
 struct NewValue {
     Name name;
     uint32_t type;

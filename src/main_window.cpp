@@ -222,12 +222,7 @@ void MainWindow::refresh_views() {
     if (!may_change_rows(*this)) {
         return;
     }
-    // The proxy leaves the current index at its row; the user's next key is meant for the value, not for its place.
-    const QModelIndex current = values_proxy->mapToSource(values_table->currentIndex());
     values_proxy->sort(0, Qt::AscendingOrder);
-    if (current.isValid()) {
-        values_table->setCurrentIndex(values_proxy->mapFromSource(current));
-    }
 }
 
 void MainWindow::closeEvent(QCloseEvent* event) {

@@ -357,10 +357,12 @@ int RegKey::rename_key(int index, const QString& new_name) {
     if (position < 0)
         return -2;
     AbstractRegKey* renamed = children_[static_cast<size_t>(index)];
-    RegistryKey* moved = nullptr;
-    if (renamed != nullptr && ROpenSubKey(handle, static_cast<uint32_t>(position), &moved) == R_SUCCESS) {
-        static_cast<RegKey*>(renamed)->offset_ = RKeyOffset(moved);
-        RCloseKey(moved);
+    if (renamed != nullptr) {
+        RegistryKey* moved = nullptr;
+        const bool opens = ROpenSubKey(handle, static_cast<uint32_t>(position), &moved) == R_SUCCESS;
+        static_cast<RegKey*>(renamed)->offset_ = opens ? RKeyOffset(moved) : UINT32_MAX;
+        if (opens)
+            RCloseKey(moved);
     }
     children_.erase(children_.begin() + index);
     children_.insert(children_.begin() + position, renamed);

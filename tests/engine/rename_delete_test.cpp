@@ -287,6 +287,89 @@ INSTANTIATE_TEST_SUITE_P(Rows, TreeRefused,
                                          Refusing{"marked_as_root", u"root", 0x04, R_INVALID_HANDLE}),
                          [](const auto& row) { return row.param.rule; });
 
+// A cell that two keys of the tree lead to goes with the first of them.
+TEST_F(Moving, a_tree_whose_keys_share_a_cell_is_refused_before_anything_is_deleted) {
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    for (const char* name : {"p", "q"}) {
+        KeyLayout& key = top.add("x").add(name);
+        key.set("v", 4, {1, 2, 3, 4});
+        key.add("below");
+        key.add("last");
+    }
+    top.children[0].children.push_back(top.children[1].children[0]);
+    top.children.pop_back();
+    const LaidHive sound = lay_out(layout);
+    enum class Shared { nothing, values, subkeys, key };
+    for (const Shared shared : {Shared::nothing, Shared::values, Shared::subkeys, Shared::key}) {
+        LaidHive hive = sound;
+        const KeyPlaces& q = hive.at("Top\\x\\q");
+        if (shared == Shared::values)
+            hive.put32(hive.at("Top\\x\\p").record, 40, q.value_list);
+        if (shared == Shared::subkeys)
+            hive.put32(hive.at("Top\\x\\p").record, 28, q.index);
+        if (shared == Shared::key)
+            hive.put32(hive.at("Top\\x").index, 4, q.record);
+        Scene other(hive.bytes);
+        Handle handle = other.OpenKey("Top");
+        EXPECT_EQ(RCheckDeleteTree(handle.get(), 0) == 0, shared == Shared::nothing) << static_cast<int>(shared);
+        EXPECT_TRUE(other.Untouched());
+    }
+    // The same key twice, asked about itself.
+    LaidHive hive = sound;
+    hive.put32(hive.at("Top\\x").index, 4, hive.at("Top\\x\\q").record);
+    Scene other(hive.bytes);
+    Handle handle = other.OpenKey("Top\\x");
+    EXPECT_EQ(RCheckDeleteTree(handle.get(), 0), R_PATH_NOT_FOUND);
+}
+
+// What a handle knows is older than what was done through another one.
+TEST_F(Moving, an_old_handle_deletes_the_value_of_the_name_and_renames_the_key_it_lists_or_none) {
+    Handle old = scene.OpenKey("Top\\Values");
+    for (const char* name : {"v1", "v2"})
+        EXPECT_EQ(scene.DeleteValue("Top\\Values", name), 0);
+    scene.MarkBase();
+    EXPECT_EQ(RDeleteValue(old.get(), "v2"), R_CAN_NOT_COMPLETE);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(RDeleteValue(old.get(), "v4"), 0);
+    EXPECT_EQ(scene.Changes().size(), 1U);
+    const Hive hive = scene.Read();
+    EXPECT_NE(find_value(*hive.find("Top\\Values"), "v3"), nullptr);
+
+    Handle top = scene.OpenKey("Top");
+    EXPECT_EQ(scene.Create("Top\\A first one"), 0);
+    Handle second = scene.OpenKey("Top");
+    EXPECT_EQ(RRenameKey(top.get(), 0, "Renamed"), 0);  // the list is read as it is now
+    EXPECT_FALSE(scene.OpenKey("Top\\A first one"));
+    EXPECT_TRUE(scene.OpenKey("Top\\Alone"));
+}
+
+// The list moves to a longer cell, and another key's takes the old one.
+TEST_F(Moving, an_old_handle_reads_its_own_keys_list_wherever_it_is_now) {
+    HiveLayout layout;
+    layout.leaf = Leaf::hash;
+    KeyLayout& key = layout.root.add("Key");
+    for (const char* name : {"q", "f", "m"})
+        key.add(name);
+    key.sorted = false;
+    layout.root.add("Other");
+    layout.no_free_space = true;
+    const uint32_t leaf = lay_out(layout).at("Key").index;
+    Scene other(layout);
+    Handle old = other.OpenKey("Key");
+    EXPECT_EQ(other.Create("Key\\n"), 0);
+    EXPECT_EQ(other.Create("Other\\a"), 0);
+    ASSERT_EQ(get32(other.bytes(), LaidHive::position(other.Read().find("Other")->offset, 28)), leaf);
+    Handle found;
+    EXPECT_NE(ROpenKey(old.get(), "a", found.out()), 0);
+    EXPECT_NE(ROpenKey(old.get(), "~none~", found.out()), 0);
+    for (const char* path : {"Key\\q", "Key\\f", "Key\\m", "Key\\n"}) {
+        uint32_t disposition = 9;
+        EXPECT_EQ(other.Create(path, &disposition), 0);
+        EXPECT_EQ(disposition, 1U) << path;
+    }
+}
+
 TEST_F(Moving, a_link_without_subkeys_and_a_name_of_259_characters_can_be_deleted) {
     HiveLayout layout;
     KeyLayout& top = layout.root.add("Top");

@@ -130,8 +130,8 @@ bool fails_at(uint64_t nth, bool lasting, const Attempt& attempt, Outcomes& outc
     return failed;
 }
 
-// Ends where no request is left to fail. Where handles are dropped and memory stays out, the views that hear of the rows
-// cannot ask the key either, and throw: nothing can be said of them then.
+// Ends where no request is left to fail. Where handles are dropped and memory stays out, the views that hear of the
+// rows cannot ask the key either, and throw: nothing can be said of them then.
 void run_through(const Attempt& attempt, Outcomes& outcomes) {
     for (const bool lasting : {false, true}) {
         if (lasting && attempt.drops_handles)

@@ -100,6 +100,8 @@ QString try_with(const HiveOnDisk& file, const Operation& operation) {
         try {
             name = key->name();
         } catch (const std::runtime_error&) {
+            if (!faults.lasting)
+                return names[key] + QStringLiteral(" cannot be opened any more");
             continue;  // told, not taken for another
         }
         const bool may_differ = key == renamed && name == QStringLiteral("p999");

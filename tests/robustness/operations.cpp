@@ -79,6 +79,10 @@ HiveLayout operation_layout(Leaf leaf) {
     rooted.per_leaf = 3;
     for (const char* name : {"a1", "a2", "a3", "m1", "m2", "m3", "z1"})
         fill(rooted.add(name));
+    KeyLayout& single = layout.root.add("Single");
+    single.per_leaf = 1;
+    for (const char* name : {"a", "b", "c", "d", "e"})
+        single.add(name);
     KeyLayout& plain = layout.root.add("Simple");
     plain.own_leaf = true;
     plain.leaf = Leaf::plain;
@@ -129,6 +133,7 @@ std::vector<Operation> operations() {
         rename("key with subkeys renamed", "Parent", "branch", "zweig"),
         rename("renamed into another leaf", "Rooted", "a2", "m15"),
         rename("renamed out of a leaf of one", "Rooted", "z1", "a15"),
+        rename("renamed out of a leaf of one among others", "Single", "a", "cc"),
     };
 }
 
