@@ -307,14 +307,21 @@ TEST_F(Changing, data_that_fits_its_cell_needs_no_room_on_a_full_disk) {
 
 // What the call says is what the file holds, whichever write fails.
 TEST_F(Changing, an_update_that_a_failed_write_cuts_short_says_whether_the_new_data_is_there) {
-    for (uint64_t nth = 1;; nth++) {
-        Scene other(tree());
-        other.file().arm({MemoryFile::Call::write, nth, false, false});
-        const int32_t status = other.Set("Alpha", "Hundred", 3, pattern(50, 7));
-        if (!other.file().failed())
-            break;
-        const Hive now = other.Read();
-        EXPECT_EQ(find_value(*now.find("Alpha"), "Hundred")->data == pattern(50, 7), status == 0) << nth;
+    for (const bool full : {false, true}) {
+        HiveLayout layout = tree();
+        layout.no_free_space = full;
+        for (uint64_t nth = 1;; nth++) {
+            Scene other(layout);
+            if (full)
+                other.file().capacity = other.bytes().size();
+            other.file().arm({MemoryFile::Call::write, nth, false, false});
+            const int32_t status = other.Set("Alpha", "Hundred", 3, pattern(50, 7));
+            if (!other.file().failed())
+                break;
+            const Hive now = other.Read();
+            EXPECT_EQ(find_value(*now.find("Alpha"), "Hundred")->data, status == 0 ? pattern(50, 7) : pattern(100))
+                << nth;
+        }
     }
 }
 

@@ -329,6 +329,7 @@ TEST_F(Moving, an_old_handle_deletes_the_value_of_the_name_and_renames_the_key_i
     for (const char* name : {"v1", "v2"})
         EXPECT_EQ(scene.DeleteValue("Top\\Values", name), 0);
     scene.MarkBase();
+    EXPECT_EQ(RFindValueA(old.get(), "v1"), -1);
     EXPECT_EQ(RDeleteValue(old.get(), "v2"), R_CAN_NOT_COMPLETE);
     EXPECT_TRUE(scene.Untouched());
     EXPECT_EQ(RDeleteValue(old.get(), "v4"), 0);

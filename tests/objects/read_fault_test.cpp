@@ -130,8 +130,10 @@ private slots:
         QFETCH(const int, operation);
         QFETCH(const bool, lasting);
         const testkit::Bytes bytes = testkit::lay_out(layout()).bytes;
+        // Most of the reads come before anything is written: few of those will do.
+        constexpr int close = 60;
         int total = 1;
-        for (int nth = 0; nth <= total; nth++) {
+        for (int nth = 0; nth <= total; nth += nth > 0 && nth + close < total ? 9 : 1) {
             const HiveOnDisk file(bytes);
             faults = {false, lasting, 0, nth};
             const QString found = try_with(file, operations[operation]);
