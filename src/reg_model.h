@@ -92,6 +92,7 @@ private:
     void push_key_frames(const Frame& frame, FindMode mode);
     void push_value_frames(const QModelIndex& key, const std::vector<int>& rows);
     void renew_value_frames();
+    std::vector<int> followed_rows(const std::vector<int>& awaited_rows, const std::vector<QString>& now) const;
     bool is_stopped();
     std::vector<Frame>::iterator sibling_frame(const AbstractRegKey* parent);
     void forget_frames_below(const AbstractRegKey* key);

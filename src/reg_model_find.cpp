@@ -14,6 +14,7 @@
 #include <algorithm>
 #include <iterator>
 #include <numeric>
+#include <utility>
 
 namespace {
 
@@ -133,28 +134,42 @@ void RegModel::renew_value_frames() {
     if (search_.empty() || search_.back().value < 0)
         return;
     const QModelIndex key = search_.back().key;
-    std::vector<bool> is_awaited(value_names_.size(), false);
+    std::vector<int> awaited_rows;
     for (; !search_.empty() && search_.back().value >= 0; search_.pop_back())
-        is_awaited[static_cast<size_t>(search_.back().value)] = true;
-    std::multiset<QString> visited;
-    std::multiset<QString> awaited;
-    for (size_t row = 0; row < value_names_.size(); row++)
-        (is_awaited[row] ? awaited : visited).insert(value_names_[row]);
+        awaited_rows.push_back(search_.back().value);
     // Without its frames already: should the key throw, the search goes on behind it the next time.
     searched_ = key;
-    value_names_ = shown_value_names(*editable_key(key), ValuesModel::default_name());
+    std::vector<QString> now = shown_value_names(*editable_key(key), ValuesModel::default_name());
+    push_value_frames(key, now == value_names_ ? awaited_rows : followed_rows(awaited_rows, now));
+    value_names_ = std::move(now);
+}
+
+// Where the awaited rows of value_names_ are in other names. The first row is the unnamed value's, whether there is
+// one or not, and stays where it is. Behind it several rows may have one name, in a damaged key: the lower ones were
+// visited, and of these the first is the only one that can be deleted, so the awaited ones are looked for from the
+// end.
+std::vector<int> RegModel::followed_rows(const std::vector<int>& awaited_rows, const std::vector<QString>& now) const {
+    std::vector<bool> is_awaited(value_names_.size(), false);
+    for (const int row : awaited_rows)
+        is_awaited[static_cast<size_t>(row)] = true;
+    std::multiset<QString> visited;
+    std::multiset<QString> awaited;
+    for (size_t row = 1; row < value_names_.size(); row++)
+        (is_awaited[row] ? awaited : visited).insert(value_names_[row]);
     std::vector<int> rows;
     std::vector<int> new_names;
-    for (size_t row = 0; row < value_names_.size(); row++) {
-        if (take(awaited, value_names_[row]))
+    for (size_t row = now.size() - 1; row > 0; row--) {
+        if (take(awaited, now[row]))
             rows.push_back(static_cast<int>(row));
-        else if (!take(visited, value_names_[row]))
+        else if (!take(visited, now[row]))
             new_names.push_back(static_cast<int>(row));
     }
+    if (is_awaited[0])
+        rows.push_back(0);
     if (!awaited.empty())
         rows.insert(rows.end(), new_names.begin(), new_names.end());
     std::sort(rows.begin(), rows.end());
-    push_value_frames(key, rows);
+    return rows;
 }
 
 RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mode, Qt::MatchFlags flags) {

@@ -313,6 +313,67 @@ private slots:
         QCOMPARE(values.rest(), rest);
     }
 
+    // Rows of one name, of which some were visited.
+    void equal_names_stay_apart_after_a_change_data() {
+        QTest::addColumn<int>("hits_before");
+        QTest::addColumn<QString>("change");
+        QTest::addColumn<QString>("rest");
+        QTest::newRow("another value is made") << 1 << QStringLiteral("+") << QStringLiteral("1,3,4");
+        QTest::newRow("it is made after two hits") << 2 << QStringLiteral("+") << QStringLiteral("3,4");
+        QTest::newRow("it is made after three hits") << 3 << QStringLiteral("+") << QStringLiteral("4");
+        QTest::newRow("the one like the unnamed one is deleted") << 1 << QStringLiteral("1") << QStringLiteral("1,2");
+        QTest::newRow("the unnamed one is deleted") << 1 << QStringLiteral("0") << QStringLiteral("1,2,3");
+        QTest::newRow("the found one is deleted") << 3 << QStringLiteral("2") << QStringLiteral("2");
+    }
+
+    void equal_names_stay_apart_after_a_change() {
+        QFETCH(int, hits_before);
+        QFETCH(QString, change);
+        QFETCH(QString, rest);
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        for (const char* name : {"", "(Default)", "def", "dfe"})
+            key.set(name, 4, testkit::pattern(4));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        laid.bytes[testkit::LaidHive::position(laid.at("Key").values[3].record, 21)] = 'e';
+        laid.bytes[testkit::LaidHive::position(laid.at("Key").values[3].record, 22)] = 'f';
+        Searched searched(laid.bytes);
+        ValuesModel source(RegModel::editable_key(searched.at(QStringLiteral("Key"))));
+        ValuesProxyModel table;
+        table.setSourceModel(&source);
+        table.sort(0, Qt::AscendingOrder);
+        QCOMPARE(table.rowCount(), 4);
+        QCOMPARE(table.index(2, 0).data(), table.index(3, 0).data());
+        searched.begin();
+        const auto next = [&] {
+            return searched.model.find(QStringLiteral("def"), RegModel::FindValues, Qt::MatchContains).value_row;
+        };
+        for (int hit = 0; hit < hits_before; hit++)
+            QCOMPARE(next(), hit);
+        if (change == QStringLiteral("+"))
+            QVERIFY(table.add_value(4) && table.setData(table.index(4, 0), QStringLiteral("aaa"), Qt::EditRole));
+        else
+            QVERIFY(table.removeRows(change.toInt(), 1));
+        QStringList found;
+        for (int row = next(); row >= 0; row = next())
+            found.append(QString::number(row));
+        QCOMPARE(found.join(QLatin1Char(',')), rest);
+    }
+
+    void a_change_after_the_hit_on_the_key_leaves_all_its_values() {
+        Values values;
+        const auto next = [&] {
+            return Searched::text_of(
+                values.searched.model.find(QString(), RegModel::FindKeys | RegModel::FindValues, Qt::MatchContains));
+        };
+        for (QString hit = next(); hit != QStringLiteral("TOP/HIVE/Key"); hit = next())
+            QVERIFY(!hit.isEmpty());
+        QVERIFY(values.change(QStringLiteral("-foo 2")));
+        for (int row = 0; row < 5; row++)
+            QCOMPARE(next(), QStringLiteral("TOP/HIVE/Key : %1").arg(row));
+        QCOMPARE(next(), QStringLiteral("TOP/HIVE/Later"));
+    }
+
     void the_default_row_is_visited_once_whether_it_is_set_or_not() {
         Values values;
         RegModel& model = values.searched.model;

@@ -12,6 +12,9 @@
 #include <QTest>
 
 #include <algorithm>
+#include <random>
+#include <utility>
+#include <vector>
 
 namespace {
 
@@ -60,6 +63,72 @@ void expect_below(const testkit::Key& key, const QString& path, int depth, const
     }
     for (const testkit::Key& child : key.children)
         expect_below(child, path + QLatin1Char('/') + QString::fromStdU16String(child.name), depth + 1, term, hits);
+}
+
+// The walk without anything done ahead or kept between two hits: each place of the search asks the model and a table
+// of its own for what is there.
+class LiteralWalk {
+public:
+    explicit LiteralWalk(const RegModel& model) : model_(model) { places_.push_back({model.index(0, 0), -1}); }
+
+    // As Searched tells a hit; nothing at the end.
+    QString next(const QString& term, RegModel::FindMode mode) {
+        while (!places_.empty()) {
+            const auto [key, row] = places_.back();
+            places_.pop_back();
+            const bool in_key = row < 0 && mode.testFlag(RegModel::FindKeys);
+            if (row < 0)
+                push_all(key, mode.testFlag(RegModel::FindValues));
+            if ((in_key && matches(key.data(), term)) || (row >= 0 && matches(shown_name(key, row), term)))
+                return Searched::text_of({key, row});
+        }
+        return QString();
+    }
+
+private:
+    static bool matches(const QVariant& name, const QString& term) {
+        return name.toString().contains(term, Qt::CaseInsensitive);
+    }
+
+    static QVariant shown_name(const QModelIndex& key, int row) {
+        ValuesModel source(RegModel::editable_key(key));
+        ValuesProxyModel table;
+        table.setSourceModel(&source);
+        table.sort(0, Qt::AscendingOrder);
+        return table.index(row, 0).data();
+    }
+
+    void push_all(const QModelIndex& key, bool with_values) {
+        for (const QModelIndex& next : {model_.index(key.row() + 1, 0, key.parent()), model_.index(0, 0, key)}) {
+            if (next.isValid())
+                places_.push_back({next, -1});
+        }
+        RegKey* const shown = with_values ? RegModel::editable_key(key) : nullptr;
+        if (shown == nullptr)
+            return;
+        for (int row = shown->value_count() - (shown->has_default_value() ? 1 : 0); row >= 0; row--)
+            places_.push_back({key, row});
+    }
+
+    const RegModel& model_;
+    std::vector<std::pair<QModelIndex, int>> places_;
+};
+
+// Keys of up to three subkeys and six values, some of them with a value named like the unnamed one is shown.
+void grow(testkit::KeyLayout& key, int depth, std::mt19937& random) {
+    const auto below = [&](unsigned end) { return static_cast<unsigned>(random() % end); };
+    for (char letter = 'a'; letter < static_cast<char>('a' + static_cast<char>(below(4))); letter++) {
+        testkit::KeyLayout& child = key.add(std::string(1, letter) + "n");
+        const unsigned values = below(6);
+        for (unsigned i = 0; i < values; i++) {
+            const std::string name = std::string(1, static_cast<char>('a' + below(26))) + std::to_string(i) + "n";
+            child.set(i == 0 && below(2) == 0 ? std::string() : name, 4, testkit::pattern(4));
+        }
+        if (below(3) == 0)
+            child.set("(Default)", 4, testkit::pattern(4));
+        if (depth < 3)
+            grow(child, depth + 1, random);
+    }
 }
 
 }  // namespace
@@ -218,6 +287,59 @@ private slots:
         while (row < table.rowCount() && table.index(row, 0).data().toString() != QStringLiteral("zed"))
             row++;
         QCOMPARE(hits, QStringList{QStringLiteral("TOP/HIVE/Key : %1").arg(row)});
+    }
+
+    // The values are looked at again at every hit: those of one name must not be taken for each other.
+    void rows_of_one_name_are_found_once_each() {
+        for (const bool is_set : {false, true}) {
+            testkit::HiveLayout hive;
+            testkit::KeyLayout& key = hive.root.add("Key");
+            key.set("(Default)", 4, testkit::pattern(4));
+            if (is_set)
+                key.set("", 4, testkit::pattern(4));
+            QCOMPARE(Searched(hive).all(QStringLiteral("(Default)"), RegModel::FindValues),
+                     list({"TOP/HIVE/Key : 0", "TOP/HIVE/Key : 1"}));
+        }
+    }
+
+    void values_without_a_readable_name_are_found_once_each() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        for (const char* name : {"a", "b", "c", "d"})
+            key.set(name, 4, testkit::pattern(4));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        for (size_t value = 0; value < 3; value++)
+            laid.put16(laid.at("Key").values[value].record, 0, 0x7878);
+        QCOMPARE(
+            Searched(laid.bytes).all(QString(), RegModel::FindValues),
+            list({"TOP/HIVE/Key : 0", "TOP/HIVE/Key : 1", "TOP/HIVE/Key : 2", "TOP/HIVE/Key : 3", "TOP/HIVE/Key : 4"}));
+    }
+
+    void the_hits_are_those_of_a_literal_walk_data() {
+        QTest::addColumn<uint>("seed");
+        for (uint seed = 1; seed <= 25; seed++)
+            QTest::addRow("seed %u", seed) << seed;
+    }
+
+    void the_hits_are_those_of_a_literal_walk() {
+        QFETCH(uint, seed);
+        std::mt19937 random(seed);
+        testkit::HiveLayout hive;
+        grow(hive.root, 0, random);
+        Searched searched(hive);
+        for (const RegModel::FindMode mode :
+             {RegModel::FindMode(), RegModel::FindMode(RegModel::FindKeys), RegModel::FindMode(RegModel::FindValues),
+              RegModel::FindKeys | RegModel::FindValues}) {
+            for (const char* letters : {"", "n", "def", "a"}) {
+                const QString term = QLatin1String(letters);
+                LiteralWalk walk(searched.model);
+                searched.begin();
+                for (QString expected = QStringLiteral("-"); !expected.isEmpty();) {
+                    expected = walk.next(term, mode);
+                    QCOMPARE(Searched::text_of(searched.model.find(term, mode, Qt::MatchContains)), expected);
+                }
+            }
+        }
     }
 
     void a_real_hive_gives_every_name_once_and_in_order() {
