@@ -30,6 +30,23 @@ testkit::HiveLayout tree() {
     return hive;
 }
 
+// Below "Top" six keys, and in the last of them two values.
+testkit::HiveLayout hits() {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout& top = hive.root.add("Top");
+    for (int i = 1; i <= 6; i++)
+        top.add("hit " + std::to_string(i));
+    for (const char* name : {"hit a", "hit b"})
+        top.children.back().set(name, 4, testkit::pattern(4));
+    return hive;
+}
+
+// The hits below "Top" by their names.
+QString names(QStringList found) {
+    found.replaceInStrings(QStringLiteral("TOP/HIVE/Top/"), QString());
+    return found.join(QLatin1Char(','));
+}
+
 const AbstractRegKey* key_of(const QModelIndex& index) {
     return static_cast<const AbstractRegKey*>(index.internalPointer());
 }
@@ -161,19 +178,13 @@ private slots:
         QFETCH(QString, renamed);
         QFETCH(QString, name);
         QFETCH(QString, rest);
-        testkit::HiveLayout hive;
-        testkit::KeyLayout& top = hive.root.add("Top");
-        for (int i = 1; i <= 6; i++)
-            top.add("hit " + std::to_string(i));
-        Searched searched(hive);
+        Searched searched(hits());
         searched.begin();
         for (int i = 0; i < hits_before; i++)
             QVERIFY(searched.model.find(QStringLiteral("hit"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
         if (!renamed.isEmpty())
             QVERIFY(searched.model.setData(searched.at(QStringLiteral("Top/") + renamed), name, Qt::EditRole));
-        QStringList found = searched.rest(QStringLiteral("hit"), RegModel::FindKeys);
-        found.replaceInStrings(QStringLiteral("TOP/HIVE/Top/"), QString());
-        QCOMPARE(found.join(QLatin1Char(',')), rest);
+        QCOMPARE(names(searched.rest(QStringLiteral("hit"), RegModel::FindKeys)), rest);
     }
 
     // At every moment of a walk, every key that can be renamed, to every place among its siblings.
@@ -249,6 +260,79 @@ private slots:
         QVERIFY2(visit.wrong().isEmpty(), qPrintable(visit.wrong()));
         for (const auto& [key, times] : visit.times)
             QCOMPARE(times, 1);
+    }
+
+    void a_search_begun_anew_comes_to_a_key_renamed_amid_the_last_one() {
+        Searched searched(hits());
+        searched.begin();
+        for (int i = 0; i < 3; i++)
+            QVERIFY(searched.model.find(QStringLiteral("hit"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
+        QVERIFY(
+            searched.model.setData(searched.at(QStringLiteral("Top/hit 1")), QStringLiteral("zz hit"), Qt::EditRole));
+        QCOMPARE(names(searched.all(QStringLiteral("hit"), RegModel::FindKeys)),
+                 QStringLiteral("hit 2,hit 3,hit 4,hit 5,hit 6,zz hit"));
+    }
+
+    // The memory of deleted keys that the search would have passed over becomes that of new ones.
+    void new_keys_are_visited_after_passed_over_ones_are_deleted() {
+        Searched searched(hits());
+        RegModel& model = searched.model;
+        searched.begin();
+        for (int i = 0; i < 3; i++)
+            QVERIFY(model.find(QStringLiteral("hit"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
+        for (const char* old : {"hit 1", "hit 2", "hit 3"}) {
+            const QModelIndex key = searched.at(QStringLiteral("Top/") + QLatin1String(old));
+            QVERIFY(model.setData(key, QStringLiteral("zz ") + QLatin1String(old), Qt::EditRole));
+        }
+        const QModelIndex top = searched.at(QStringLiteral("Top"));
+        QCOMPARE(model.rowCount(top), 6);
+        for (int i = 0; i < 3; i++)
+            QVERIFY(model.removeRows(3, 1, top));
+        constexpr int new_keys = 50;
+        for (int i = 0; i < new_keys; i++)
+            QVERIFY(model.new_key(top) >= 0);
+        QCOMPARE(searched.rest(QString(), RegModel::FindKeys).size(), 3 + new_keys);
+    }
+
+    // A rename has taken the key away from those that are still to be visited; those around it were.
+    void a_deleted_key_with_a_place_of_its_own_leaves_it_to_no_other() {
+        Searched searched(hits());
+        searched.begin();
+        for (int i = 0; i < 3; i++)
+            QVERIFY(searched.model.find(QStringLiteral("hit"), RegModel::FindKeys, Qt::MatchContains).key.isValid());
+        QVERIFY(
+            searched.model.setData(searched.at(QStringLiteral("Top/hit 4")), QStringLiteral("a hit"), Qt::EditRole));
+        QVERIFY(searched.model.removeRows(0, 1, searched.at(QStringLiteral("Top"))));
+        QCOMPARE(names(searched.rest(QStringLiteral("hit"), RegModel::FindKeys)), QStringLiteral("hit 5,hit 6"));
+    }
+
+    void a_hit_after_renames_has_the_row_of_now() {
+        Searched searched(hits());
+        RegModel& model = searched.model;
+        searched.begin();
+        const auto next = [&](RegModel::FindModeFlag mode) {
+            return model.find(QStringLiteral("hit"), mode, Qt::MatchContains).key;
+        };
+        const auto rename = [&](const char* old, const char* name) {
+            const QModelIndex key = searched.at(QStringLiteral("Top/") + QLatin1String(old));
+            return model.setData(key, QString::fromLatin1(name), Qt::EditRole);
+        };
+        for (int i = 0; i < 3; i++)
+            QVERIFY(next(RegModel::FindKeys).isValid());
+        QVERIFY(rename("hit 4", "a hit"));
+        QVERIFY(rename("hit 1", "0 hit"));
+        const QModelIndex alone = next(RegModel::FindKeys);
+        QCOMPARE(alone.data().toString(), QStringLiteral("a hit"));
+        QCOMPARE(alone.row(), 1);
+        // Now with values of a key still to come.
+        searched.begin();
+        const QModelIndex found = next(RegModel::FindValues);
+        QCOMPARE(found.data().toString(), QStringLiteral("hit 6"));
+        QCOMPARE(found.row(), 5);
+        QVERIFY(rename("0 hit", "zz hit"));
+        const QModelIndex again = next(RegModel::FindValues);
+        QCOMPARE(again.data().toString(), QStringLiteral("hit 6"));
+        QCOMPARE(again.row(), 4);
     }
 
     void a_new_key_is_visited_where_the_search_still_comes() {
