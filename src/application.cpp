@@ -3,12 +3,14 @@
 #include "application.h"
 
 #include "failure_report.h"
+#include "keys_view.h"
 
 #include <QDebug>
 #include <QFile>
 #include <QIcon>
 #include <QLibraryInfo>
 #include <QLocale>
+#include <QMouseEvent>
 #include <QTranslator>
 
 #include <cstdio>
@@ -61,6 +63,14 @@ bool Application::notify(QObject* receiver, QEvent* event) {
     // Asked first: afterwards the receiver may be gone.
     const bool is_gesture = receiver->isWidgetType() || event->type() == QEvent::Shortcut;
     try {
+        // Here, since the toolkit moves the keyboard, which ends a naming, before any filter sees the press.
+        if (event->type() == QEvent::MouseButtonPress && receiver->isWidgetType()) {
+            auto* keys = qobject_cast<KeysView*>(receiver->parent());
+            const QPoint point = static_cast<QMouseEvent*>(event)->position().toPoint();
+            if (keys && receiver == keys->viewport() && keys->take_press_from_naming(point)) {
+                return true;
+            }
+        }
         return QApplication::notify(receiver, event);
     } catch (const std::exception& failure) {
         FailureReport::instance().report_at_current(failure, is_gesture);

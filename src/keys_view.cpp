@@ -16,6 +16,7 @@
 #include <QMouseEvent>
 
 #include <deque>
+#include <utility>
 
 KeysView::KeysView(QWidget* parent) : QTreeView(parent) {
     setContextMenuPolicy(Qt::CustomContextMenu);
@@ -56,7 +57,7 @@ QModelIndex KeysView::in_place(const QModelIndex& key) {
 
 void KeysView::show_keys_context_menu(QPoint point) {
     const QModelIndex index = indexAt(point);
-    if (!index.isValid() || index.column() != 0) {
+    if (std::exchange(m_menu_is_stale, false) || !index.isValid() || index.column() != 0) {
         return;
     }
     const SharedActions& actions = shared_actions();
@@ -205,14 +206,42 @@ void KeysView::expand_below(const QModelIndex& top) {
     }
 }
 
+// The keys that open and close branches go no further: the tree's own expansion knows no end, and to its type-ahead
+// they are letters, which select a key that begins with one.
 void KeysView::keyPressEvent(QKeyEvent* event) {
-    if (event->key() != Qt::Key_Asterisk) {
+    switch (event->key()) {
+    case Qt::Key_Asterisk:
+        expand_below(currentIndex());
+        break;
+    case Qt::Key_Plus:
+        expand(currentIndex());
+        break;
+    case Qt::Key_Minus:
+        collapse(currentIndex());
+        break;
+    default:
         QTreeView::keyPressEvent(event);
         return;
     }
-    expand_below(currentIndex());
-    // Past the tree's own expansion, which knows no end.
-    QAbstractItemView::keyPressEvent(event);  // NOLINT(bugprone-parent-virtual-call)
+    event->accept();
+}
+
+bool KeysView::take_press_from_naming(QPoint point) {
+    m_menu_is_stale = false;
+    if (state() != QAbstractItemView::EditingState) {
+        return false;
+    }
+    const QPersistentModelIndex pressed = indexAt(point);
+    finish_editing(*this);
+    if (indexAt(point) == pressed) {
+        return false;
+    }
+    setFocus();
+    if (pressed.isValid()) {
+        setCurrentIndex(pressed);
+    }
+    m_menu_is_stale = true;
+    return true;
 }
 
 void KeysView::mousePressEvent(QMouseEvent* event) {
@@ -222,7 +251,11 @@ void KeysView::mousePressEvent(QMouseEvent* event) {
         // The context menu's actions are about the current key, so it must be the one that was clicked, also where that
         // was on its branch.
         if (event->button() == Qt::RightButton) {
+            // Without scrolling a row that is cut off into sight: the pointer would stand on another one then.
+            const bool scrolls = hasAutoScroll();
+            setAutoScroll(false);
             setCurrentIndex(index);
+            setAutoScroll(scrolls);
         }
         FailureReport::instance().set_current_key(key_path_of(index));
     }

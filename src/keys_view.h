@@ -18,6 +18,10 @@ public:
     // The index of the same key at the row where the key stands now.
     static QModelIndex in_place(const QModelIndex& key);
 
+    // Asked before a press of the mouse takes the keyboard from the editor of a name. Ends the naming; where that moves
+    // the rows, the key that was pressed becomes current, and true says that the press has done its work.
+    bool take_press_from_naming(QPoint point);
+
     // Moves to the next shown key whose name begins with what is being typed; passes over those without a name.
     void keyboardSearch(const QString& typed) override;
 
@@ -38,6 +42,8 @@ private:
     bool select_if_named(const QModelIndex& key, const QString& beginning);
     void tell_refused(const QString& text);
 
+    // The press that asks for the next context menu was meant for a row that has moved away.
+    bool m_menu_is_stale = false;
     QString m_typed;
     QElapsedTimer m_since_typed;
 };

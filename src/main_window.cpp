@@ -12,6 +12,7 @@
 
 #include <QAction>
 #include <QActionGroup>
+#include <QApplication>
 #include <QCoreApplication>
 #include <QEvent>
 #include <QHeaderView>
@@ -123,6 +124,14 @@ void MainWindow::make_menus() {
     QAction* refresh_action = view_menu->addAction(tr("Refresh", "menu item"));
     refresh_action->setShortcut(QKeySequence::Refresh);
     connect(refresh_action, &QAction::triggered, this, &MainWindow::refresh_views);
+    // A key that is clicked again does not become current again, though the actions may be a value's meanwhile.
+    connect(qApp, &QApplication::focusChanged, this, [this](QWidget* /*old*/, const QWidget* now) {
+        if (now == keys_tree) {
+            set_key_actions(keys_tree->currentIndex());
+        } else if (now == values_table) {
+            value_selected(values_table->currentIndex());
+        }
+    });
 }
 
 void MainWindow::set_model(RegModel* model) {
@@ -133,6 +142,10 @@ void MainWindow::set_model(RegModel* model) {
         return;
     }
     connect(model, &QAbstractItemModel::layoutChanged, this, qOverload<>(&MainWindow::update_statusbar));
+    // A key that got another name can be far from where it stood. Once its index has followed it.
+    connect(
+        model, &QAbstractItemModel::layoutChanged, keys_tree,
+        [this] { keys_tree->scrollTo(keys_tree->currentIndex()); }, Qt::QueuedConnection);
     connect(model, &QAbstractItemModel::dataChanged, this,
             [this](const QModelIndex& top_left, const QModelIndex& bottom_right) {
                 update_statusbar(top_left, bottom_right);
@@ -222,7 +235,12 @@ void MainWindow::refresh_views() {
     if (!may_change_rows(*this)) {
         return;
     }
+    // The proxy leaves the current index at its row; the user's next key is meant for the value, not for its place.
+    const QModelIndex current = values_proxy->mapToSource(values_table->currentIndex());
     values_proxy->sort(0, Qt::AscendingOrder);
+    if (current.isValid()) {
+        values_table->setCurrentIndex(values_proxy->mapFromSource(current));
+    }
 }
 
 void MainWindow::closeEvent(QCloseEvent* event) {

@@ -130,4 +130,6 @@ void MainWindow::show_hit(const RegModel::FindResult& hit) {
         values_proxy->sort(0, Qt::AscendingOrder);
         values_table->setCurrentIndex(values_proxy->index(hit.value_row, 0));
     }
+    // What is pressed next is about the hit.
+    (hit.value_row >= 0 ? static_cast<QWidget*>(values_table) : keys_tree)->setFocus();
 }

@@ -11,6 +11,8 @@
 
 #include <QAction>
 #include <QActionGroup>
+#include <QApplication>
+#include <QClipboard>
 #include <QCoreApplication>
 #include <QHeaderView>
 #include <QHelpEvent>
@@ -140,6 +142,14 @@ bool ValuesView::edit_qword(const QString& value_name, quint64 number, const QPe
 void ValuesView::keyPressEvent(QKeyEvent* event) {
     if (event->key() == Qt::Key_Return && state() != QAbstractItemView::EditingState) {
         value_double_clicked(currentIndex());
+    } else if (event->matches(QKeySequence::Copy) && currentIndex().isValid()) {
+        // As it is shown: the toolkit would take bytes for text, and a list of strings for nothing.
+        const QVariant datum = currentIndex().data(Qt::DisplayRole);
+        QApplication::clipboard()->setText(
+            datum.typeId() == QMetaType::QString
+                ? datum.toString()
+                : static_cast<QStyledItemDelegate*>(itemDelegate())->displayText(datum, locale()));
+        event->accept();
     } else {
         QTableView::keyPressEvent(event);
     }

@@ -147,7 +147,7 @@ private slots:
     void a_refused_name_is_told_before_the_search();
     void find_asks_after_the_name_is_stored();
     void refresh_names_the_value_before_it_sorts();
-    void refresh_leaves_the_current_row_where_it_is();
+    void refresh_keeps_the_value_current();
     void find_next_names_the_value_before_it_sorts();
     void a_second_new_value_leaves_the_first_its_name();
     void a_new_key_leaves_the_value_its_name();
@@ -245,15 +245,17 @@ void OpenEditorTest::refresh_names_the_value_before_it_sorts() {
     QVERIFY(stage.values->hasFocus());
 }
 
-void OpenEditorTest::refresh_leaves_the_current_row_where_it_is() {
+void OpenEditorTest::refresh_keeps_the_value_current() {
     const Scene scene;
     Stage stage(scene);
     name_a_new_value(stage, QStringLiteral("aaa"));
-    const int row = stage.values->currentIndex().row();
     QTest::keyClick(editor_in(*stage.values), Qt::Key_F5);
-    // A refresh sorts and does nothing else: the row is another value's now, as the table shows.
-    QCOMPARE(stage.values->currentIndex().row(), row);
-    QVERIFY(stage.value(QStringLiteral("aaa")).row() != row);
+    QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("aaa")));
+    DialogHand hand;
+    hand.then_press(QMessageBox::Yes);
+    QTest::keyClick(stage.values, Qt::Key_Delete);
+    QVERIFY(hand.is_done());
+    QCOMPARE(values_in_file(scene, "Alpha"), alpha_s_values);
 }
 
 void OpenEditorTest::find_next_names_the_value_before_it_sorts() {

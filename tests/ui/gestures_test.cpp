@@ -1,0 +1,165 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+
+// What the hand and the eye take for one thing stays one: the row under the pointer, the row that is highlighted, the
+// text that is shown.
+#include "shared_actions.h"
+#include "stage.h"
+#include "ui_test.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QClipboard>
+#include <QLineEdit>
+#include <QScrollBar>
+#include <QStyledItemDelegate>
+#include <QTest>
+
+namespace {
+
+const QString alpha = QStringLiteral("MACHINE\\SYSTEM\\Alpha");
+
+testkit::HiveLayout many_keys() {
+    testkit::HiveLayout layout;
+    testkit::KeyLayout& services = layout.root.add("Services");
+    for (const char* name : {"Beep", "Dhcp", "Disk", "EventLog", "Ntfs", "cdrom"})
+        services.add(name).add("Parameters");
+    services.add("*").set("v", 4, testkit::pattern(4));
+    services.add("-x");
+    for (int i = 10; i < 60; i++)
+        services.add("k" + std::to_string(i));
+    return layout;
+}
+
+const QString services = QStringLiteral("MACHINE\\SYSTEM\\Services");
+
+QString below(const char* name) { return services + QLatin1Char('\\') + QLatin1String(name); }
+
+}  // namespace
+
+class GesturesTest : public QObject {
+    Q_OBJECT
+
+private slots:
+    // A tree that scrolls while the button goes down has another row under the pointer than the one that was pressed.
+    void a_right_press_on_a_row_that_is_cut_off_is_about_that_row() {
+        const Scene scene(many_keys());
+        Stage stage(scene);
+        stage.keys->expand(stage.key(services));
+        stage.select_key(services);
+        stage.keys->verticalScrollBar()->setValue(0);
+        const int row_height = stage.keys->visualRect(stage.key(services)).height();
+        // The window ends in the midst of a row.
+        int missing = 0;
+        QModelIndex cut;
+        for (int height = stage.window.height(); missing == 0; height -= row_height / 3) {
+            stage.window.resize(stage.window.width(), height);
+            QCoreApplication::processEvents();
+            const int bottom = stage.keys->viewport()->height() - 2;
+            cut = stage.keys->indexAt(QPoint(60, bottom));
+            QVERIFY(cut.isValid());
+            missing = stage.keys->visualRect(cut).bottom() > bottom + 2 ? 1 : 0;
+        }
+        const QPoint pressed(stage.keys->visualRect(cut).left() + 20, stage.keys->viewport()->height() - 2);
+        QCOMPARE(stage.keys->indexAt(pressed), cut);
+        QTest::mousePress(stage.keys->viewport(), Qt::RightButton, {}, pressed);
+        QCOMPARE(stage.keys->currentIndex(), cut);
+        QCOMPARE(stage.keys->indexAt(pressed), cut);
+    }
+
+    // The naming ends before the press, and the rows that it moves are not what was pressed.
+    void a_press_that_ends_a_naming_is_about_the_key_that_stood_there() {
+        const Scene scene(many_keys());
+        Stage stage(scene);
+        stage.keys->expand(stage.key(services));
+        stage.select_key(below("cdrom"));
+        stage.keys->setFocus();
+        shared_actions().rename_action->trigger();
+        auto* editor = stage.keys->viewport()->findChild<QLineEdit*>();
+        QVERIFY(editor);
+        editor->setText(QStringLiteral("Zzz"));
+        const QModelIndex meant = stage.key(below("EventLog"));
+        const QPoint point = stage.keys->visualRect(meant).center();
+        QVERIFY(stage.keys->take_press_from_naming(point));
+        QCOMPARE(stage.status(), below("EventLog"));
+        QVERIFY(stage.keys->indexAt(point) != stage.keys->currentIndex());
+        QVERIFY(stage.key(below("Zzz")).isValid());
+        // The menu that comes with the press would stand over another key.
+        QVERIFY(!with_context_menu(*stage.keys, point, [](QMenu&) {}));
+        QVERIFY(with_context_menu(*stage.keys, point, [](QMenu&) {}));
+    }
+
+    void a_press_beside_a_naming_that_moves_nothing_goes_on() {
+        const Scene scene(many_keys());
+        Stage stage(scene);
+        stage.keys->expand(stage.key(services));
+        const QPoint point = stage.keys->visualRect(stage.key(below("Beep"))).center();
+        QVERIFY(!stage.keys->take_press_from_naming(point));
+        stage.select_key(below("cdrom"));
+        stage.keys->setFocus();
+        shared_actions().rename_action->trigger();
+        QVERIFY(!stage.keys->take_press_from_naming(point));
+        QVERIFY(!stage.keys->viewport()->findChild<QLineEdit*>() ||
+                stage.keys->viewport()->findChild<QLineEdit*>()->isHidden());
+    }
+
+    void the_keys_that_open_and_close_branches_select_none() {
+        const Scene scene(many_keys());
+        Stage stage(scene);
+        stage.keys->expand(stage.key(services));
+        stage.select_key(below("Beep"));
+        for (const Qt::Key key : {Qt::Key_Asterisk, Qt::Key_Minus, Qt::Key_Plus}) {
+            QTest::keyClick(stage.keys, key);
+            QCOMPARE(stage.status(), below("Beep"));
+            QCOMPARE(stage.keys->isExpanded(stage.key(below("Beep"))), key != Qt::Key_Minus);
+        }
+    }
+
+    void what_is_copied_is_what_is_shown() {
+        const Scene scene;
+        Stage stage(scene);
+        stage.select_key(alpha);
+        for (int row = 0; row < stage.values->model()->rowCount(); row++) {
+            for (int column = 0; column < 3; column++) {
+                stage.values->setCurrentIndex(stage.values->model()->index(row, column));
+                QApplication::clipboard()->setText(QStringLiteral("before"));
+                QTest::keyClick(stage.values, Qt::Key_C, Qt::ControlModifier);
+                const QVariant datum = stage.values->currentIndex().data();
+                auto* delegate = qobject_cast<QStyledItemDelegate*>(stage.values->itemDelegate());
+                QCOMPARE(QApplication::clipboard()->text(), delegate->displayText(datum, QLocale()));
+            }
+        }
+    }
+
+    void a_key_that_is_clicked_again_has_its_actions_back() {
+        const Scene scene;
+        Stage stage(scene);
+        stage.select_key(alpha + QStringLiteral("\\Leaf"));
+        stage.values->setFocus();
+        stage.values->setCurrentIndex(stage.value(QStringLiteral("(Default)")));
+        QVERIFY(!shared_actions().rename_action->isEnabled());
+        QTest::mouseClick(stage.keys->viewport(), Qt::LeftButton, {},
+                          stage.keys->visualRect(stage.keys->currentIndex()).center());
+        stage.keys->setFocus();
+        QVERIFY(shared_actions().rename_action->isEnabled());
+        stage.values->setFocus();
+        QVERIFY(!shared_actions().rename_action->isEnabled());
+    }
+
+    void a_key_that_got_another_name_stays_in_sight() {
+        const Scene scene(many_keys());
+        Stage stage(scene);
+        stage.keys->expand(stage.key(services));
+        stage.select_key(below("k59"));
+        stage.keys->setFocus();
+        shared_actions().rename_action->trigger();
+        stage.keys->viewport()->findChild<QLineEdit*>()->setText(QStringLiteral("A first one"));
+        QTest::keyClick(stage.keys->viewport()->findChild<QLineEdit*>(), Qt::Key_Return);
+        QTRY_COMPARE(stage.status(), below("A first one"));
+        QTRY_VERIFY(
+            stage.keys->viewport()->rect().contains(stage.keys->visualRect(stage.keys->currentIndex()).center()));
+    }
+};
+
+QTEST_MAIN(GesturesTest)
+#include "gestures_test.moc"
