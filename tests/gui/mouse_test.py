@@ -109,6 +109,30 @@ def make_key(session):
     session.selected(MADE)
 
 
+def press_while_naming(session):
+    """A press on another key ends the naming of one, which moves the rows, and is about the key that was pressed"""
+    program = session.program
+    siblings = program.child_names(session.tree, session.root + CONTROL)
+    pressed = CONTROL + [siblings[siblings.index(MADE[-1]) + 1]]
+    last = CONTROL + ["zz last"]
+    for button in (1, 3):
+        session.click_key(MADE)
+        where = place(session.cell(pressed))
+        program.keys("F2")
+        editor = program.editor()
+        program.keys("ctrl+a")
+        program.type(last[-1])
+        until(lambda: text_of(editor) == last[-1], "the name in the editor")
+        program.click((where[0] + 10, where[1] + where[3] // 2), button)
+        session.key_renamed("a press elsewhere", MADE, last[-1])
+        session.selected(pressed)
+        session.click_key(last)
+        program.keys("F2")
+        session.fill_editor(MADE[-1])
+        session.key_renamed("the name of before", last, MADE[-1])
+        session.selected(MADE)
+
+
 def make_values(session):
     """A value of each kind, made by menu and by context menu, named and edited"""
     program = session.program
@@ -321,6 +345,7 @@ def whole_session(scratch):
             look_around,
             action_states,
             make_key,
+            press_while_naming,
             make_values,
             edit_values,
             number_bases,
