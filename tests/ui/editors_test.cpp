@@ -89,10 +89,6 @@ void set_text(const QWidget& dialog, const QString& text) {
     edit->insert(text);
 }
 
-void press(const QWidget& dialog, QDialogButtonBox::StandardButton button) {
-    QTest::mouseClick(dialog.findChild<QDialogButtonBox*>()->button(button), Qt::LeftButton);
-}
-
 QStringList lines(std::initializer_list<const char*> texts) {
     QStringList list;
     for (const char* text : texts) {

@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 #include "stage.h"
 
+#include "reg_key.h"
+
 #include <QFile>
 #include <QLabel>
 #include <QLineEdit>
@@ -160,6 +162,24 @@ void Stage::press_in_editor(const QString& text, Qt::Key key) const {
     editor->selectAll();
     QTest::keyClicks(editor, text);
     QTest::keyClick(editor, key);
+}
+
+std::unique_ptr<RegValue> stored(const Stage& stage, const QString& name) {
+    RegKey* key = RegModel::editable_key(stage.keys->currentIndex());
+    for (int i = 0; i < key->value_count(); ++i) {
+        auto value = key->read_value(i);
+        if (value && value->name == name) {
+            return value;
+        }
+    }
+    return nullptr;
+}
+
+void double_click(const Stage& stage, const QModelIndex& index) {
+    stage.values->scrollTo(index);
+    const QPoint point = stage.values->visualRect(index).center();
+    QTest::mouseClick(stage.values->viewport(), Qt::LeftButton, {}, point);
+    QTest::mouseDClick(stage.values->viewport(), Qt::LeftButton, {}, point);
 }
 
 QWidget* by_accessible_name(const QWidget& parent, const QString& name) {

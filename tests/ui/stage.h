@@ -8,6 +8,7 @@
 #include "keys_view.h"
 #include "main_window.h"
 #include "reg_model.h"
+#include "reg_value.h"
 #include "values_view.h"
 
 #include <QString>
@@ -72,6 +73,12 @@ public:
     KeysView* keys;
     ValuesView* values;
 };
+
+// A value of the current key as the stage's model holds it, by name; fresh from the hive.
+std::unique_ptr<RegValue> stored(const Stage& stage, const QString& name);
+
+// On a cell of the values table, wherever it is scrolled to.
+void double_click(const Stage& stage, const QModelIndex& index);
 
 // The widget below `parent` with this accessible name.
 QWidget* by_accessible_name(const QWidget& parent, const QString& name);

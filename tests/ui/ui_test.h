@@ -11,6 +11,7 @@
 #include <QAction>
 #include <QApplication>
 #include <QContextMenuEvent>
+#include <QDialogButtonBox>
 #include <QMenu>
 #include <QMessageBox>
 #include <QPointer>
@@ -94,6 +95,11 @@ private:
     QPointer<QWidget> m_answered;
     std::deque<std::pair<Step, bool>> m_steps;  // and whether it is for the search's dialog
 };
+
+// Clicks a button of a dialog that has a button box.
+inline void press(const QWidget& dialog, QDialogButtonBox::StandardButton button) {
+    QTest::mouseClick(dialog.findChild<QDialogButtonBox*>()->button(button), Qt::LeftButton);
+}
 
 // Opens the context menu of a view at a point of its viewport, hands it to `act` and closes it; false when no
 // menu came.
