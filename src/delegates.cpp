@@ -6,9 +6,9 @@
 
 #include <QCoreApplication>
 #include <QItemEditorFactory>
-#include <QMessageBox>
 #include <QMetaProperty>
 #include <QScopedValueRollback>
+#include <QTimer>
 
 #include <algorithm>
 #include <cstdio>
@@ -74,12 +74,34 @@ QString rendered(const QVariant& value, qsizetype limit) {
     return value.toString();
 }
 
-// Writes the editor's text back when it was changed; false when the model refused it.
-bool commit(const QStyledItemDelegate& delegate, const QWidget& editor, QAbstractItemModel& model,
-            const QModelIndex& index) {
+void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_shown(failure); }
+
+void report_key_failure(const QModelIndex& index, const std::exception& failure) {
+    FailureReport::instance().report(key_path_of(index), failure);
+}
+
+}  // namespace
+
+NameDelegate::NameDelegate(QWidget* main_window) : m_main_window(main_window) {}
+
+void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,
+                          const QString& refusal) const {
+    try {
+        if (!write_back(editor, model, index)) {
+            tell_later(refusal);
+        }
+    } catch (const std::exception& failure) {
+        // Told each time: the user has typed a name that is not there now.
+        const QString reason = QString::fromLocal8Bit(failure.what());
+        tell_later(FailureReport::instance().told_elsewhere(key_path_for(index), reason));
+    }
+}
+
+// False when the model refused the editor's text.
+bool NameDelegate::write_back(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index) const {
     QByteArray property = editor.metaObject()->userProperty().name();
     if (property.isEmpty()) {
-        const QItemEditorFactory* factory = delegate.itemEditorFactory();
+        const QItemEditorFactory* factory = itemEditorFactory();
         if (!factory) {
             factory = QItemEditorFactory::defaultFactory();
         }
@@ -93,39 +115,27 @@ bool commit(const QStyledItemDelegate& delegate, const QWidget& editor, QAbstrac
     return old_text == new_text || model.setData(index, new_text, Qt::EditRole);
 }
 
-void tell_refused(QWidget* main_window, const QString& text) {
-    QMessageBox::critical(main_window, QCoreApplication::applicationName(), text, QMessageBox::Ok);
+void NameDelegate::tell_later(const QString& text) const {
+    m_untold.append(text);
+    QTimer::singleShot(0, this, [this] { tell_refused_names(); });
 }
 
-// An exception must not pass the view, which would take the editor for one being committed from then on, and commit no
-// other. Told each time: the user has typed a name that is not there now.
-void tell_lost_name(QWidget* main_window, const QString& key_path, const std::exception& failure) {
-    const QString reason = QString::fromLocal8Bit(failure.what());
-    tell_failure(main_window, FailureReport::instance().told_elsewhere(key_path, reason));
+void NameDelegate::tell_refused_names() const {
+    while (!m_untold.isEmpty()) {
+        tell_failure(m_main_window, m_untold.takeFirst());
+    }
 }
-
-void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_shown(failure); }
-
-void report_key_failure(const QModelIndex& index, const std::exception& failure) {
-    FailureReport::instance().report(key_path_of(index), failure);
-}
-
-}  // namespace
-
-ValueDelegate::ValueDelegate(QWidget* main_window) : m_main_window(main_window) {}
 
 QString ValueDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
     return rendered(value, m_limit);
 }
 
 void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
-    try {
-        if (!commit(*this, *editor, *model, index)) {
-            tell_refused(m_main_window, tr("The specified value name already exists."));
-        }
-    } catch (const std::exception& failure) {
-        tell_lost_name(m_main_window, FailureReport::instance().shown_key(), failure);
-    }
+    commit(*editor, *model, index, tr("The specified value name already exists."));
+}
+
+QString ValueDelegate::key_path_for(const QModelIndex& /*index*/) const {
+    return FailureReport::instance().shown_key();
 }
 
 void ValueDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const {
@@ -156,17 +166,11 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
     }
 }
 
-KeyDelegate::KeyDelegate(QWidget* main_window) : m_main_window(main_window) {}
-
 void KeyDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
-    try {
-        if (!commit(*this, *editor, *model, index)) {
-            tell_refused(m_main_window, tr("The specified key name already exists."));
-        }
-    } catch (const std::exception& failure) {
-        tell_lost_name(m_main_window, key_path_of(index), failure);
-    }
+    commit(*editor, *model, index, tr("The specified key name already exists."));
 }
+
+QString KeyDelegate::key_path_for(const QModelIndex& index) const { return key_path_of(index); }
 
 void KeyDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const {
     try {

@@ -5,16 +5,47 @@
 // The delegates of the two views: they render value data, commit in-place renames, and let no exception of a
 // damaged key pass through a paint.
 
+#include <QStringList>
 #include <QStyledItemDelegate>
 
+#include <exception>
 #include <limits>
 
-class ValueDelegate : public QStyledItemDelegate {
+// What the two have in common: a name that was typed in place is written back when it was changed, and one that did
+// not come to be is told. Not while it is being committed: the view goes on with the editor afterwards, which a box's
+// event loop can outlive.
+class NameDelegate : public QStyledItemDelegate {
     Q_OBJECT
 
 public:
     // `main_window` is the parent of the message box and is not owned.
-    explicit ValueDelegate(QWidget* main_window);
+    explicit NameDelegate(QWidget* main_window);
+
+    // Tells each name that was refused and not told yet, and returns when the user has seen it. Comes from the event
+    // loop by itself.
+    void tell_refused_names() const;
+
+protected:
+    // An exception must not pass the view, which would take the editor for one being committed from then on, and
+    // commit no other.
+    void commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,
+                const QString& refusal) const;
+    // What is named when the name was lost to an exception.
+    virtual QString key_path_for(const QModelIndex& index) const = 0;
+
+private:
+    bool write_back(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index) const;
+    void tell_later(const QString& text) const;
+
+    QWidget* m_main_window;
+    mutable QStringList m_untold;
+};
+
+class ValueDelegate : public NameDelegate {
+    Q_OBJECT
+
+public:
+    using NameDelegate::NameDelegate;
 
     // The whole text of a datum, whatever its length; the locale is not used.
     QString displayText(const QVariant& value, const QLocale& locale) const override;
@@ -26,19 +57,18 @@ public:
 protected:
     // Lays out only as much of a long datum as a cell can show: painting a megabyte costs what a line costs.
     void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
+    QString key_path_for(const QModelIndex& index) const override;
 
 private:
-    QWidget* m_main_window;
     // How many characters displayText need give; fewer than all only while a cell is laid out.
     mutable qsizetype m_limit = std::numeric_limits<qsizetype>::max();
 };
 
-class KeyDelegate : public QStyledItemDelegate {
+class KeyDelegate : public NameDelegate {
     Q_OBJECT
 
 public:
-    // `main_window` is the parent of the message box and is not owned.
-    explicit KeyDelegate(QWidget* main_window);
+    using NameDelegate::NameDelegate;
 
     void setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const override;
 
@@ -47,7 +77,5 @@ public:
 
 protected:
     void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
-
-private:
-    QWidget* m_main_window;
+    QString key_path_for(const QModelIndex& index) const override;
 };

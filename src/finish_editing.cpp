@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 #include "finish_editing.h"
 
+#include "delegates.h"
+
 #include <QAbstractItemDelegate>
 #include <QAbstractItemView>
 #include <QApplication>
@@ -9,7 +11,7 @@
 
 namespace {
 
-void finish_editors_of(const QAbstractItemView& view) {
+void close_editors_of(const QAbstractItemView& view) {
     QAbstractItemDelegate* delegate = view.itemDelegate();
     // The views put nothing but editors into their viewports. One that is closed is hidden until it is deleted.
     for (QWidget* child : view.viewport()->findChildren<QWidget*>(QString(), Qt::FindDirectChildrenOnly)) {
@@ -25,14 +27,31 @@ void finish_editors_of(const QAbstractItemView& view) {
     }
 }
 
-}  // namespace
-
-void finish_editing(const QWidget& part) {
+QList<const QAbstractItemView*> views_in(const QWidget& part) {
+    QList<const QAbstractItemView*> views;
     if (const auto* view = qobject_cast<const QAbstractItemView*>(&part)) {
-        finish_editors_of(*view);
+        views.append(view);
     }
     for (const QAbstractItemView* view : part.findChildren<QAbstractItemView*>()) {
-        finish_editors_of(*view);
+        views.append(view);
+    }
+    return views;
+}
+
+}  // namespace
+
+void close_editors(const QWidget& part) {
+    for (const QAbstractItemView* view : views_in(part)) {
+        close_editors_of(*view);
+    }
+}
+
+void finish_editing(const QWidget& part) {
+    close_editors(part);
+    for (const QAbstractItemView* view : views_in(part)) {
+        if (const auto* names = qobject_cast<const NameDelegate*>(view->itemDelegate())) {
+            names->tell_refused_names();
+        }
     }
 }
 
@@ -41,5 +60,6 @@ bool may_change_rows(const QWidget& part) {
         return false;
     }
     finish_editing(*part.window());
-    return true;
+    // While a refused name was told, the user may have left the program or something may have opened another dialog.
+    return part.window()->isVisible() && !QApplication::activeModalWidget();
 }

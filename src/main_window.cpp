@@ -172,8 +172,9 @@ void MainWindow::update_statusbar(const QModelIndex& top_left, const QModelIndex
 }
 
 void MainWindow::reload_values(const QModelIndex& current) {
-    // The name being typed belongs to a value of the key that goes.
-    finish_editing(*values_table);
+    // The name being typed belongs to a value of the key that goes. A box now would hold up the change of keys, and
+    // let another come in between.
+    close_editors(*values_table);
     show_status(current);
     place_splitter();
     show_values_of(current);

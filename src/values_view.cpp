@@ -156,6 +156,10 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
 }
 
 void ValuesView::show_values_context_menu(QPoint point) {
+    // A refused name is told before the menu is in the way of the box.
+    if (!may_change_rows(*this)) {
+        return;
+    }
     const SharedActions& actions = shared_actions();
     const QModelIndex index = indexAt(point);
     QMenu menu;

@@ -21,6 +21,7 @@ namespace {
 
 const QString alpha = QStringLiteral("MACHINE\\SYSTEM\\Alpha");
 const QString beta = QStringLiteral("MACHINE\\SYSTEM\\Beta");
+const QString deep = QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Deep");
 const QString leaf = QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Leaf");
 
 QString joined(const QStringList& names) { return names.join(QLatin1Char(' ')); }
@@ -101,7 +102,7 @@ DialogHand::Step ask(const QString& term, bool values) {
         dialog->findChild<QLineEdit*>()->setText(term);
         find_by_text<QCheckBox>(*dialog, QStringLiteral("Find keys"))->setChecked(!values);
         find_by_text<QCheckBox>(*dialog, QStringLiteral("Find values"))->setChecked(values);
-        QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok), Qt::LeftButton);
+        press(*dialog, QDialogButtonBox::Ok);
     };
 }
 
@@ -135,6 +136,15 @@ void name_a_new_value(Stage& stage, const QString& name) {
     type_in(*stage.values, name);
 }
 
+// A value of Deep's, and in an editor another value's name for it.
+void type_a_refused_value_name(Stage& stage) {
+    stage.select_key(deep);
+    stage.return_to(*stage.values);
+    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    shared_actions().rename_action->trigger();
+    type_in(*stage.values, QStringLiteral("b"));
+}
+
 const QString alpha_s_values = QStringLiteral("bytes dword list Path qword reversed text unreadable");
 
 }  // namespace
@@ -158,6 +168,12 @@ private slots:
     void an_editor_without_the_keyboard_is_finished_too();
     void closing_the_window_stores_the_name();
     void closing_the_window_tells_a_refused_name();
+    void leaving_behind_a_refused_name_ends_the_command_data();
+    void leaving_behind_a_refused_name_ends_the_command();
+    void a_refused_name_is_told_when_its_editor_is_closed();
+    void a_key_chosen_behind_a_refused_name_is_the_one_that_shows();
+    void a_menu_comes_after_a_refused_name();
+    void the_end_of_the_program_stores_the_name();
     void a_rename_that_throws_leaves_the_views_able_to_rename();
     void commands_behind_a_dialog_do_nothing();
     void a_hit_is_selected_where_its_key_stands_now();
@@ -348,7 +364,7 @@ void OpenEditorTest::another_key_s_values_do_not_get_the_name() {
     const Scene scene;
     Stage stage(scene);
     name_a_new_value(stage, QStringLiteral("foo"));
-    // As a screen reader selects: the keyboard stays in the editor.
+    // By code, as a hit of a search is selected: the keyboard stays in the editor.
     stage.select_key(beta);
     QVERIFY(!editor_in(*stage.values));
     QCOMPARE(type_in_file(scene, "Alpha", "foo"), 1);
@@ -401,6 +417,113 @@ void OpenEditorTest::closing_the_window_tells_a_refused_name() {
     QVERIFY(hand.is_done());
     QVERIFY(was_visible);
     QVERIFY(!stage.window.isVisible());
+}
+
+void OpenEditorTest::leaving_behind_a_refused_name_ends_the_command_data() {
+    QTest::addColumn<QAction*>("action");
+    QTest::newRow("a new value") << shared_actions().new_string_action;
+    QTest::newRow("a new key") << shared_actions().new_key_action;
+}
+
+void OpenEditorTest::leaving_behind_a_refused_name_ends_the_command() {
+    QFETCH(QAction*, action);
+    const Scene scene;
+    Stage stage(scene);
+    type_a_refused_value_name(stage);
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    hand.then([&](QWidget* box) {
+        QVERIFY(stage.window.close());
+        QTest::keyClick(box, Qt::Key_Return);
+    });
+    action->trigger();
+    QVERIFY(hand.is_done());
+    QVERIFY(!stage.window.isVisible());
+    QVERIFY(!editor_in(*stage.keys));
+    QVERIFY(!editor_in(*stage.values));
+    QCOMPARE(scene.bytes(), before);
+}
+
+// The view goes on with an editor that it has committed, and the box's event loop may end it.
+void OpenEditorTest::a_refused_name_is_told_when_its_editor_is_closed() {
+    const Scene scene;
+    Stage stage(scene);
+    type_a_refused_value_name(stage);
+    QPointer<QWidget> editor = editor_in(*stage.values);
+    bool was_open = true;
+    DialogHand hand;
+    hand.then([&](QWidget* box) {
+        was_open = editor_in(*stage.values) != nullptr;
+        stage.select_key(beta);
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+        QTest::keyClick(box, Qt::Key_Return);
+    });
+    QTest::keyClick(editor, Qt::Key_Return);
+    QTRY_VERIFY(hand.is_done());
+    QVERIFY(!was_open);
+    QTRY_VERIFY(!QApplication::activeModalWidget());
+    QTRY_VERIFY(!editor);
+    QCOMPARE(stage.status(), beta);
+    // The views have got over it.
+    stage.select_key(deep);
+    stage.return_to(*stage.values);
+    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    shared_actions().rename_action->trigger();
+    stage.press_in_editor(QStringLiteral("zzz"), Qt::Key_Return);
+    QTRY_COMPARE(values_in_file(scene, "Alpha\\Deep"), QStringLiteral(" b zzz"));
+}
+
+void OpenEditorTest::a_key_chosen_behind_a_refused_name_is_the_one_that_shows() {
+    const Scene scene;
+    Stage stage(scene);
+    type_a_refused_value_name(stage);
+    DialogHand hand;
+    QStringList shown;
+    hand.then([&](QWidget* box) {
+        shown = stage.value_names();
+        QCOMPARE(qobject_cast<QMessageBox*>(box)->text(), QStringLiteral("The specified value name already exists."));
+        stage.select_key(alpha);
+        QTest::keyClick(box, Qt::Key_Return);
+    });
+    stage.select_key(beta);
+    QTRY_VERIFY(hand.is_done());
+    QTRY_VERIFY(!QApplication::activeModalWidget());
+    QCOMPARE(joined(shown), QStringLiteral("(Default)"));
+    QCOMPARE(stage.status(), alpha);
+    QCOMPARE(joined(stage.value_names()), QStringLiteral("(Default) ") + alpha_s_values);
+}
+
+void OpenEditorTest::a_menu_comes_after_a_refused_name() {
+    const Scene scene;
+    Stage stage(scene);
+    for (QAbstractItemView* view :
+         {static_cast<QAbstractItemView*>(stage.values), static_cast<QAbstractItemView*>(stage.keys)}) {
+        type_a_refused_value_name(stage);
+        bool is_menu_open = true;
+        DialogHand hand;
+        hand.then([&](QWidget* box) {
+            is_menu_open = QApplication::activePopupWidget() != nullptr;
+            QTest::keyClick(box, Qt::Key_Return);
+        });
+        const QPoint point = view->visualRect(view->currentIndex()).center();
+        QVERIFY(with_context_menu(*view, point, [&](QMenu&) { QVERIFY(hand.is_done()); }));
+        QVERIFY(!is_menu_open);
+    }
+}
+
+void OpenEditorTest::the_end_of_the_program_stores_the_name() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(leaf);
+    stage.return_to(*stage.keys);
+    shared_actions().rename_action->trigger();
+    type_in(*stage.keys, QStringLiteral("zzz"));
+    // Not by way of the window, which stays open.
+    QTimer::singleShot(0, qApp, [] { QCoreApplication::exit(0); });
+    QCOMPARE(QApplication::exec(), 0);
+    QVERIFY(stage.window.isVisible());
+    QVERIFY(!editor_in(*stage.keys));
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Deep Zeta zzz"));
 }
 
 void OpenEditorTest::a_rename_that_throws_leaves_the_views_able_to_rename() {
