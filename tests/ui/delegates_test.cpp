@@ -32,10 +32,14 @@ public:
     bool setData(const QModelIndex& index, const QVariant& value, int role) override {
         written.append(value);
         roles.append(role);
+        if (throws) {
+            throw std::runtime_error("as asked");
+        }
         return !refuses && QStandardItemModel::setData(index, value, role);
     }
 
     bool refuses = false;
+    bool throws = false;
     QVariantList written;
     QList<int> roles;
 };
@@ -98,6 +102,8 @@ private slots:
     void a_changed_name_is_written_under_the_edit_role();
     void a_refused_name_is_told_data();
     void a_refused_name_is_told();
+    void a_lost_name_is_told_with_its_key_data();
+    void a_lost_name_is_told_with_its_key();
     void an_editor_without_user_property_is_read_by_the_type_s();
     void a_damaged_cell_is_told_once_and_not_through_the_paint();
     void a_megabyte_paints_like_a_kilobyte_data();
@@ -204,6 +210,39 @@ void DelegatesTest::a_refused_name_is_told() {
     QCOMPARE(hand.parent, &window);
     QCOMPARE(hand.buttons, QMessageBox::StandardButtons(QMessageBox::Ok));
     QCOMPARE(model.data(model.index(0, 0), Qt::DisplayRole).toString(), QStringLiteral("name"));
+}
+
+void DelegatesTest::a_lost_name_is_told_with_its_key_data() {
+    QTest::addColumn<bool>("is_key");
+    QTest::addColumn<QString>("key");
+    QTest::newRow("value") << false << "TOP\\HIVE\\shown";
+    QTest::newRow("key") << true << "name";
+}
+
+void DelegatesTest::a_lost_name_is_told_with_its_key() {
+    QFETCH(bool, is_key);
+    QFETCH(QString, key);
+    FailureReport::instance().set_shown_key(QStringLiteral("TOP\\HIVE\\shown"));
+    QWidget window;
+    NotingModel model(QStringLiteral("name"));
+    model.throws = true;
+    QLineEdit editor(QStringLiteral("other"));
+    const KeyDelegate keys(&window);
+    const ValueDelegate values(&window);
+    const NameDelegate& delegate = is_key ? static_cast<const NameDelegate&>(keys) : values;
+    // Twice, unlike what is met while painting: each is a name that is not there now.
+    for (int i = 0; i < 2; ++i) {
+        delegate.setModelData(&editor, &model, model.index(0, 0));
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        delegate.tell_refused_names();
+        QVERIFY(hand.is_done());
+        QCOMPARE(hand.text, QStringLiteral("The key \"%1\" cannot be read: as asked").arg(key));
+        QCOMPARE(hand.parent, &window);
+        // What would have come from the event loop has been told.
+        QCoreApplication::processEvents();
+        QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    }
 }
 
 void DelegatesTest::an_editor_without_user_property_is_read_by_the_type_s() {

@@ -41,6 +41,7 @@ private slots:
     void a_new_key_needs_no_focus();
     void deletion_asks_data();
     void deletion_asks();
+    void what_is_deleted_was_asked_about();
     void closing_the_question_deletes_nothing();
     void a_branch_is_deleted_with_all_below();
     void a_refused_deletion_is_told_and_changes_nothing();
@@ -50,7 +51,10 @@ private slots:
     void actions_of_the_other_view_do_nothing_here();
     void typing_passes_over_a_key_without_a_name();
     void typing_from_a_closed_branch_ends();
+    void typing_goes_round_the_end();
+    void one_letter_again_and_again_goes_from_match_to_match();
     void an_asterisk_opens_all_below();
+    void an_asterisk_tells_what_it_cannot_open();
     void an_asterisk_on_a_hive_without_end_ends();
 };
 
@@ -185,6 +189,22 @@ void KeysViewTest::deletion_asks() {
     QVERIFY(stage.keys->currentIndex().isValid());
     QCOMPARE(stage.status(),
              answer == QMessageBox::Yes ? alpha + QStringLiteral("\\Zeta") : alpha + QStringLiteral("\\Leaf"));
+}
+
+void KeysViewTest::what_is_deleted_was_asked_about() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha + QStringLiteral("\\Leaf"));
+    stage.keys->setFocus();
+    DialogHand hand;
+    hand.then([&](QWidget* question) {
+        stage.select_key(alpha + QStringLiteral("\\Zeta"));
+        QTest::mouseClick(qobject_cast<QMessageBox*>(question)->button(QMessageBox::Yes), Qt::LeftButton);
+    });
+    shared_actions().delete_action->trigger();
+    QVERIFY(hand.is_done());
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Deep Zeta"));
+    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));
 }
 
 void KeysViewTest::closing_the_question_deletes_nothing() {
@@ -362,6 +382,33 @@ void KeysViewTest::typing_from_a_closed_branch_ends() {
     QApplication::setKeyboardInputInterval(interval);
 }
 
+void KeysViewTest::typing_goes_round_the_end() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.keys->expand(stage.key(alpha));
+    stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Beta"));
+    stage.return_to(*stage.keys);
+    QTest::keyClicks(stage.keys, QStringLiteral("de"));
+    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Deep"));
+}
+
+void KeysViewTest::one_letter_again_and_again_goes_from_match_to_match() {
+    testkit::HiveLayout hive;
+    for (const char* name : {"Bat", "Bee", "Bb"}) {
+        hive.root.add(name);
+    }
+    const Scene scene(hive);
+    Stage stage(scene);
+    const QString root = QStringLiteral("MACHINE\\SYSTEM");
+    stage.keys->expand(stage.key(root));
+    stage.select_key(root);
+    stage.return_to(*stage.keys);
+    for (const char* name : {"Bat", "Bb", "Bee", "Bat"}) {
+        stage.keys->keyboardSearch(QStringLiteral("b"));
+        QCOMPARE(stage.status(), root + QLatin1Char('\\') + QString::fromLatin1(name));
+    }
+}
+
 void KeysViewTest::an_asterisk_opens_all_below() {
     const Scene scene;
     Stage stage(scene);
@@ -373,6 +420,31 @@ void KeysViewTest::an_asterisk_opens_all_below() {
         QVERIFY2(stage.keys->isExpanded(stage.key(branch)), qPrintable(branch));
     }
     QVERIFY(stage.keys->visualRect(stage.key(alpha + QStringLiteral("\\Deep\\Deeper"))).isValid());
+}
+
+void KeysViewTest::an_asterisk_tells_what_it_cannot_open() {
+    // Far enough down that no paint meets the damaged key.
+    constexpr int sound_keys = 100;
+    testkit::HiveLayout hive;
+    for (int i = 0; i < sound_keys; ++i) {
+        hive.root.add("a" + std::to_string(1000 + i));
+    }
+    hive.root.add("damaged");
+    hive.root.add("last").add("below");
+    Scene scene(hive);
+    scene.damage_key("damaged");
+    Stage stage(scene);
+    const QString root = QStringLiteral("MACHINE\\SYSTEM");
+    stage.select_key(root);
+    stage.return_to(*stage.keys);
+    DialogHand hand;
+    hand.then_press(QMessageBox::Ok);
+    QTest::keyClick(stage.keys, Qt::Key_Asterisk);
+    QTRY_VERIFY(hand.is_done());
+    QVERIFY2(hand.text.startsWith(QStringLiteral("The key \"%1\\#%2\" cannot be read: ").arg(root).arg(sound_keys)),
+             qPrintable(hand.text));
+    QVERIFY(stage.keys->isExpanded(stage.key(root)));
+    QVERIFY(stage.keys->isExpanded(stage.model->index(sound_keys + 1, 0, stage.key(root))));
 }
 
 void KeysViewTest::an_asterisk_on_a_hive_without_end_ends() {

@@ -8,6 +8,7 @@
 
 #include <QDialogButtonBox>
 #include <QLineEdit>
+#include <QStandardItemModel>
 
 namespace {
 
@@ -15,14 +16,30 @@ const QString alpha = QStringLiteral("MACHINE\\SYSTEM\\Alpha");
 const QString deep = QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Deep");
 const QString beta = QStringLiteral("MACHINE\\SYSTEM\\Beta");
 
-// A key with a value under a name that 8 bits do not carry, and one of a type without a name.
+// Takes the row away, and then refuses to.
+class ReturningModel : public QStandardItemModel {
+public:
+    using QStandardItemModel::QStandardItemModel;
+    bool removeRows(int row, int /*count*/, const QModelIndex& /*parent*/) override {
+        insertRow(row, takeRow(row));
+        return false;
+    }
+};
+
+// A key with values under names that 8 bits do not carry, and one of a type without a name.
 testkit::HiveLayout odd_values() {
     testkit::HiveLayout hive;
     testkit::KeyLayout& key = hive.root.add("Key");
-    testkit::ValueLayout& wide = key.set("wide", 1, testkit::text_data("text"));
-    wide.name = u"\u65e5\u672c";
-    wide.wide_name = true;
+    const auto set_wide = [&key](const char16_t* name, uint32_t type, const testkit::Bytes& data) {
+        testkit::ValueLayout& wide = key.set("wide", type, data);
+        wide.name = name;
+        wide.wide_name = true;
+    };
+    set_wide(u"\u65e5\u672c", 1, testkit::text_data("text"));
     key.set("odd", 12, {1, 2});
+    set_wide(u"\u5217", 7, {'a', 0, 0, 0, 0, 0});
+    set_wide(u"\u6570", 4, {1, 0, 0, 0});
+    set_wide(u"\u5927", 11, {1, 0, 0, 0, 0, 0, 0, 0});
     return hive;
 }
 
@@ -39,6 +56,8 @@ private slots:
     void a_value_that_cannot_be_made_is_told();
     void deletion_asks_data();
     void deletion_asks();
+    void what_is_deleted_was_asked_about();
+    void nothing_is_deleted_for_a_value_that_has_gone();
     void deleting_the_default_value_leaves_it_unset();
     void a_rename_in_place();
     void a_rename_to_another_value_s_name_is_told();
@@ -48,6 +67,7 @@ private slots:
     void a_refused_creation_is_told_data();
     void a_refused_creation_is_told();
     void a_refused_deletion_is_told_and_keeps_the_row();
+    void a_deletion_refused_after_its_row_went_keeps_the_row();
     void the_first_value_beside_the_unset_default_can_be_renamed();
 };
 
@@ -131,6 +151,48 @@ void ValuesViewChangesTest::deletion_asks() {
     QVERIFY(shared_actions().rename_action->isEnabled());
     // The key itself is where it was.
     QCOMPARE(stage.keys->currentIndex(), stage.key(deep));
+}
+
+void ValuesViewChangesTest::what_is_deleted_was_asked_about() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(deep);
+    stage.values->setFocus();
+    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    DialogHand hand;
+    hand.then([&](QWidget* question) {
+        stage.values->setCurrentIndex(stage.value(QStringLiteral("b")));
+        QTest::mouseClick(qobject_cast<QMessageBox*>(question)->button(QMessageBox::Yes), Qt::LeftButton);
+    });
+    shared_actions().delete_action->trigger();
+    QVERIFY(hand.is_done());
+    QCOMPARE(stage.value_names().join(QLatin1Char(' ')), QStringLiteral("(Default) b"));
+    QVERIFY(stored(stage, QStringLiteral("b")));
+    QVERIFY(!stored(stage, QStringLiteral("A")));
+}
+
+void ValuesViewChangesTest::nothing_is_deleted_for_a_value_that_has_gone() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(deep);
+    stage.values->setFocus();
+    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    hand.then([&](QWidget* question) {
+        stage.select_key(alpha);
+        stage.values->setCurrentIndex(stage.value(QStringLiteral("bytes")));
+        QTest::mouseClick(qobject_cast<QMessageBox*>(question)->button(QMessageBox::Yes), Qt::LeftButton);
+    });
+    bool was_told = false;
+    hand.then([&](QWidget* box) {
+        was_told = true;
+        QTest::keyClick(box, Qt::Key_Return);
+    });
+    shared_actions().delete_action->trigger();
+    QVERIFY(!was_told);
+    QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("bytes")));
+    QCOMPARE(scene.bytes(), before);
 }
 
 void ValuesViewChangesTest::deleting_the_default_value_leaves_it_unset() {
@@ -218,6 +280,9 @@ void ValuesViewChangesTest::a_refused_edit_is_told_data() {
     QTest::addColumn<QString>("name");
     QTest::newRow("a name in UTF-16") << QString::fromUtf8("日本");
     QTest::newRow("a type without a name") << QStringLiteral("odd");
+    QTest::newRow("a list") << QString::fromUtf8("列");
+    QTest::newRow("32 bits") << QString::fromUtf8("数");
+    QTest::newRow("64 bits") << QString::fromUtf8("大");
 }
 
 void ValuesViewChangesTest::a_refused_edit_is_told() {
@@ -302,6 +367,27 @@ void ValuesViewChangesTest::a_refused_deletion_is_told_and_keeps_the_row() {
     QCOMPARE(stage.values->currentIndex(), stage.value(QString::fromUtf8("日本")));
     QCOMPARE(stage.values->selectionModel()->selectedIndexes(), QModelIndexList{stage.values->currentIndex()});
     QCOMPARE(scene.bytes(), before);
+}
+
+void ValuesViewChangesTest::a_deletion_refused_after_its_row_went_keeps_the_row() {
+    const Scene scene;
+    Stage stage(scene);
+    ReturningModel model(3, 3);
+    stage.values->setModel(&model);
+    stage.values->setFocus();
+    for (int row = 0; row < model.rowCount(); ++row) {
+        const QModelIndex asked = model.index(row, 1);
+        stage.return_to(*stage.values);
+        stage.values->setCurrentIndex(asked);
+        shared_actions().delete_action->setEnabled(true);
+        DialogHand hand;
+        hand.then_press(QMessageBox::Yes).then_press(QMessageBox::Ok);
+        shared_actions().delete_action->trigger();
+        QVERIFY(hand.is_done());
+        QCOMPARE(hand.text, QStringLiteral("The value could not be deleted."));
+        QCOMPARE(stage.values->currentIndex(), model.index(row, 1));
+        QCOMPARE(stage.values->selectionModel()->selectedIndexes(), QModelIndexList{model.index(row, 1)});
+    }
 }
 
 void ValuesViewChangesTest::the_first_value_beside_the_unset_default_can_be_renamed() {

@@ -46,6 +46,8 @@ private slots:
     void the_editor_follows_the_data_data();
     void the_editor_follows_the_data();
     void a_cancelled_number_is_not_written();
+    void data_goes_to_no_other_key_s_value_data();
+    void data_goes_to_no_other_key_s_value();
     void data_that_cannot_be_edited_is_told();
     void other_columns_open_nothing();
     void return_opens_the_editor_and_enter_does_not();
@@ -148,6 +150,42 @@ void ValuesViewTest::a_cancelled_number_is_not_written() {
         double_click(stage, stage.value(QString::fromLatin1(name)));
         QVERIFY(hand.is_done());
     }
+    QCOMPARE(scene.bytes(), before);
+}
+
+void ValuesViewTest::data_goes_to_no_other_key_s_value_data() {
+    QTest::addColumn<QString>("name");
+    for (const char* name : {"text", "bytes", "list", "dword", "qword"}) {
+        QTest::newRow(name) << QString::fromLatin1(name);
+    }
+}
+
+void ValuesViewTest::data_goes_to_no_other_key_s_value() {
+    QFETCH(QString, name);
+    // Two keys with the same values, so that the rows of one fit the other's.
+    testkit::HiveLayout hive;
+    for (const char* key_name : {"One", "Two"}) {
+        testkit::KeyLayout& key = hive.root.add(key_name);
+        key.set("text", 1, testkit::text_data("hello"));
+        key.set("bytes", 3, {1, 2});
+        key.set("dword", 4, {1, 0, 0, 0});
+        key.set("list", 7, {'a', 0, 0, 0, 0, 0});
+        key.set("qword", 11, {1, 0, 0, 0, 0, 0, 0, 0});
+    }
+    const Scene scene(hive);
+    Stage stage(scene);
+    stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\One"));
+    const QByteArray before = scene.bytes();
+    DialogHand hand;
+    hand.then([&](QWidget* dialog) {
+        stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Two"));
+        QTest::keyClicks(QApplication::focusWidget(), QStringLiteral("ab"));
+        press(*dialog, QDialogButtonBox::Ok);
+    });
+    hand.then_press(QMessageBox::Ok);
+    double_click(stage, stage.value(name));
+    QTRY_VERIFY(hand.is_done());
+    QCOMPARE(hand.text, QStringLiteral("The value could not be changed."));
     QCOMPARE(scene.bytes(), before);
 }
 
