@@ -57,11 +57,11 @@ QModelIndex KeysView::in_place(const QModelIndex& key) {
 
 void KeysView::show_keys_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
-    if (!may_change_rows(*this)) {
+    if (std::exchange(m_menu_is_stale, false) || !may_change_rows(*this)) {
         return;
     }
     const QModelIndex index = indexAt(point);
-    if (std::exchange(m_menu_is_stale, false) || !index.isValid() || index.column() != 0) {
+    if (!index.isValid() || index.column() != 0) {
         return;
     }
     const SharedActions& actions = shared_actions();
