@@ -8,7 +8,6 @@
 #include <QItemEditorFactory>
 #include <QMetaProperty>
 #include <QScopedValueRollback>
-#include <QTimer>
 
 #include <algorithm>
 #include <cstdio>
@@ -82,7 +81,10 @@ void report_key_failure(const QModelIndex& index, const std::exception& failure)
 
 }  // namespace
 
-NameDelegate::NameDelegate(QWidget* main_window) : m_main_window(main_window) {}
+NameDelegate::NameDelegate(QWidget* main_window) : m_main_window(main_window) {
+    m_until_told.setSingleShot(true);
+    connect(&m_until_told, &QTimer::timeout, this, &NameDelegate::tell_refused_names);
+}
 
 void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,
                           const QString& refusal) const {
@@ -117,7 +119,7 @@ bool NameDelegate::write_back(const QWidget& editor, QAbstractItemModel& model, 
 
 void NameDelegate::tell_later(const QString& text) const {
     m_untold.append(text);
-    QTimer::singleShot(0, this, [this] { tell_refused_names(); });
+    m_until_told.start(0);
 }
 
 void NameDelegate::tell_refused_names() const {

@@ -7,6 +7,7 @@
 
 #include <QStringList>
 #include <QStyledItemDelegate>
+#include <QTimer>
 
 #include <exception>
 #include <limits>
@@ -39,6 +40,7 @@ private:
 
     QWidget* m_main_window;
     mutable QStringList m_untold;
+    mutable QTimer m_until_told;
 };
 
 class ValueDelegate : public NameDelegate {
