@@ -239,7 +239,8 @@ bool ValuesProxyModel::remove_from_source(int row, int source) {
 }
 
 void ValuesProxyModel::end_removal(int row, int source, int rows_before) {
-    if (rows_now(rows_before) < rows_before) {
+    const bool is_gone = rows_now(rows_before) < rows_before;
+    if (is_gone) {
         const auto position = static_cast<size_t>(row - offset());
         if (position < mapping_.size())
             mapping_.erase(mapping_.begin() + static_cast<std::ptrdiff_t>(position));
@@ -252,6 +253,11 @@ void ValuesProxyModel::end_removal(int row, int source, int rows_before) {
         ask_for_default();
     } catch (...) {
         failure = std::current_exception();
+        // Where the key cannot be asked, the row that went says it, as it does in every key that is not damaged.
+        if (is_gone && source <= unnamed_) {
+            synthetic_default_ = source == unnamed_;
+            unnamed_ = synthetic_default_ ? -1 : unnamed_ - 1;
+        }
     }
     if (rows_now(rows_before) == rows_before) {
         // The row is there again: it was refused, or the made-up row has taken the unnamed value's place.
