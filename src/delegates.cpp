@@ -3,10 +3,13 @@
 #include "delegates.h"
 
 #include "failure_report.h"
+#include "values_model.h"
 
 #include <QCoreApplication>
 #include <QItemEditorFactory>
+#include <QKeyEvent>
 #include <QMetaProperty>
+#include <QPointer>
 #include <QScopedValueRollback>
 
 #include <algorithm>
@@ -99,6 +102,19 @@ void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, cons
     }
 }
 
+bool NameDelegate::eventFilter(QObject* editor, QEvent* event) {
+    const int key = event->type() == QEvent::KeyPress ? static_cast<QKeyEvent*>(event)->key() : 0;
+    if (key != Qt::Key_Tab && key != Qt::Key_Backtab) {
+        return QStyledItemDelegate::eventFilter(editor, event);
+    }
+    const QPointer<QWidget> named = qobject_cast<QWidget*>(editor);
+    emit commitData(named);
+    if (named) {
+        emit closeEditor(named, NoHint);
+    }
+    return true;
+}
+
 // False when the model refused the editor's text.
 bool NameDelegate::write_back(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index) const {
     QByteArray property = editor.metaObject()->userProperty().name();
@@ -163,6 +179,10 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
         // The base class asks displayText for the text, and takes font, icon and colours from the same index.
         const QScopedValueRollback<qsizetype> cut(m_limit, limit);
         QStyledItemDelegate::initStyleOption(option, index);
+        // Bytes and numbers have one order, whichever way the rest of the window reads.
+        if (index.column() == ValuesModel::DataColumn) {
+            option->direction = Qt::LeftToRight;
+        }
     } catch (const std::exception& failure) {
         report_value_failure(failure);
     }

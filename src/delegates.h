@@ -27,6 +27,9 @@ public:
     void tell_refused_names() const;
 
 protected:
+    // Tab ends a naming as Return does. The toolkit would go on to the name, or another cell, of the next row, which
+    // the next thing typed is then taken for.
+    bool eventFilter(QObject* editor, QEvent* event) override;
     // An exception must not pass the view, which would take the editor for one being committed from then on, and
     // commit no other.
     void commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,

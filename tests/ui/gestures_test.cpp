@@ -103,6 +103,37 @@ private slots:
                 stage.keys->viewport()->findChild<QLineEdit*>()->isHidden());
     }
 
+    // What is typed next is not the next row's.
+    void tab_ends_a_naming_where_it_is() {
+        for (const Qt::Key key : {Qt::Key_Tab, Qt::Key_Backtab}) {
+            const Scene scene(many_keys());
+            Stage stage(scene);
+            stage.keys->expand(stage.key(services));
+            stage.select_key(below("Disk"));
+            stage.keys->setFocus();
+            shared_actions().rename_action->trigger();
+            auto* editor = stage.keys->viewport()->findChild<QLineEdit*>();
+            editor->setText(QStringLiteral("Disc"));
+            QTest::keyClick(editor, key);
+            QTRY_COMPARE(stage.status(), below("Disc"));
+            QVERIFY(editor->isHidden());
+            for (const QLineEdit* other : stage.keys->viewport()->findChildren<QLineEdit*>()) {
+                QVERIFY(other->isHidden());
+            }
+        }
+        const Scene scene;
+        Stage stage(scene);
+        stage.select_key(alpha);
+        stage.values->setFocus();
+        const QModelIndex named = stage.value(QStringLiteral("reversed"));
+        stage.values->setCurrentIndex(named);
+        shared_actions().rename_action->trigger();
+        auto* editor = stage.values->viewport()->findChild<QLineEdit*>();
+        editor->setText(QStringLiteral("turned"));
+        QTest::keyClick(editor, Qt::Key_Backtab);
+        QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("turned")));
+    }
+
     void the_keys_that_open_and_close_branches_select_none() {
         const Scene scene(many_keys());
         Stage stage(scene);
