@@ -423,7 +423,7 @@ void KeysViewTest::an_asterisk_opens_all_below() {
 }
 
 void KeysViewTest::an_asterisk_tells_what_it_cannot_open() {
-    // Far enough down that no paint meets the damaged key.
+    // Below what the window shows: it is told as the tree measures its rows.
     constexpr int sound_keys = 100;
     testkit::HiveLayout hive;
     for (int i = 0; i < sound_keys; ++i) {
