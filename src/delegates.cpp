@@ -3,6 +3,7 @@
 #include "delegates.h"
 
 #include "failure_report.h"
+#include "value_text.h"
 #include "values_model.h"
 
 #include <QCoreApplication>
@@ -13,68 +14,12 @@
 #include <QScopedValueRollback>
 
 #include <algorithm>
-#include <cstdio>
 
 namespace {
 
 // A cell shows no more letters than half its width in pixels; a row that is measured before it has a width is measured
 // by this many.
 constexpr qsizetype shortest_cut = 256;
-
-QString hexadecimal(const QByteArray& bytes, qsizetype limit) {
-    static const char digits[] = "0123456789abcdef";
-    const qsizetype count = limit / 3 < bytes.size() ? limit / 3 + 1 : bytes.size();
-    QString text(count * 3 - 1, QLatin1Char(' '));
-    for (qsizetype i = 0; i < count; ++i) {
-        const auto byte = static_cast<unsigned char>(bytes[i]);
-        text[i * 3] = QLatin1Char(digits[byte >> 4]);
-        text[i * 3 + 1] = QLatin1Char(digits[byte & 15]);
-    }
-    return text;
-}
-
-QString joined(const QStringList& strings, qsizetype limit) {
-    QString text;
-    for (qsizetype i = 0; i < strings.size() && text.size() < limit; ++i) {
-        if (i > 0) {
-            text += QLatin1Char(' ');
-        }
-        text += QStringView(strings[i]).left(std::min(limit, strings[i].size()));
-    }
-    return text;
-}
-
-// The text of a datum, of which only the first `limit` characters need be right.
-QString rendered(const QVariant& value, qsizetype limit) {
-    switch (value.typeId()) {
-    case QMetaType::QString:
-        return value.toString().left(limit);
-    case QMetaType::UInt: {
-        char text[32];
-        std::snprintf(text, sizeof text, "0x%08x (%u)", value.toUInt(), value.toUInt());
-        return QString::fromLatin1(text);
-    }
-    case QMetaType::ULongLong: {
-        char text[64];
-        std::snprintf(text, sizeof text, "0x%016llx (%llu)", value.toULongLong(), value.toULongLong());
-        return QString::fromLatin1(text);
-    }
-    case QMetaType::QByteArray: {
-        const QByteArray bytes = value.toByteArray();
-        return bytes.isEmpty() ? QCoreApplication::translate("MainWindow", "(zero-length binary value)")
-                               : hexadecimal(bytes, limit);
-    }
-    case QMetaType::QStringList:
-        return joined(value.toStringList(), limit);
-    default:
-        break;
-    }
-    if (value.typeId() >= QMetaType::User) {
-        return ValueDelegate::tr("(value not set)");
-    }
-    std::printf("fallback: rendering '%s' as string\n", value.typeName());
-    return value.toString();
-}
 
 void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_shown(failure); }
 
@@ -145,7 +90,7 @@ void NameDelegate::tell_refused_names() const {
 }
 
 QString ValueDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
-    return rendered(value, m_limit);
+    return value_text(value, m_limit);
 }
 
 void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {

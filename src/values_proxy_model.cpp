@@ -4,8 +4,10 @@
 
 #include "reg_key.h"
 #include "value_order.h"
+#include "value_text.h"
 #include "values_model.h"
 
+#include <QCoreApplication>
 #include <QIcon>
 #include <QScopedValueRollback>
 
@@ -90,9 +92,22 @@ QModelIndex ValuesProxyModel::mapFromSource(const QModelIndex& source_index) con
     return index(position + offset(), source_index.column());
 }
 
+// What a screen reader says, which is what is shown; the toolkit would take bytes for text, and lists for nothing. It
+// asks through parts that lose memory when an exception passes them.
+QVariant ValuesProxyModel::spoken_data(const QModelIndex& index) const {
+    try {
+        const QVariant datum = data(index, Qt::DisplayRole);
+        return datum.isValid() ? value_text(datum) : QVariant();
+    } catch (const std::exception&) {
+        return QCoreApplication::translate("KeyDelegate", "(cannot be read)");
+    }
+}
+
 QVariant ValuesProxyModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid() || sourceModel() == nullptr)
         return QVariant();
+    if (role == Qt::AccessibleTextRole && index.column() == ValuesModel::DataColumn)
+        return spoken_data(index);
     if (!is_synthetic(index.row()))
         return sourceModel()->data(mapToSource(index), role);
     if (role == Qt::DisplayRole) {

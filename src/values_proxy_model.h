@@ -51,6 +51,7 @@ private:
     bool is_synthetic(int row) const { return synthetic_default_ && row == 0; }
     int source_row(int row) const;
     void ask_for_default();
+    QVariant spoken_data(const QModelIndex& index) const;
     bool change_source(const std::function<bool()>& change);
     bool make_default(const QModelIndex& index, const QVariant& value);
     int rows_now(int otherwise) const;  // otherwise: where the key cannot say

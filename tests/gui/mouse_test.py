@@ -19,10 +19,10 @@ SCRIPTS = "Gr\u00fc\u00dfe \u041f\u0440\u0438\u0432\u0435\u0442 \u65e5\u672c\u8a
 KINDS = (
     # menu text, type, empty data, dialog, typed text, stored data, shown
     ("String Value", 1, text_data(""), "Edit String", MARKUP, text_data(MARKUP), MARKUP),
-    ("Binary Value", 3, b"", "Edit Binary Value", "0A0b", b"\x0a\x0b", None),
-    ("DWORD (32-bit) Value", 4, bytes(4), "Edit DWORD (32-bit) Value", "DEADBEEF", b"\xef\xbe\xad\xde", "3735928559"),
-    ("QWORD (64-bit) Value", 11, bytes(8), "Edit QWORD (64-bit) Value", "ff", b"\xff" + bytes(7), "255"),
-    ("Multi-String Value", 7, bytes(4), "Edit Multi-String", "one\ntwo", list_data(["one", "two"]), None),
+    ("Binary Value", 3, b"", "Edit Binary Value", "0A0b", b"\x0a\x0b", "0a 0b"),
+    ("DWORD (32-bit) Value", 4, bytes(4), "Edit DWORD (32-bit) Value", "DEADBEEF", b"\xef\xbe\xad\xde", "0xdeadbeef (3735928559)"),
+    ("QWORD (64-bit) Value", 11, bytes(8), "Edit QWORD (64-bit) Value", "ff", b"\xff" + bytes(7), "0x00000000000000ff (255)"),
+    ("Multi-String Value", 7, bytes(4), "Edit Multi-String", "one\ntwo", list_data(["one", "two"]), "one two"),
     ("Expandable String Value", 2, text_data(""), "Edit String", "%TEMP%", text_data("%TEMP%"), "%TEMP%"),
 )
 
@@ -51,18 +51,18 @@ def look_around(session):
     # table draws for them is in the pictures, and tested without a display.
     for value, kind, data in (
         ("(Default)", "REG_SZ", "the default value"),
-        ("Nothing", "REG_NONE", None),
+        ("Nothing", "REG_NONE", "(zero-length binary value)"),
         ("Nothing with bytes", "REG_NONE", None),
         ("Text, markup", "REG_SZ", '<b>not bold</b> & "quoted"'),
         ("Text, many scripts", "REG_SZ", SCRIPTS),
         ("Expandable", "REG_EXPAND_SZ", "%SystemRoot%\\system32"),
         ("Binary", "REG_BINARY", None),
-        ("DWORD", "REG_DWORD", "42"),
-        ("DWORD, largest", "REG_DWORD", "4294967295"),
-        ("DWORD, big-endian", "REG_DWORD_BIG_ENDIAN", "256"),
+        ("DWORD", "REG_DWORD", "0x0000002a (42)"),
+        ("DWORD, largest", "REG_DWORD", "0xffffffff (4294967295)"),
+        ("DWORD, big-endian", "REG_DWORD_BIG_ENDIAN", "0x00000100 (256)"),
         ("Link", "REG_LINK", "\\Link"),
         ("List", "REG_MULTI_SZ", None),
-        ("QWORD", "REG_QWORD", "1234605616436508552"),
+        ("QWORD", "REG_QWORD", "0x1122334455667788 (1234605616436508552)"),
         ("Type 1234567", "", None),
     ):
         session.shows(value, kind, data)
@@ -98,7 +98,7 @@ def make_key(session):
     session.fill_editor(MADE[-1])
     session.key_renamed("naming the new key", CONTROL + ["New Key #1"], MADE[-1])
     session.selected(MADE)
-    equal(session.rows(), [["(Default)", "REG_SZ", ""]], "the new key's table")
+    equal(session.rows(), [["(Default)", "REG_SZ", "(value not set)"]], "the new key's table")
 
     step("a name that a sibling has is refused")
     program.right_click(session.cell(MADE))
@@ -268,7 +268,7 @@ def default_value(session):
     program.pick("Edit", "Delete")
     session.message(*DELETE_VALUE, "Yes")
     session.value_gone("deleting the default value", MADE, "")
-    session.shows("(Default)", "REG_SZ", "")
+    session.shows("(Default)", "REG_SZ", "(value not set)")
 
 
 def odd_value(session):

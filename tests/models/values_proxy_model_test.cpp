@@ -84,6 +84,30 @@ private slots:
         QVERIFY(shown.proxy.removeRows(2, 1));
     }
 
+    void what_is_spoken_of_a_value_is_what_is_shown() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        key.set("bytes", 3, {0x01, 0xAB, 0x00});
+        key.set("empty", 3, {});
+        key.set("list", 7, testkit::text_data(std::string("a\0b\0", 4)));
+        key.set("number", 4, {42, 0, 0, 0});
+        key.set("text", 1, testkit::text_data("as it is"));
+        const HiveOnDisk file(hive);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        ValuesModel source(static_cast<RegKey*>(opened.root_key()->child(0)));
+        ValuesProxyModel proxy;
+        proxy.setSourceModel(&source);
+        proxy.sort(0, Qt::AscendingOrder);
+        QStringList spoken;
+        for (int row = 0; row < proxy.rowCount(); row++)
+            spoken.append(proxy.index(row, 2).data(Qt::AccessibleTextRole).toString());
+        QCOMPARE(spoken, QStringList({QStringLiteral("(value not set)"), QStringLiteral("01 ab 00"),
+                                      QStringLiteral("(zero-length binary value)"), QStringLiteral("a b"),
+                                      QStringLiteral("0x0000002a (42)"), QStringLiteral("as it is")}));
+        QVERIFY(!proxy.index(1, 0).data(Qt::AccessibleTextRole).isValid());
+    }
+
     // Whichever of the two stands first in the key's list.
     void a_value_named_like_the_unnamed_one_stays_apart_from_it() {
         testkit::HiveLayout hive;

@@ -1,0 +1,68 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "value_text.h"
+
+#include <QCoreApplication>
+#include <QStringList>
+#include <QVariant>
+
+#include <algorithm>
+#include <cstdio>
+
+namespace {
+
+QString hexadecimal(const QByteArray& bytes, qsizetype limit) {
+    static const char digits[] = "0123456789abcdef";
+    const qsizetype count = limit / 3 < bytes.size() ? limit / 3 + 1 : bytes.size();
+    QString text(count * 3 - 1, QLatin1Char(' '));
+    for (qsizetype i = 0; i < count; ++i) {
+        const auto byte = static_cast<unsigned char>(bytes[i]);
+        text[i * 3] = QLatin1Char(digits[byte >> 4]);
+        text[i * 3 + 1] = QLatin1Char(digits[byte & 15]);
+    }
+    return text;
+}
+
+QString joined(const QStringList& strings, qsizetype limit) {
+    QString text;
+    for (qsizetype i = 0; i < strings.size() && text.size() < limit; ++i) {
+        if (i > 0) {
+            text += QLatin1Char(' ');
+        }
+        text += QStringView(strings[i]).left(std::min(limit, strings[i].size()));
+    }
+    return text;
+}
+
+}  // namespace
+
+QString value_text(const QVariant& value, qsizetype limit) {
+    switch (value.typeId()) {
+    case QMetaType::QString:
+        return value.toString().left(limit);
+    case QMetaType::UInt: {
+        char text[32];
+        std::snprintf(text, sizeof text, "0x%08x (%u)", value.toUInt(), value.toUInt());
+        return QString::fromLatin1(text);
+    }
+    case QMetaType::ULongLong: {
+        char text[64];
+        std::snprintf(text, sizeof text, "0x%016llx (%llu)", value.toULongLong(), value.toULongLong());
+        return QString::fromLatin1(text);
+    }
+    case QMetaType::QByteArray: {
+        const QByteArray bytes = value.toByteArray();
+        return bytes.isEmpty() ? QCoreApplication::translate("MainWindow", "(zero-length binary value)")
+                               : hexadecimal(bytes, limit);
+    }
+    case QMetaType::QStringList:
+        return joined(value.toStringList(), limit);
+    default:
+        break;
+    }
+    if (value.typeId() >= QMetaType::User) {
+        return QCoreApplication::translate("ValueDelegate", "(value not set)");
+    }
+    std::printf("fallback: rendering '%s' as string\n", value.typeName());
+    return value.toString();
+}
