@@ -4,6 +4,7 @@
 
 #include "reg_key.h"
 #include "reg_model.h"
+#include "searched.h"
 
 #include <QAbstractItemModelTester>
 #include <QSignalSpy>
@@ -32,19 +33,7 @@ struct Mounted {
 
     Mounted() { model.add_hive(QStringLiteral("MACHINE/SYSTEM"), file.path()); }
 
-    QModelIndex at(const QString& path) {
-        QModelIndex here;
-        const QStringList names = path.split(QLatin1Char('/'));
-        for (const QString& name : names) {
-            QModelIndex found;
-            for (int row = 0; row < model.rowCount(here); row++) {
-                if (model.index(row, 0, here).data().toString() == name)
-                    found = model.index(row, 0, here);
-            }
-            here = found;
-        }
-        return here;
-    }
+    QModelIndex at(const QString& path) { return key_below(model, QModelIndex(), path); }
     QStringList names(const QModelIndex& parent) {
         QStringList all;
         for (int row = 0; row < model.rowCount(parent); row++)

@@ -17,6 +17,21 @@ inline QString path_of(const QModelIndex& index) {
     return names.join(QLatin1Char('/'));
 }
 
+// The key at a path, its names parted by slashes; invalid when there is none.
+inline QModelIndex key_below(const RegModel& model, const QModelIndex& start, const QString& path) {
+    QModelIndex here = start;
+    const QStringList names = path.split(QLatin1Char('/'));
+    for (const QString& name : names) {
+        QModelIndex found;
+        for (int row = 0; row < model.rowCount(here); row++) {
+            if (model.index(row, 0, here).data().toString() == name)
+                found = model.index(row, 0, here);
+        }
+        here = found;
+    }
+    return here;
+}
+
 struct Searched {
     HiveOnDisk file;
     RegModel model;
@@ -27,19 +42,7 @@ struct Searched {
     }
 
     // The key at a path below the hive's root.
-    QModelIndex at(const QString& path) {
-        QModelIndex here = model.index(0, 0, model.index(0, 0));
-        const QStringList names = path.split(QLatin1Char('/'));
-        for (const QString& name : names) {
-            QModelIndex found;
-            for (int row = 0; row < model.rowCount(here); row++) {
-                if (model.index(row, 0, here).data().toString() == name)
-                    found = model.index(row, 0, here);
-            }
-            here = found;
-        }
-        return here;
-    }
+    QModelIndex at(const QString& path) { return key_below(model, model.index(0, 0, model.index(0, 0)), path); }
 
     // "PATH" or "PATH : ROW".
     static QString text_of(const RegModel::FindResult& hit) {

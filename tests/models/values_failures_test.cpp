@@ -6,6 +6,7 @@
 // afterwards.
 #include "alloc_faults.h"
 #include "hive_on_disk.h"
+#include "read_faults.h"
 
 #include "reg_hive.h"
 #include "reg_key.h"
@@ -18,39 +19,8 @@
 #include <QTableView>
 #include <QTest>
 
-#include <sys/syscall.h>
-#include <unistd.h>
-
-#include <cerrno>
 #include <functional>
 #include <stdexcept>
-
-namespace {
-
-// Reads of the hive's file that fail: the nth and, if that is said, all behind it. 0: none.
-struct ReadFaults {
-    int nth = 0;
-    bool lasting = false;
-    int reads = 0;
-
-    bool strikes() {
-        reads++;
-        return nth > 0 && (lasting ? reads >= nth : reads == nth);
-    }
-};
-
-ReadFaults read_faults;
-
-}  // namespace
-
-// In place of the C library's, for the toolkit's file too.
-extern "C" ssize_t read(int file, void* buffer, size_t size) {
-    if (read_faults.strikes()) {
-        errno = EIO;
-        return -1;
-    }
-    return syscall(SYS_read, file, buffer, size);
-}
 
 namespace {
 
@@ -201,15 +171,14 @@ bool fails_at(int nth, bool lasting, const Attempt& attempt, Outcomes& outcomes)
     int* outcome = &outcomes.refused;
     {
         const testkit::AllocationFaults faults(attempt.fails_reads ? 0 : static_cast<uint64_t>(nth), lasting);
-        read_faults = {attempt.fails_reads ? nth : 0, lasting, 0};
+        const testkit::ReadFaults read_faults(attempt.fails_reads ? nth : 0, lasting);
         try {
             if (attempt.change(shown))
                 outcome = &outcomes.done;
         } catch (const std::exception&) {
             outcome = &outcomes.thrown;
         }
-        failed = attempt.fails_reads ? read_faults.reads >= nth : faults.failed();
-        read_faults = {};
+        failed = attempt.fails_reads ? read_faults.failed() : faults.failed();
     }
     QString wrong = shown.wrong(attempt.is_insertion);
     const int more_rows = shown.source.rowCount() - rows;

@@ -4,47 +4,15 @@
 // Reads of the hive's file that fail while a key is made, renamed or deleted: afterwards no object of the tree stands
 // for another key than before, and a single failure leaves tree and file agreeing.
 #include "hive_on_disk.h"
+#include "read_faults.h"
 
 #include "reg_hive.h"
 #include "reg_key.h"
 
 #include <QTest>
 
-#include <sys/syscall.h>
-#include <unistd.h>
-
-#include <cerrno>
 #include <map>
 #include <stdexcept>
-
-namespace {
-
-struct Faults {
-    bool armed = false;
-    bool lasting = false;
-    int reads = 0;
-    int nth = 0;  // 0: none
-
-    bool strikes() {
-        if (!armed)
-            return false;
-        reads++;
-        return nth > 0 && (lasting ? reads >= nth : reads == nth);
-    }
-};
-
-Faults faults;
-
-}  // namespace
-
-// In place of the C library's, for the toolkit's file too.
-extern "C" ssize_t read(int file, void* buffer, size_t size) {
-    if (faults.strikes()) {
-        errno = EIO;
-        return -1;
-    }
-    return syscall(SYS_read, file, buffer, size);
-}
 
 namespace {
 
@@ -70,8 +38,8 @@ const Operation operations[] = {
     {"delete", [](RegKey* parent) { return parent->delete_key(5) ? 0 : -1; }},
 };
 
-// What one run found; empty when all is well.
-QString try_with(const HiveOnDisk& file, const Operation& operation) {
+// What a run whose nth read fails found; empty when all is well.
+QString try_with(const HiveOnDisk& file, const Operation& operation, int nth, bool lasting, int& reads) {
     DummyRegKey top(QStringLiteral("TOP"));
     RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
     auto* parent = static_cast<RegKey*>(hive.root_key()->child(0));
@@ -81,18 +49,19 @@ QString try_with(const HiveOnDisk& file, const Operation& operation) {
     AbstractRegKey* const renamed = parent->child(renamed_row);
     static_cast<RegKey*>(parent->child(parent->child_count() - 1))->read_value(0);  // the window is elsewhere
 
-    faults.reads = 0;
-    faults.armed = true;
-    try {
-        operation.run(parent);
-    } catch (const std::runtime_error&) {
-        // the key cannot be opened, and nothing was done
+    {
+        const testkit::ReadFaults faults(nth, lasting);
+        try {
+            operation.run(parent);
+        } catch (const std::runtime_error&) {
+            // the key cannot be opened, and nothing was done
+        }
+        reads = faults.reads();
     }
-    faults.armed = false;
     hive.clear_handle_cache();
 
     const testkit::Hive disk = file.read();
-    if (!faults.lasting && static_cast<size_t>(parent->child_count()) != disk.find("Parent")->children.size())
+    if (!lasting && static_cast<size_t>(parent->child_count()) != disk.find("Parent")->children.size())
         return QStringLiteral("the tree has another number of keys than the file");
     for (int i = 0; i < parent->child_count(); i++) {
         AbstractRegKey* const key = parent->shown_child(i);
@@ -100,7 +69,7 @@ QString try_with(const HiveOnDisk& file, const Operation& operation) {
         try {
             name = key->name();
         } catch (const std::runtime_error&) {
-            if (!faults.lasting)
+            if (!lasting)
                 return names[key] + QStringLiteral(" cannot be opened any more");
             continue;  // told, not taken for another
         }
@@ -135,11 +104,11 @@ private slots:
         int total = 1;
         for (int nth = 0; nth <= total; nth += nth > 0 && nth + close < total ? 9 : 1) {
             const HiveOnDisk file(bytes);
-            faults = {false, lasting, 0, nth};
-            const QString found = try_with(file, operations[operation]);
+            int reads = 0;
+            const QString found = try_with(file, operations[operation], nth, lasting, reads);
             QVERIFY2(found.isEmpty(), qPrintable(QStringLiteral("read %1: ").arg(nth) + found));
             if (nth == 0)
-                total = faults.reads;
+                total = reads;
         }
         QVERIFY(total > 10);
     }
