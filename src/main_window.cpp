@@ -67,6 +67,8 @@ MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
 }
 
 MainWindow::~MainWindow() {
+    // The base class takes the keyboard from its widgets, when the rest of the window is gone.
+    disconnect(qApp, &QApplication::focusChanged, this, nullptr);
     // The key model is gone, and with it the key behind the rows: an open name editor is closed without it.
     values_proxy->setSourceModel(nullptr);
     // The view must not ask a proxy that is destroyed before it.
