@@ -7,6 +7,7 @@
 #include "failure_report.h"
 #include "finish_editing.h"
 #include "shared_actions.h"
+#include "value_text.h"
 #include "values_proxy_model.h"
 
 #include <QAction>
@@ -19,9 +20,10 @@
 #include <QKeyEvent>
 #include <QMenu>
 #include <QMessageBox>
-#include <QStyledItemDelegate>
 #include <QTextDocument>
 #include <QToolTip>
+
+#include <limits>
 
 namespace {
 
@@ -50,6 +52,12 @@ int type_created_by(const QAction* action) {
         return 11;
     }
     return -1;
+}
+
+// What a cell shows, of which only the first `limit` characters need be right; data that cannot be read shows nothing.
+QString shown_text(const QModelIndex& cell, qsizetype limit = std::numeric_limits<qsizetype>::max()) {
+    const QVariant datum = cell.data(Qt::DisplayRole);
+    return datum.isValid() ? value_text(datum, limit) : QString();
 }
 
 }  // namespace
@@ -144,11 +152,7 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
         value_double_clicked(currentIndex());
     } else if (event->matches(QKeySequence::Copy) && currentIndex().isValid()) {
         // As it is shown: the toolkit would take bytes for text, and a list of strings for nothing.
-        const QVariant datum = currentIndex().data(Qt::DisplayRole);
-        QApplication::clipboard()->setText(
-            datum.typeId() == QMetaType::QString
-                ? datum.toString()
-                : static_cast<QStyledItemDelegate*>(itemDelegate())->displayText(datum, locale()));
+        QApplication::clipboard()->setText(shown_text(currentIndex()));
         event->accept();
     } else {
         QTableView::keyPressEvent(event);
@@ -264,11 +268,10 @@ bool ValuesView::viewportEvent(QEvent* event) {
     // A text that its cell cuts can be read whole; of a very long one, the beginning.
     const auto* help = static_cast<QHelpEvent*>(event);
     const QModelIndex index = indexAt(help->pos());
-    const auto* delegate = qobject_cast<const QStyledItemDelegate*>(itemDelegate());
     QString text;
-    if (index.isValid() && delegate && sizeHintForIndex(index).width() > columnWidth(index.column())) {
+    if (index.isValid() && sizeHintForIndex(index).width() > columnWidth(index.column())) {
         constexpr qsizetype longest = 1000;
-        text = delegate->displayText(index.data(Qt::DisplayRole), locale()).left(longest);
+        text = shown_text(index, longest).left(longest);
     }
     // Made into paragraphs here, so that the tip takes no text for markup.
     QToolTip::showText(help->globalPos(), text.isEmpty() ? text : Qt::convertFromPlainText(text), viewport());

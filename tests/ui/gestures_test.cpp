@@ -165,9 +165,7 @@ private slots:
     void a_key_that_is_clicked_again_has_its_actions_back() {
         const Scene scene;
         Stage stage(scene);
-        stage.select_key(alpha + QStringLiteral("\\Leaf"));
-        stage.values->setFocus();
-        stage.values->setCurrentIndex(stage.value(QStringLiteral("(Default)")));
+        stage.select_value(alpha + QStringLiteral("\\Leaf"), QStringLiteral("(Default)"));
         QVERIFY(!shared_actions().rename_action->isEnabled());
         QTest::mouseClick(stage.keys->viewport(), Qt::LeftButton, {},
                           stage.keys->visualRect(stage.keys->currentIndex()).center());

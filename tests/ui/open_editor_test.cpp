@@ -136,6 +136,14 @@ void name_a_new_value(Stage& stage, const QString& name) {
     type_in(*stage.values, name);
 }
 
+// Types another name for the key Leaf, whose editor stays open.
+void name_leaf_anew(Stage& stage, const QString& name) {
+    stage.select_key(leaf);
+    stage.return_to(*stage.keys);
+    shared_actions().rename_action->trigger();
+    type_in(*stage.keys, name);
+}
+
 // A value of Deep's, and in an editor another value's name for it.
 void type_a_refused_value_name(Stage& stage) {
     stage.select_key(deep);
@@ -235,10 +243,7 @@ void OpenEditorTest::find_asks_after_the_name_is_stored() {
     const Scene scene;
     Stage stage(scene, std::make_unique<WitnessModel>());
     const auto& model = static_cast<const WitnessModel&>(*stage.model);
-    stage.select_key(leaf);
-    stage.return_to(*stage.keys);
-    shared_actions().rename_action->trigger();
-    type_in(*stage.keys, QStringLiteral("zzz"));
+    name_leaf_anew(stage, QStringLiteral("zzz"));
     DialogHand hand;
     hand.then([](QWidget* dialog) { QTest::keyClick(dialog, Qt::Key_Escape); });
     QTest::keyClick(editor_in(*stage.keys), Qt::Key_F, Qt::ControlModifier);
@@ -319,10 +324,7 @@ void OpenEditorTest::a_new_key_leaves_the_value_its_name() {
 void OpenEditorTest::a_new_value_leaves_the_key_its_name() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(leaf);
-    stage.return_to(*stage.keys);
-    shared_actions().rename_action->trigger();
-    type_in(*stage.keys, QStringLiteral("zzz"));
+    name_leaf_anew(stage, QStringLiteral("zzz"));
     shared_actions().new_dword_action->trigger();
     QVERIFY(!editor_in(*stage.keys));
     QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Deep Zeta zzz"));
@@ -334,10 +336,7 @@ void OpenEditorTest::a_new_value_leaves_the_key_its_name() {
 void OpenEditorTest::a_new_key_leaves_the_key_its_name() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(leaf);
-    stage.return_to(*stage.keys);
-    shared_actions().rename_action->trigger();
-    type_in(*stage.keys, QStringLiteral("zzz"));
+    name_leaf_anew(stage, QStringLiteral("zzz"));
     shared_actions().new_key_action->trigger();
     stage.press_in_editor(QStringLiteral("made"), Qt::Key_Return);
     QTRY_COMPARE(subkeys_in_file(scene, "Alpha\\zzz"), QStringLiteral("made"));
@@ -386,10 +385,7 @@ void OpenEditorTest::closing_the_window_stores_the_name() {
     const Scene scene;
     Stage stage(scene, std::make_unique<WitnessModel>());
     auto& model = static_cast<WitnessModel&>(*stage.model);
-    stage.select_key(leaf);
-    stage.return_to(*stage.keys);
-    shared_actions().rename_action->trigger();
-    type_in(*stage.keys, QStringLiteral("zzz"));
+    name_leaf_anew(stage, QStringLiteral("zzz"));
     take_the_keyboard_from(*stage.keys);
     bool was_visible = false;
     connect(&model, &QAbstractItemModel::layoutChanged, &model, [&] { was_visible = stage.window.isVisible(); });
@@ -402,10 +398,7 @@ void OpenEditorTest::closing_the_window_stores_the_name() {
 void OpenEditorTest::closing_the_window_tells_a_refused_name() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(leaf);
-    stage.return_to(*stage.keys);
-    shared_actions().rename_action->trigger();
-    type_in(*stage.keys, QStringLiteral("Deep"));
+    name_leaf_anew(stage, QStringLiteral("Deep"));
     take_the_keyboard_from(*stage.keys);
     bool was_visible = false;
     DialogHand hand;
@@ -514,10 +507,7 @@ void OpenEditorTest::a_menu_comes_after_a_refused_name() {
 void OpenEditorTest::the_end_of_the_program_stores_the_name() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(leaf);
-    stage.return_to(*stage.keys);
-    shared_actions().rename_action->trigger();
-    type_in(*stage.keys, QStringLiteral("zzz"));
+    name_leaf_anew(stage, QStringLiteral("zzz"));
     // Not by way of the window, which stays open.
     QTimer::singleShot(0, qApp, [] { QCoreApplication::exit(0); });
     QCOMPARE(QApplication::exec(), 0);

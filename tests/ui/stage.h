@@ -55,6 +55,12 @@ public:
     // The key at a path of names below the invisible root; fails the test when there is none.
     QModelIndex key(const QString& path) const;
     void select_key(const QString& path) const { keys->setCurrentIndex(key(path)); }
+    // Makes the first value of that name the current one of its key's table, which gets the keyboard.
+    void select_value(const QString& key_path, const QString& name) const {
+        select_key(key_path);
+        values->setFocus();
+        values->setCurrentIndex(value(name));
+    }
     // The row of the values table with this name, -1 when there is none.
     int value_row(const QString& name) const;
     QModelIndex value(const QString& name, int column = 0) const;

@@ -134,9 +134,7 @@ void ValuesViewChangesTest::deletion_asks() {
     QFETCH(QString, left);
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(deep);
-    stage.values->setFocus();
-    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    stage.select_value(deep, QStringLiteral("A"));
     DialogHand hand;
     hand.then_press(answer);
     QTest::keyClick(stage.values, Qt::Key_Delete);
@@ -156,9 +154,7 @@ void ValuesViewChangesTest::deletion_asks() {
 void ValuesViewChangesTest::what_is_deleted_was_asked_about() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(deep);
-    stage.values->setFocus();
-    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    stage.select_value(deep, QStringLiteral("A"));
     DialogHand hand;
     hand.then([&](QWidget* question) {
         stage.values->setCurrentIndex(stage.value(QStringLiteral("b")));
@@ -174,9 +170,7 @@ void ValuesViewChangesTest::what_is_deleted_was_asked_about() {
 void ValuesViewChangesTest::nothing_is_deleted_for_a_value_that_has_gone() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(deep);
-    stage.values->setFocus();
-    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    stage.select_value(deep, QStringLiteral("A"));
     const QByteArray before = scene.bytes();
     DialogHand hand;
     hand.then([&](QWidget* question) {
@@ -222,9 +216,7 @@ void ValuesViewChangesTest::deleting_the_default_value_leaves_it_unset() {
 void ValuesViewChangesTest::a_rename_in_place() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(deep);
-    stage.values->setFocus();
-    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    stage.select_value(deep, QStringLiteral("A"));
     shared_actions().rename_action->trigger();
     stage.press_in_editor(QStringLiteral("zzz"), Qt::Key_Return);
     QTRY_VERIFY(stored(stage, QStringLiteral("zzz")));
@@ -241,9 +233,7 @@ void ValuesViewChangesTest::a_rename_in_place() {
 void ValuesViewChangesTest::a_rename_to_another_value_s_name_is_told() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(deep);
-    stage.values->setFocus();
-    stage.values->setCurrentIndex(stage.value(QStringLiteral("A")));
+    stage.select_value(deep, QStringLiteral("A"));
     const QByteArray before = scene.bytes();
     shared_actions().rename_action->trigger();
     DialogHand hand;

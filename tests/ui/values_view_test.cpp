@@ -218,9 +218,7 @@ void ValuesViewTest::other_columns_open_nothing() {
 void ValuesViewTest::return_opens_the_editor_and_enter_does_not() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(alpha);
-    stage.values->setFocus();
-    stage.values->setCurrentIndex(stage.value(QStringLiteral("dword")));
+    stage.select_value(alpha, QStringLiteral("dword"));
     QTest::keyClick(stage.values, Qt::Key_Enter);
     QCoreApplication::processEvents();
     QCOMPARE(QApplication::activeModalWidget(), nullptr);
@@ -238,9 +236,7 @@ void ValuesViewTest::return_opens_the_editor_and_enter_does_not() {
 void ValuesViewTest::return_in_a_name_ends_the_name_only() {
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(alpha);
-    stage.values->setFocus();
-    stage.values->setCurrentIndex(stage.value(QStringLiteral("dword")));
+    stage.select_value(alpha, QStringLiteral("dword"));
     shared_actions().rename_action->trigger();
     stage.press_in_editor(QStringLiteral("renamed"), Qt::Key_Return);
     QTRY_VERIFY(stored(stage, QStringLiteral("renamed")));

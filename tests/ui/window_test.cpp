@@ -511,9 +511,7 @@ void WindowTest::the_model_may_go_while_a_name_is_typed() {
     const QByteArray before = scene.bytes();
     {
         Stage stage(scene);
-        stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Alpha"));
-        stage.values->setFocus();
-        stage.values->setCurrentIndex(stage.value(QStringLiteral("text")));
+        stage.select_value(QStringLiteral("MACHINE\\SYSTEM\\Alpha"), QStringLiteral("text"));
         shared_actions().rename_action->trigger();
         auto* editor = qobject_cast<QLineEdit*>(QApplication::focusWidget());
         QVERIFY(editor);
