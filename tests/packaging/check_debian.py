@@ -27,6 +27,16 @@ def build_package(cmake, source):
     return packages[0]
 
 
+def packages_of_group(source, group):
+    lines = (line.split() for line in (source / "tools/packages.txt").read_text().splitlines())
+    return {words[1] for words in lines if words[:1] == [group]}
+
+
+def recommended(package):
+    field = run("dpkg-deb", "--field", package, "Recommends", stdout=subprocess.PIPE).stdout
+    return {name.strip() for name in field.split(",")}
+
+
 def dpkg(root, *words):
     # Only this package goes into the scratch root, so that its dependencies cannot be met there.
     run("dpkg", f"--root={root}", "--force-not-root", "--force-depends", "--log=/dev/null", *words,
@@ -38,6 +48,8 @@ def main():
     cmake, source = sys.argv[1], pathlib.Path(sys.argv[2])
     package = build_package(cmake, source)
     run("lintian", "--allow-root", "--fail-on", "error,warning", package)
+    # What is installed here to run the program is what a user of the package gets.
+    installed.expect_same(recommended(package), packages_of_group(source, "run"))
     with tempfile.TemporaryDirectory(prefix="tallowfen-root-") as scratch:
         root = pathlib.Path(scratch)
         for name in ("var/lib/dpkg/info", "var/lib/dpkg/updates", "var/lib/dpkg/triggers"):
