@@ -94,7 +94,7 @@ TEST(Allocator, a_file_that_grows_ends_at_most_511_bytes_behind_its_bins) {
     }
 }
 
-// Three cells of 24 in a bin of its own, the middle one free: [24 used][24 free][24 used][rest free].
+// Four cells of 24 in a bin of their own, all in use, and the rest of it free: [24][24][24][24][rest free].
 struct Row {
     explicit Row(Scene& scene) : bin(get32(scene.bytes(), 40) - 4096) {
         for (uint32_t& place : cell)

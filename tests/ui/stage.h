@@ -52,7 +52,7 @@ class Stage {
 public:
     explicit Stage(const Scene& scene, std::unique_ptr<RegModel> key_model = std::make_unique<RegModel>());
 
-    // The key at a path of names below the invisible root; fails the test when there is none.
+    // The key at a path of names below the invisible root; invalid when there is none.
     QModelIndex key(const QString& path) const;
     void select_key(const QString& path) const { keys->setCurrentIndex(key(path)); }
     // Makes the first value of that name the current one of its key's table, which gets the keyboard.
