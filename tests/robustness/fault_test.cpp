@@ -161,6 +161,7 @@ INSTANTIATE_TEST_SUITE_P(Calls, Faults,
 class AllocationFaultSweep : public testing::TestWithParam<bool> {};
 
 TEST_P(AllocationFaultSweep, NothingElseIsHarmed) {
+    uint64_t struck_times = 0;
     for (const Expectation& expected : made_expectations()) {
         for (uint64_t nth = 1;; nth++) {
             SCOPED_TRACE(expected.operation.name + ", allocation " + std::to_string(nth));
@@ -180,8 +181,10 @@ TEST_P(AllocationFaultSweep, NothingElseIsHarmed) {
                 EXPECT_EQ(status, R_SUCCESS);
                 break;
             }
+            struck_times++;
         }
     }
+    EXPECT_GT(struck_times, 0U);
 }
 
 INSTANTIATE_TEST_SUITE_P(Once, AllocationFaultSweep, testing::Values(false, true),
@@ -206,8 +209,10 @@ TEST(FailedWalk, TheBinsFreeSpaceIsUsedAgain) {
         const size_t size = scene.bytes().size();
         EXPECT_EQ(scene.Set("Key", "second", 3, data), R_SUCCESS);
         EXPECT_EQ(scene.bytes().size(), size);
-        if (!struck)
+        if (!struck) {
+            EXPECT_GT(nth, 1U);
             break;
+        }
     }
 }
 
@@ -228,8 +233,10 @@ TEST(FailedAllocation, AHandleCountsTheKeyThatItMade) {
         }
         const bool is_there = static_cast<bool>(scene.OpenKey("Rooted\\m25"));
         EXPECT_EQ(subkey_names(key.get()).size(), before + (is_there ? 1 : 0));
-        if (!struck)
+        if (!struck) {
+            EXPECT_GT(nth, 1U);
             break;
+        }
     }
 }
 
