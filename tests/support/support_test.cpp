@@ -70,6 +70,22 @@ TEST(Support, no_free_space_leaves_no_free_cell) {
     EXPECT_EQ(scene.Check(), "");
 }
 
+HiveLayout chain(int keys) {
+    HiveLayout layout;
+    KeyLayout* last = &layout.root;
+    for (int i = 0; i < keys; ++i)
+        last = &last->add("Below");
+    return layout;
+}
+
+HiveLayout sample_with_hints() {
+    HiveLayout layout = sample();
+    layout.leaf = Leaf::fast;
+    return layout;
+}
+
+TEST(Support, keys_512_deep_are_no_fault) { EXPECT_EQ(check_hive(lay_out(chain(512)).bytes).text(), ""); }
+
 struct Damage {
     const char* rule;
     void (*apply)(LaidHive&);
@@ -109,6 +125,14 @@ INSTANTIATE_TEST_SUITE_P(
                     Damage{"class", [](LaidHive& h) { h.put16(h.at("").record, 74, 400); }},
                     Damage{"index", [](LaidHive& h) { h.put16(h.at("").index, 0, 0x4141); }},
                     Damage{"hash", [](LaidHive& h) { h.put32(h.at("").index, 8, 5); }},
+                    Damage{"hint",
+                           [](LaidHive& h) {
+                               h = lay_out(sample_with_hints());
+                               h.put32(h.at("").index, 8, 5);
+                           }},
+                    Damage{"depth", [](LaidHive& h) { h = lay_out(chain(513)); }},
+                    Damage{"security", [](LaidHive& h) { h.put32(h.at("Alpha").record, 44, none); }},
+                    Damage{"security", [](LaidHive& h) { h.put32(h.security[0], 16, 4096); }},
                     Damage{"order",
                            [](LaidHive& h) {
                                const uint32_t leaf = h.at("many_keys").leaves[0];
