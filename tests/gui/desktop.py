@@ -112,10 +112,13 @@ def text_of(field):
 class Program:
     """One run of a program, its windows and what shows in them."""
 
-    def __init__(self, arguments, log):
+    def __init__(self, arguments, log, environment=None):
+        """environment: instead of the test's own."""
         self.log = log
         with open(log, "wb") as output:
-            self.process = subprocess.Popen(arguments, stdin=subprocess.DEVNULL, stdout=output, stderr=output)
+            self.process = subprocess.Popen(
+                arguments, stdin=subprocess.DEVNULL, stdout=output, stderr=output, env=environment
+            )
         self._last_click = (-99, -99, 0.0)
         self._shown = []
         self._listener = Atspi.EventListener.new(self._note_event)

@@ -8,16 +8,11 @@ import pathlib
 import subprocess
 import sys
 import tempfile
-import time
-import warnings
 
 import translation_files
 
-warnings.filterwarnings("ignore", category=DeprecationWarning)
-import gi  # noqa: E402
-
-gi.require_version("Atspi", "2.0")
-from gi.repository import Atspi, GLib  # noqa: E402
+sys.path.insert(0, str(pathlib.Path(__file__).resolve().parent.parent / "gui"))
+from desktop import Program, children, name, role, until  # noqa: E402
 
 TITLES = ["&File", "&Edit", "&View"]
 # Every entry below the titles, in the order of the window, the "New" menu's own inside it.
@@ -27,46 +22,11 @@ DEFAULT_REGION = {"de": "de_DE", "es": "es_ES", "fr": "fr_FR", "it": "it_IT", "j
                   "nl": "nl_NL", "pl": "pl_PL", "ru": "ru_RU", "tr": "tr_TR", "uk": "uk_UA"}
 
 
-def until(condition, what, timeout=20):
-    end = time.monotonic() + timeout
-    while time.monotonic() < end:
-        try:
-            value = condition()
-        except GLib.Error:
-            value = None
-        if value:
-            return value
-        time.sleep(0.02)
-    raise AssertionError(f"waited {timeout} s for {what}")
-
-
-def children(thing):
-    return [thing.get_child_at_index(i) for i in range(thing.get_child_count())]
-
-
-def find(thing, role):
-    if thing.get_role_name() == role:
-        return thing
-    for child in children(thing):
-        found = child and find(child, role)
-        if found:
-            return found
-    return None
-
-
-def menu_bar(process):
-    for program in children(Atspi.get_desktop(0)):
-        if program and program.get_process_id() == process:
-            return find(program, "menu bar")
-    return None
-
-
 def texts_below(thing):
     texts = []
     for child in children(thing):
-        name = child.get_name()
-        if name and child.get_role_name() != "popup menu" and child.get_role_name() != "separator":
-            texts.append(name)
+        if name(child) and role(child) not in ("popup menu", "separator"):
+            texts.append(name(child))
         texts += texts_below(child)
     return texts
 
@@ -83,32 +43,29 @@ def wanted_texts(path):
     return titles, entries
 
 
-def check(program, hive, path):
+def check(program, hive, path, log):
     locale = path.stem.removeprefix("tallowfen_")
     titles, entries = wanted_texts(path)
     environment = {**os.environ, "LC_ALL": DEFAULT_REGION.get(locale, locale) + ".UTF-8"}
     environment.pop("LANGUAGE", None)
-    with subprocess.Popen([program, "Sample/SYSTEM", hive], env=environment, stderr=subprocess.DEVNULL) as process:
-        try:
-            bar = until(lambda: menu_bar(process.pid), f"the menu bar under {locale}")
-            until(lambda: [child.get_name() for child in children(bar)] == titles,
-                  f"the titles {titles} under {locale}; there are {[c.get_name() for c in children(bar)]}")
-            below = [text for title in children(bar) for text in texts_below(title)]
-            assert below == entries, f"under {locale} the menus hold {below}, wanted {entries}"
-        finally:
-            process.terminate()
+    running = Program([program, "Sample/SYSTEM", hive], log, environment)
+    try:
+        bar = running.find(None, kind="menu bar")
+        until(lambda: [name(child) for child in children(bar)] == titles, f"the titles {titles} under {locale}")
+        below = [text for title in children(bar) for text in texts_below(title)]
+        assert below == entries, f"under {locale} the menus hold {below}, wanted {entries}"
+    finally:
+        running.end()
 
 
 def main():
     program, make_sample_hive, translations = sys.argv[1:]
-    Atspi.init()
-    Atspi.set_timeout(10000, 15000)
     files = sorted(pathlib.Path(translations).glob("*.ts"))
     with tempfile.TemporaryDirectory(prefix="tallowfen-menus-") as scratch:
         hive = os.path.join(scratch, "SYSTEM")
         subprocess.run([make_sample_hive, hive], check=True)
         for path in files:
-            check(program, hive, path)
+            check(program, hive, path, os.path.join(scratch, "log"))
     print(f"the menus in {len(files)} languages")
 
 
