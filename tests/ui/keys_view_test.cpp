@@ -327,6 +327,7 @@ void KeysViewTest::a_rename_to_a_sibling_s_name_is_told() {
 void KeysViewTest::actions_of_the_other_view_do_nothing_here() {
     const Scene scene;
     Stage stage(scene);
+    const DialogHand hand;
     stage.select_key(alpha + QStringLiteral("\\Leaf"));
     // Nothing is selected in the table, so there is nothing to ask about there.
     stage.values->setFocus();
@@ -337,8 +338,7 @@ void KeysViewTest::actions_of_the_other_view_do_nothing_here() {
     shared_actions().rename_action->setEnabled(true);
     shared_actions().delete_action->trigger();
     shared_actions().rename_action->trigger();
-    QCoreApplication::processEvents();
-    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    QVERIFY(hand.nothing_comes());
     QVERIFY(!stage.keys->findChild<QLineEdit*>());
     QCOMPARE(scene.bytes(), before);
 }
@@ -356,8 +356,7 @@ void KeysViewTest::typing_passes_over_a_key_without_a_name() {
     stage.return_to(*stage.keys);
     QTest::keyClicks(stage.keys, QStringLiteral("ze"));
     QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));
-    QCoreApplication::processEvents();
-    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    QVERIFY(hand.nothing_comes());
     // Round the end, past it again.
     stage.keys->keyboardSearch(QStringLiteral("ta"));
     QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));

@@ -23,7 +23,8 @@
 #include <functional>
 #include <utility>
 
-// Answers the modal dialogs that open one after the other, each by the next step, from inside its event loop.
+// Answers the modal dialogs that open one after the other, each by the next step, from inside its event loop. One that
+// opens when no step is left fails the test and is closed: it would hold the call under test for good.
 class DialogHand {
 public:
     using Step = std::function<void(QWidget*)>;
@@ -61,6 +62,12 @@ public:
 
     bool is_done() const { return m_steps.empty(); }
 
+    // Lets what is queued come; false when a dialog was or is among it that no step waits for.
+    bool nothing_comes() const {
+        QCoreApplication::processEvents();
+        return !m_was_surprised && !QApplication::activeModalWidget();
+    }
+
     // Of the last box that was pressed.
     QMessageBox::Icon icon = QMessageBox::NoIcon;
     QString title;
@@ -72,14 +79,20 @@ public:
 private:
     void look() {
         QWidget* dialog = QApplication::activeModalWidget();
-        if (m_steps.empty() || !dialog || !dialog->isVisible() || dialog == m_answered) {
+        if (!dialog || !dialog->isVisible()) {
             return;
         }
         const bool is_searching = dialog->accessibleName() == QStringLiteral("Searching...");
-        if (is_searching != m_steps.front().second) {
+        if (m_steps.empty()) {
+            if (!is_searching && !m_answered.contains(dialog)) {
+                refuse(*dialog);
+            }
             return;
         }
-        m_answered = dialog;
+        if ((!m_answered.isEmpty() && dialog == m_answered.last()) || is_searching != m_steps.front().second) {
+            return;
+        }
+        m_answered.append(dialog);
         const Step step = std::move(m_steps.front().first);
         m_steps.pop_front();
         // Not from inside the timer's own event: a step may open the next dialog before it returns.
@@ -91,8 +104,17 @@ private:
         });
     }
 
+    void refuse(QWidget& dialog) {
+        m_was_surprised = true;
+        const auto* box = qobject_cast<QMessageBox*>(&dialog);
+        const QString what = box ? box->text() : dialog.windowTitle();
+        QTest::qFail(qPrintable(QStringLiteral("a dialog that no step waits for: ") + what), __FILE__, __LINE__);
+        dialog.hide();
+    }
+
     QTimer m_timer;
-    QPointer<QWidget> m_answered;
+    QList<QPointer<QWidget>> m_answered;
+    bool m_was_surprised = false;
     std::deque<std::pair<Step, bool>> m_steps;  // and whether it is for the search's dialog
 };
 

@@ -206,11 +206,11 @@ void ValuesViewTest::data_that_cannot_be_edited_is_told() {
 void ValuesViewTest::other_columns_open_nothing() {
     const Scene scene;
     Stage stage(scene);
+    const DialogHand hand;
     stage.select_key(alpha);
     for (int column : {1, 2}) {
         double_click(stage, stage.value(QStringLiteral("text"), column));
-        QCoreApplication::processEvents();
-        QCOMPARE(QApplication::activeModalWidget(), nullptr);
+        QVERIFY(hand.nothing_comes());
         QVERIFY(!stage.values->findChild<QLineEdit*>());
     }
 }
@@ -218,11 +218,10 @@ void ValuesViewTest::other_columns_open_nothing() {
 void ValuesViewTest::return_opens_the_editor_and_enter_does_not() {
     const Scene scene;
     Stage stage(scene);
+    DialogHand hand;
     stage.select_value(alpha, QStringLiteral("dword"));
     QTest::keyClick(stage.values, Qt::Key_Enter);
-    QCoreApplication::processEvents();
-    QCOMPARE(QApplication::activeModalWidget(), nullptr);
-    DialogHand hand;
+    QVERIFY(hand.nothing_comes());
     QString title;
     hand.then([&](QWidget* dialog) {
         title = dialog->windowTitle();
@@ -236,12 +235,13 @@ void ValuesViewTest::return_opens_the_editor_and_enter_does_not() {
 void ValuesViewTest::return_in_a_name_ends_the_name_only() {
     const Scene scene;
     Stage stage(scene);
+    const DialogHand hand;
     stage.select_value(alpha, QStringLiteral("dword"));
     shared_actions().rename_action->trigger();
     stage.press_in_editor(QStringLiteral("renamed"), Qt::Key_Return);
     QTRY_VERIFY(stored(stage, QStringLiteral("renamed")));
     QTRY_VERIFY(stage.values->hasFocus());
-    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    QVERIFY(hand.nothing_comes());
 }
 
 void ValuesViewTest::saving_the_value_that_is_not_set_makes_it() {
@@ -269,6 +269,7 @@ void ValuesViewTest::saving_the_value_that_is_not_set_makes_it() {
 void ValuesViewTest::the_context_menu_of_a_value() {
     const Scene scene;
     Stage stage(scene);
+    const DialogHand hand;
     stage.select_key(alpha);
     const QPoint point = stage.values->visualRect(stage.value(QStringLiteral("text"))).center();
     QVERIFY(with_context_menu(*stage.values, point, [](QMenu& menu) {
@@ -277,7 +278,7 @@ void ValuesViewTest::the_context_menu_of_a_value() {
         QCOMPARE(menu.actions()[2], shared_actions().rename_action);
         QCOMPARE(menu.parentWidget(), nullptr);
     }));
-    QCOMPARE(QApplication::activeModalWidget(), nullptr);
+    QVERIFY(hand.nothing_comes());
 }
 
 void ValuesViewTest::edit_of_the_context_menu() {
