@@ -106,7 +106,7 @@ bool lay_bin(Store& store, const Bin& bin) {
     header.signature = sig_bin;
     header.offset = bin.offset;
     header.size = bin.size;
-    memset(header.reserved, 'x', sizeof header.reserved);
+    memset(header.reserved, 'x', sizeof header.reserved);  // tells a bin that was appended here; Windows has zeros
     header.spare = bin.size;
     return write_at(store, sig_bin, start, &header, sizeof header) == sizeof header &&
            write_size(store, start + bin_header_size, static_cast<int32_t>(bin.size - bin_header_size));
@@ -179,11 +179,10 @@ CellOffset allocate(Store& store, uint32_t n) {
         if (offset == CellOffset::none)
             return CellOffset::none;
     }
-    const uint32_t rest = free_size - size;
-    if (rest > 4 && !write_size(store, cell_position(offset) + size, static_cast<int32_t>(rest)))
+    const uint32_t rest = free_size - size;  // a multiple of 8, as both sizes are
+    if (rest != 0 && !write_size(store, cell_position(offset) + size, static_cast<int32_t>(rest)))
         return CellOffset::none;
-    const uint32_t taken = rest > 4 ? size : free_size;
-    if (!change_size(store, cell_position(offset), static_cast<int32_t>(free_size), -static_cast<int32_t>(taken)))
+    if (!change_size(store, cell_position(offset), static_cast<int32_t>(free_size), -static_cast<int32_t>(size)))
         return CellOffset::none;
     return offset;
 }

@@ -35,8 +35,7 @@ bool create_path(RegistryKey& key, const char* path, CellOffset& offset, uint32_
     return true;
 }
 
-// Frees a list's cell that only the key referred to. One that a key without entries still names is freed when it is
-// an emptied leaf; anything else there may be another's.
+// Frees the emptied leaf that a key without subkeys may still have. Anything else that it leads to may be another's.
 void free_index_cell(Store& store, const KeyRecord& key) {
     const CellOffset offset = cell_offset(key.subkey_index);
     SubkeyIndex index = {};
@@ -46,10 +45,10 @@ void free_index_cell(Store& store, const KeyRecord& key) {
     free_index(index);
 }
 
-// Frees what a key owned that nothing leads to any more. Of its values' records every other one goes, beginning with
-// the first, as when each was removed by its place in a list that closes up; the rest, and all data cells, stay
-// allocated.
-void free_key(Store& store, const KeyView& key, CellOffset parent) {
+// Frees what a key owned that nothing leads to any more. Of its values' records only every other one, beginning with
+// the first: a deletion takes values off by ascending position from a list that closes up behind each, and a hive that
+// was written here is the same, cell by cell, as ever. The rest, and all data cells, stay allocated.
+void free_key(Store& store, const KeyView& key, const KeyView& parent) {
     const ValueList values = find_value_list(store, key.record);
     for (uint32_t i = 0; i < values.count; i += 2) {
         ValueView value;
@@ -60,9 +59,10 @@ void free_key(Store& store, const KeyView& key, CellOffset parent) {
     free_index_cell(store, key.record);
     if (values.count > 0 && !is_record(store, values.cell))
         free_cell(store, values.cell.offset);
-    drop_security_reference(store, cell_offset(key.record.security));
+    const CellOffset security = cell_offset(key.record.security);
+    drop_security_reference(store, security, security == cell_offset(parent.record.security));
     // Another list may have led to this key as well: what takes its cell need not stand in order there.
-    if (store.sorted_key != parent)
+    if (store.sorted_key != parent.offset())
         store.sorted_key = CellOffset::none;
     free_cell(store, key.offset());
 }
@@ -87,11 +87,11 @@ int32_t delete_at(RegistryKey& handle, const PathEnd& end) {
     else if (index.whole && index.total == parent.record.subkey_count &&
              subkey_at(store, index, end.position) == end.key)
         status = check_own_lists(store, key);
-    if (status == R_SUCCESS && !remove_subkey(store, end.parent, parent.record, index, end.position))
+    if (status == R_SUCCESS && remove_entry(store, end.parent, parent.record, index, end.position) != Outcome::written)
         status = R_FAILED;
     free_index(index);
     if (status == R_SUCCESS)
-        free_key(store, key, end.parent);
+        free_key(store, key, parent);
     if (end.parent == handle.info->own)
         reread_counts(handle);
     return status;
@@ -102,6 +102,7 @@ int32_t delete_at(RegistryKey& handle, const PathEnd& end) {
 int32_t RCreateKey(RegistryKey* key, const char* path, RegistryKey** out, uint32_t* out_disposition) {
     if (out == nullptr)
         return R_INVALID_PARAMETER;
+    *out = nullptr;
     const int32_t opened = ROpenKey(key, path, out);
     if (opened == R_SUCCESS) {
         if (out_disposition != nullptr)

@@ -106,7 +106,8 @@ int32_t give_name_wide(const RegistryKey& key, uint16_t* name, uint32_t* size) {
     }
     const uint32_t length = info.name_length;
     if (room == 0) {
-        // For a name stored in UTF-16 one byte more, not one character: callers have always been told so.
+        // One byte more even for a name stored in UTF-16, where two would be one character: the size that a caller of
+        // this function counts on.
         *size = info.wide() ? length + 1 : 2 * (length + 1);
         return R_SUCCESS;
     }

@@ -109,6 +109,9 @@ int32_t give_data(Store& store, const ValueView& value, void* data, uint32_t* da
     return status;
 }
 
+// 2 is said only of a name that no record can have: a caller may go on to store a value of that name.
+int32_t missing_status(int32_t position) { return position == no_value ? R_FILE_NOT_FOUND : R_FAILED; }
+
 }  // namespace
 
 int32_t REnumValueA(RegistryKey* key, uint32_t index, char* name, uint32_t* name_size, uint32_t* out_type, void* data,
@@ -140,23 +143,24 @@ int32_t REnumValueW(RegistryKey* key, uint32_t index, uint16_t* name, uint32_t* 
 int32_t RFindValueA(RegistryKey* key, const char* name) {
     if (!is_key(key))
         return R_FAILED;
-    return position_of_value(*key->store, current_values(*key), name);
+    const int32_t position = position_of_value(*key->store, current_values(*key), name);
+    return position >= 0 ? position : int32_t{R_FAILED};
 }
 
 int32_t RQueryValueExA(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size) {
     if (!is_key(key))
         return R_INVALID_HANDLE;
-    const int32_t index = RFindValueA(key, name);
-    if (index < 0)
-        return R_FILE_NOT_FOUND;
-    return REnumValueA(key, static_cast<uint32_t>(index), nullptr, nullptr, out_type, data, data_size);
+    const int32_t position = position_of_value(*key->store, current_values(*key), name);
+    if (position < 0)
+        return missing_status(position);
+    return REnumValueA(key, static_cast<uint32_t>(position), nullptr, nullptr, out_type, data, data_size);
 }
 
 int32_t RQueryValueExW(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size) {
     if (!is_key(key))
         return R_INVALID_HANDLE;
-    const int32_t index = RFindValueA(key, name);
-    if (index < 0)
-        return R_FILE_NOT_FOUND;
-    return REnumValueW(key, static_cast<uint32_t>(index), nullptr, nullptr, out_type, data, data_size);
+    const int32_t position = position_of_value(*key->store, current_values(*key), name);
+    if (position < 0)
+        return missing_status(position);
+    return REnumValueW(key, static_cast<uint32_t>(position), nullptr, nullptr, out_type, data, data_size);
 }

@@ -71,6 +71,10 @@ constexpr uint32_t sig_index_leaf = signature2('l', 'i');
 constexpr uint32_t sig_index_root = signature2('r', 'i');
 constexpr uint32_t largest_short_signature = 32766;
 
+constexpr bool is_leaf_signature(uint32_t signature) {
+    return signature == sig_fast_leaf || signature == sig_hash_leaf || signature == sig_index_leaf;
+}
+
 struct BaseBlock {
     Le32 signature;
     uint8_t before_root[32];
@@ -92,6 +96,8 @@ struct BinHeader {
     Le32 spare;  // in the first bin: the size of all bins
 };
 static_assert(sizeof(BinHeader) == bin_header_size);
+static_assert(offsetof(BinHeader, offset) == 4);
+static_assert(offsetof(BinHeader, size) == 8);
 static_assert(offsetof(BinHeader, spare) == 28);
 
 constexpr uint16_t key_is_root = 0x0004;
@@ -113,7 +119,8 @@ struct KeyRecord {
     Le32 value_list;
     Le32 security;
     Le32 class_name;
-    Le32 longest_subkey;  // bytes, two a character
+    Le16 longest_subkey;  // bytes, two a character
+    Le16 subtree_flags;   // Windows keeps flags of its own here since Vista; 0 in older hives
     Le32 longest_class;   // bytes
     Le32 longest_value;   // bytes, two a character
     Le32 largest_data;    // bytes
@@ -122,15 +129,26 @@ struct KeyRecord {
     Le16 class_length;  // bytes
 };
 static_assert(sizeof(KeyRecord) == 76);
+static_assert(offsetof(KeyRecord, flags) == 2);
+static_assert(offsetof(KeyRecord, time_low) == 4);
+static_assert(offsetof(KeyRecord, time_high) == 8);
 static_assert(offsetof(KeyRecord, parent) == 16);
 static_assert(offsetof(KeyRecord, subkey_count) == 20);
 static_assert(offsetof(KeyRecord, subkey_index) == 28);
+static_assert(offsetof(KeyRecord, volatile_index) == 32);
 static_assert(offsetof(KeyRecord, value_count) == 36);
+static_assert(offsetof(KeyRecord, value_list) == 40);
 static_assert(offsetof(KeyRecord, security) == 44);
+static_assert(offsetof(KeyRecord, class_name) == 48);
 static_assert(offsetof(KeyRecord, longest_subkey) == 52);
+static_assert(offsetof(KeyRecord, subtree_flags) == 54);
+static_assert(offsetof(KeyRecord, longest_class) == 56);
+static_assert(offsetof(KeyRecord, longest_value) == 60);
 static_assert(offsetof(KeyRecord, largest_data) == 64);
+static_assert(offsetof(KeyRecord, work) == 68);
 static_assert(offsetof(KeyRecord, name_length) == 72);
-constexpr uint32_t new_key_work = 0xB2B2B2B2;
+static_assert(offsetof(KeyRecord, class_length) == 74);
+constexpr uint32_t new_key_work = 0xB2B2B2B2;  // no reader looks at it: it marks the keys made here
 
 constexpr uint16_t value_name_8bit = 0x0001;
 constexpr uint32_t data_inline = 0x80000000;
@@ -146,10 +164,13 @@ struct ValueRecord {
     Le16 spare;
 };
 static_assert(sizeof(ValueRecord) == 20);
+static_assert(offsetof(ValueRecord, name_length) == 2);
+static_assert(offsetof(ValueRecord, size) == 4);
+static_assert(offsetof(ValueRecord, data) == 8);
 static_assert(offsetof(ValueRecord, type) == 12);
 static_assert(offsetof(ValueRecord, flags) == 16);
 
-// The fixed part of a security record; the descriptor follows and is never looked at.
+// The fixed part of a security record; the descriptor follows. Of that the first byte, its revision, is read at most.
 struct SecurityRecord {
     Le16 signature;
     Le16 reserved;
@@ -159,7 +180,10 @@ struct SecurityRecord {
     Le32 descriptor_length;
 };
 static_assert(sizeof(SecurityRecord) == 20);
+static_assert(offsetof(SecurityRecord, next) == 4);
+static_assert(offsetof(SecurityRecord, previous) == 8);
 static_assert(offsetof(SecurityRecord, references) == 12);
+static_assert(offsetof(SecurityRecord, descriptor_length) == 16);
 
 struct BigDataRecord {
     Le16 signature;
@@ -167,6 +191,8 @@ struct BigDataRecord {
     Le32 segment_list;
 };
 static_assert(sizeof(BigDataRecord) == 8);
+static_assert(offsetof(BigDataRecord, segment_count) == 2);
+static_assert(offsetof(BigDataRecord, segment_list) == 4);
 constexpr uint32_t segment_size = 16344;
 
 // Head of every subkey index; a leaf's or root's entries follow.
@@ -175,6 +201,7 @@ struct IndexHead {
     Le16 count;
 };
 static_assert(sizeof(IndexHead) == 4);
+static_assert(offsetof(IndexHead, count) == 2);
 
 // An entry of "lf" and "lh"; an "li" leaf and an "ri" root hold the offset alone.
 struct LeafEntry {
@@ -182,6 +209,7 @@ struct LeafEntry {
     Le32 hint;  // "lf": first four bytes of the name; "lh": hash of the name
 };
 static_assert(sizeof(LeafEntry) == 8);
+static_assert(offsetof(LeafEntry, hint) == 4);
 constexpr uint32_t leaf_limit = 65535;  // entries that a leaf's count can say
 
 constexpr uint32_t depth_limit = 512;  // levels below the root, as Windows allows

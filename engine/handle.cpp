@@ -166,14 +166,7 @@ ValueList& current_values(RegistryKey& handle) {
 }
 
 CellOffset listed_subkey(RegistryKey& handle, uint32_t position) {
-    OffsetBatch& batch = handle.subkeys;
-    if (!batch.holds(position)) {
-        batch.first = position;
-        batch.count = subkeys_at(*handle.store, handle.index, position, batch.offsets, OffsetBatch::most);
-        if (batch.count == 0)
-            return CellOffset::none;
-    }
-    return batch.offsets[position - batch.first];
+    return subkey_at(*handle.store, handle.index, position, handle.subkeys);
 }
 
 const ValueView* listed_value(RegistryKey& handle, uint32_t position) {

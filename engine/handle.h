@@ -33,18 +33,6 @@ struct KeyInfo {
     bool wide() const { return (flags & key_name_8bit) == 0; }
 };
 
-// Offsets that lie side by side in an index or a list, read together: a caller that goes from one item to the next then
-// reads the items' records without coming back to the list for each, which the one window would have to follow.
-struct OffsetBatch {
-    static constexpr uint32_t most = 32;
-
-    uint32_t first;  // position of the first one
-    uint32_t count;
-    CellOffset offsets[most];
-
-    bool holds(uint32_t position) const { return position >= first && position - first < count; }
-};
-
 }  // namespace engine
 
 struct RegistryKey {
@@ -105,7 +93,8 @@ struct PathEnd {
     uint32_t depth;
 };
 
-// Follows a path down from a handle. 0, 3 when a component is not there, -1 damaged, 8 without memory, 87 no component.
+// Follows a path down from a handle. 0, 3 when a component is not there or cannot be read, 8 without memory, 87 no
+// component.
 int32_t follow_path(RegistryKey& from, const char* path, PathEnd& end);
 // Skips backslashes.
 const char* skip_separators(const char* path);

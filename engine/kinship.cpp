@@ -7,15 +7,10 @@ namespace engine {
 namespace {
 
 uint32_t times_listed(Store& store, const SubkeyIndex& index, CellOffset key) {
-    CellOffset offsets[32];
-    constexpr uint32_t most = sizeof offsets / sizeof offsets[0];
+    OffsetBatch batch = {};
     uint32_t times = 0;
-    for (uint32_t position = 0; position < index.total;) {
-        const uint32_t read = subkeys_at(store, index, position, offsets, most);
-        for (uint32_t i = 0; i < read; i++)
-            times += offsets[i] == key ? 1U : 0U;
-        position += read > 0 ? read : 1;  // an entry that cannot be read leads to no key
-    }
+    for (uint32_t i = 0; i < index.total; i++)
+        times += subkey_at(store, index, i, batch) == key ? 1U : 0U;
     return times;
 }
 

@@ -4,6 +4,7 @@
 
 #include "allocator.h"
 
+#include <cassert>
 #include <cstring>
 
 namespace engine {
@@ -24,11 +25,13 @@ struct LeafBytes {
     uint32_t used() const { return head_size + count * entry_size; }
     uint8_t* entry(uint32_t i) { return block.bytes + head_size + i * entry_size; }
     void insert(uint32_t at, const LeafEntry& entry_bytes) {
+        assert(at <= count);
         memmove(entry(at + 1), entry(at), (count - at) * entry_size);
         memcpy(entry(at), &entry_bytes, entry_size);
         set_count(count + 1);
     }
     void remove(uint32_t at) {
+        assert(at < count);
         memmove(entry(at), entry(at + 1), (count - at - 1) * entry_size);
         set_count(count - 1);
     }
@@ -107,8 +110,8 @@ Outcome add_first(Store& store, CellOffset parent_offset, KeyRecord& parent, con
     Cell cell;
     if (kept != CellOffset::none && find_used_cell(store, kept, cell) && !load_index(store, kept, left))
         return Outcome::unchanged;
-    const bool reusable = left.whole && !left.is_root && left.leaf_count == 1 && left.total == 0 &&
-                          left.cell.room() >= sizeof bytes && is_own_cell(store, kept);
+    const bool reusable =
+        left.whole && !left.is_root && left.leaf_count == 1 && left.total == 0 && left.cell.room() >= sizeof bytes;
     free_index(left);
     const CellOffset leaf = reusable ? kept : allocate(store, sizeof bytes);
     if (leaf == CellOffset::none)
@@ -185,7 +188,7 @@ public:
 
     // Once. The list must have as many entries as when the removal was made.
     Outcome write(Store& store) {
-        if (!is_own_cell(store, list_.cell.offset) || !read_leaf_bytes(store, list_, now_) ||
+        if (!is_used_cell(store, list_.cell.offset) || !read_leaf_bytes(store, list_, now_) ||
             !read_leaf_bytes(store, list_, before_))
             return Outcome::unchanged;
         now_.remove(at_);
@@ -195,6 +198,12 @@ public:
         if (empties_ && outcome == Outcome::written)
             free_leaf(store, leaf_.cell.offset);
         return outcome;
+    }
+    // Puts the entry back in after a write, where that did not empty a leaf.
+    Outcome put_back(Store& store) {
+        assert(!empties_);
+        return rewrite_at(store, record_position(list_.cell.offset), before_.block.bytes, now_.block.bytes,
+                          before_.used());
     }
 
 private:
@@ -215,7 +224,7 @@ bool stays_in_leaf(const SubkeyIndex& index, uint32_t position, uint32_t place) 
 Outcome move_within(Store& store, const Leaf& leaf, uint32_t from, uint32_t to, const LeafEntry& entry) {
     LeafBytes now(leaf);
     LeafBytes before(leaf);
-    if (!is_own_cell(store, leaf.cell.offset) || !read_leaf_bytes(store, leaf, now) ||
+    if (!is_used_cell(store, leaf.cell.offset) || !read_leaf_bytes(store, leaf, now) ||
         !read_leaf_bytes(store, leaf, before))
         return Outcome::unchanged;
     now.remove(from);
@@ -250,7 +259,7 @@ Outcome move_between(Store& store, CellOffset parent_offset, KeyRecord& parent, 
     counted.subkey_count = counted.subkey_count + 1;
     LeafBytes now(target);
     Removal removal(index, position);  // the entry has it from another leaf than the one that it goes to
-    if (!is_own_cell(store, target.cell.offset) || !is_own_cell(store, index.cell.offset) || !removal.has_memory() ||
+    if (!is_used_cell(store, target.cell.offset) || !is_used_cell(store, index.cell.offset) || !removal.has_memory() ||
         !read_leaf_bytes(store, target, now))
         return Outcome::unchanged;
     now.insert(place - target.first, entry_for(target.signature, key, name));
@@ -285,13 +294,13 @@ Outcome add_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, con
     KeyRecord changed = parent;
     changed.subkey_count = changed.subkey_count + 1;
     if (2 * name.length > changed.longest_subkey)
-        changed.longest_subkey = 2 * name.length;
+        changed.longest_subkey = static_cast<uint16_t>(2 * name.length);
     if (index.total == 0)
         return add_first(store, parent_offset, parent, changed, key, name);
     const uint32_t number = leaf_for_new(index, position);
     const Leaf& leaf = index.leaf(number);
     LeafBytes now(leaf);
-    if (!is_own_cell(store, leaf.cell.offset) || !is_own_cell(store, index.cell.offset) ||
+    if (!is_used_cell(store, leaf.cell.offset) || !is_used_cell(store, index.cell.offset) ||
         !read_leaf_bytes(store, leaf, now))
         return Outcome::unchanged;
     now.insert(position - leaf.first, entry_for(leaf.signature, key, name));
@@ -302,13 +311,8 @@ Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, 
                      uint32_t position) {
     if (index.is_root || position >= index.total)
         return Outcome::unchanged;
-    const Leaf& leaf = index.only;
-    LeafBytes before(leaf);
-    LeafBytes now(leaf);
-    if (!read_leaf_bytes(store, leaf, before) || !read_leaf_bytes(store, leaf, now))
-        return Outcome::unchanged;
-    now.remove(position);
-    const Outcome outcome = Removal(index, position).write(store);
+    Removal removal(index, position);
+    const Outcome outcome = removal.write(store);
     if (outcome != Outcome::written)
         return outcome;
     KeyRecord changed = parent;
@@ -317,9 +321,7 @@ Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, 
     if (counted != Outcome::unchanged)
         return counted;
     // The entry goes back in; if it cannot, the leaf stays without it, whole.
-    const Outcome back =
-        rewrite_at(store, record_position(leaf.cell.offset), before.block.bytes, now.block.bytes, before.used());
-    return back == Outcome::written ? Outcome::unchanged : Outcome::unknown;
+    return removal.put_back(store) == Outcome::written ? Outcome::unchanged : Outcome::unknown;
 }
 
 Outcome move_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,

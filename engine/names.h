@@ -25,10 +25,10 @@ constexpr uint32_t longest_key_name = 259;
 
 char upper(char c);
 
-// The order that a search by position goes by: upper-cased through toupper_ptr, characters as signed 8-bit numbers (so
-// bytes above 0x7F come before all ASCII). A stored UTF-16 name takes its place by its units instead.
+// The order in which a path is followed: upper-cased through toupper_ptr, characters as signed 8-bit numbers (so bytes
+// above 0x7F come before all ASCII). A stored UTF-16 name takes its place by its units instead.
 int compare_signed(const Name& searched, const Name& stored);
-// The order that a search in an index goes by: lower-cased as strncasecmp does in the C locale, unsigned.
+// The order in which a name to be made is looked for: lower-cased as strncasecmp does in the C locale, unsigned.
 int compare_index(const Name& searched, const Name& stored);
 // The order in which Windows keeps its lists, as far as 8 bits tell: upper-cased units, unsigned. Two 8-bit names are
 // compared as bytes; beside a UTF-16 name an 8-bit one is widened.

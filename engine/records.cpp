@@ -100,10 +100,6 @@ uint32_t signature_at(Store& store, CellOffset offset) {
     return signature;
 }
 
-bool is_index_signature(uint32_t signature) {
-    return signature == sig_fast_leaf || signature == sig_hash_leaf || signature == sig_index_leaf;
-}
-
 // One of an index's first entries leads to a key, a root's to a leaf.
 bool is_index_record(Store& store, const Cell& cell, const IndexHead& head) {
     constexpr uint32_t few = 16;
@@ -116,7 +112,7 @@ bool is_index_record(Store& store, const Cell& cell, const IndexHead& head) {
         return false;
     for (uint32_t i = 0; i < count; i++) {
         const uint32_t below = signature_at(store, cell_offset(entries[i * per_entry]));
-        if (head.signature == sig_index_root ? is_index_signature(below) : below == sig_key)
+        if (head.signature == sig_index_root ? is_leaf_signature(below) : below == sig_key)
             return true;
     }
     return false;
@@ -165,7 +161,7 @@ bool is_record(Store& store, const Cell& cell) {
     case sig_index_root:
         return is_index_record(store, cell, head);
     default:
-        return is_index_signature(head.signature) && is_index_record(store, cell, head);
+        return is_leaf_signature(head.signature) && is_index_record(store, cell, head);
     }
 }
 

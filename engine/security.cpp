@@ -23,15 +23,12 @@ bool unlink(Store& store, CellOffset self, const SecurityRecord& record) {
     const CellOffset previous = cell_offset(record.previous);
     if (next == self || previous == self)
         return false;
-    const auto is_there = [&](CellOffset offset, SecurityRecord& neighbour) {
-        return read_security(store, offset, neighbour) && is_own_cell(store, offset);
-    };
     SecurityRecord after;
     SecurityRecord before;
     const bool has_next = static_cast<int32_t>(next) > 0;
     const bool has_previous = static_cast<int32_t>(previous) > 0;
-    if ((has_next && (!is_there(next, after) || cell_offset(after.previous) != self)) ||
-        (has_previous && (!is_there(previous, before) || cell_offset(before.next) != self)))
+    if ((has_next && (!read_security(store, next, after) || cell_offset(after.previous) != self)) ||
+        (has_previous && (!read_security(store, previous, before) || cell_offset(before.next) != self)))
         return false;
     if (has_next) {
         const SecurityRecord unchanged = after;
@@ -56,17 +53,17 @@ bool add_security_reference(Store& store, CellOffset security) {
     if (static_cast<int32_t>(security) < 0)
         return true;
     SecurityRecord record;
-    if (!read_security(store, security, record) || record.references == UINT32_MAX || !is_own_cell(store, security))
+    if (!read_security(store, security, record) || record.references == UINT32_MAX)
         return false;
     SecurityRecord raised = record;
     raised.references = record.references + 1;
     return rewrite_security(store, security, record, raised);
 }
 
-void drop_security_reference(Store& store, CellOffset security) {
+void drop_security_reference(Store& store, CellOffset security, bool still_used) {
     SecurityRecord record;
     if (static_cast<int32_t>(security) < 0 || !read_security(store, security, record) || record.references < 1 ||
-        !is_own_cell(store, security))
+        (still_used && record.references == 1))
         return;
     if (record.references == 1 && unlink(store, security, record)) {
         free_cell(store, security);

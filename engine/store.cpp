@@ -186,7 +186,7 @@ bool build_bin_table(Store& store) {
     // Root and index must be cells in use, or the next value might be put over them.
     Cell cell;
     return offset == bins_size && find_used_cell(store, store.root, cell) && cell.room() >= sizeof root &&
-           (root.subkey_count == 0 || is_own_cell(store, store.root_index));
+           (root.subkey_count == 0 || is_used_cell(store, store.root_index));
 }
 
 }  // namespace
@@ -396,7 +396,7 @@ bool find_cell(Store& store, CellOffset offset, Cell& cell) {
 
 bool find_used_cell(Store& store, CellOffset offset, Cell& cell) { return find_cell(store, offset, cell) && cell.used; }
 
-bool is_own_cell(Store& store, CellOffset offset) {
+bool is_used_cell(Store& store, CellOffset offset) {
     Cell cell;
     return find_used_cell(store, offset, cell);
 }

@@ -104,14 +104,14 @@ bool find_cell(Store& store, CellOffset offset, Cell& cell);
 // The same for a cell that is in use.
 bool find_used_cell(Store& store, CellOffset offset, Cell& cell);
 // Whether it is a cell in use: only then may it be written to, freed or replaced.
-bool is_own_cell(Store& store, CellOffset offset);
+bool is_used_cell(Store& store, CellOffset offset);
 
 // Reads up to length bytes of the record in a cell in use, never past its end; returns how many, 0 on failure.
 uint32_t read_record(Store& store, uint32_t signature, CellOffset offset, void* buffer, uint32_t length);
 // Reads exactly length bytes, skip bytes into the cell's record.
 bool read_part(Store& store, const Cell& cell, uint32_t skip, void* buffer, uint32_t length);
 
-// Finds the bin that holds an offset (not its header); null when none does.
+// Finds the bin that holds an offset, its header included; null when none does.
 Bin* bin_of(Store& store, CellOffset offset);
 // Reads the bin's header and walks its cells; fills bin, and with map the bin's share of the cell map; returns the end
 // of the walk, counted from the first bin, or -1, what the walk did not reach then being as it was in the map.

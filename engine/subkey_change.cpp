@@ -83,16 +83,17 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
             free_cell(store, key);
     }
     if (new_reference && outcome == Outcome::unchanged)
-        drop_security_reference(store, security);
+        drop_security_reference(store, security, true);
     return Inserted::failed;
 }
 
 // Sets the parent of the first count subkeys of the key at own, but for those that it merely lists. Returns how many
 // were seen to.
 uint32_t set_parents(Store& store, CellOffset own, const SubkeyIndex& children, uint32_t count, CellOffset parent) {
+    OffsetBatch batch = {};
     for (uint32_t i = 0; i < count; i++) {
         KeyView child;
-        const CellOffset offset = subkey_at(store, children, i);
+        const CellOffset offset = subkey_at(store, children, i, batch);
         if (!read_key(store, offset, child))
             return i;
         if (has_other_parent(store, own, child))
@@ -106,17 +107,14 @@ uint32_t set_parents(Store& store, CellOffset own, const SubkeyIndex& children, 
 }
 
 // Puts the renamed record in the old one's place; both are complete. Every child knows the new one already.
-int32_t switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position, const Name& name,
+Outcome switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position, const Name& name,
                        uint32_t place, CellOffset renamed) {
     KeyRecord changed = parent.record;
     if (2 * name.length > changed.longest_subkey)
-        changed.longest_subkey = 2 * name.length;
+        changed.longest_subkey = static_cast<uint16_t>(2 * name.length);
     if (rewrite_key(store, parent.offset(), parent.record, changed) != Outcome::written)
-        return R_CAN_NOT_COMPLETE;
-    const Outcome outcome = move_entry(store, parent.offset(), parent.record, index, position, place, renamed, name);
-    if (outcome == Outcome::unknown)
-        return R_FAILED;
-    return outcome == Outcome::written ? R_SUCCESS : R_CAN_NOT_COMPLETE;
+        return Outcome::unchanged;
+    return move_entry(store, parent.offset(), parent.record, index, position, place, renamed, name);
 }
 
 int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position,
@@ -131,10 +129,10 @@ int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, u
     if (renamed == CellOffset::none)
         return R_FAILED;
     const uint32_t set = set_parents(store, old.offset(), children, children.total, renamed);
-    int32_t status = R_CAN_NOT_COMPLETE;
+    Outcome outcome = Outcome::unchanged;
     if (set == children.total)
-        status = switch_records(store, parent, index, position, name, place, renamed);
-    if (status == R_SUCCESS) {
+        outcome = switch_records(store, parent, index, position, name, place, renamed);
+    if (outcome == Outcome::written) {
         // A note about the order of the key's own list goes with it; one about another list, which may have led to the
         // old record as well, does not hold for whatever takes its cell.
         if (store.sorted_key == old.offset())
@@ -142,11 +140,11 @@ int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, u
         else if (store.sorted_key != parent.offset())
             store.sorted_key = CellOffset::none;
         free_cell(store, old.offset());
-    } else if (status == R_CAN_NOT_COMPLETE) {
+    } else if (outcome == Outcome::unchanged) {
         set_parents(store, old.offset(), children, set, old.offset());
         free_cell(store, renamed);
     }
-    return status == R_FAILED ? R_CAN_NOT_COMPLETE : status;
+    return outcome == Outcome::written ? R_SUCCESS : R_CAN_NOT_COMPLETE;
 }
 
 }  // namespace
@@ -158,18 +156,11 @@ int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, u
 Inserted insert_subkey(Store& store, CellOffset parent_offset, const Name& name, bool new_reference, CellOffset& key) {
     KeyView parent;
     SubkeyIndex index;
-    if (!read_key(store, parent_offset, parent) || !is_own_cell(store, parent_offset) ||
-        !load_key_index(store, parent.record, index))
+    if (!read_key(store, parent_offset, parent) || !load_key_index(store, parent.record, index))
         return Inserted::failed;
     const Inserted result = insert_into(store, parent, index, name, new_reference, key);
     free_index(index);
     return result;
-}
-
-bool remove_subkey(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
-                   uint32_t position) {
-    return is_own_cell(store, parent_offset) &&
-           remove_entry(store, parent_offset, parent, index, position) == Outcome::written;
 }
 
 // A rename, in turn, and what a stop after each leaves:
@@ -183,8 +174,7 @@ int32_t rename_subkey(Store& store, CellOffset parent_offset, uint32_t position,
     SubkeyIndex index = {};
     SubkeyIndex children = {};
     int32_t status = R_CAN_NOT_COMPLETE;
-    if (read_key(store, parent_offset, parent) && is_own_cell(store, parent_offset) &&
-        load_key_index(store, parent.record, index)) {
+    if (read_key(store, parent_offset, parent) && load_key_index(store, parent.record, index)) {
         KeyView sibling;
         uint32_t sibling_position;
         if (!index.whole || index.total != parent.record.subkey_count || subkey_at(store, index, position) != meant ||

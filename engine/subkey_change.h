@@ -14,10 +14,6 @@ enum class Inserted { failed, exists, created };
 // new_reference: the parent's security record gets one more reference, for the new key.
 Inserted insert_subkey(Store& store, CellOffset parent, const Name& name, bool new_reference, CellOffset& key);
 
-// Takes the entry at a position out of the parent's index, which must be a single leaf, and lowers the parent's count.
-bool remove_subkey(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
-                   uint32_t position);
-
 // Gives the subkey at a position another name: a new record takes the old one's place. Refused where another key than
 // the one that is meant stands there by now. Status as RRenameKey's.
 int32_t rename_subkey(Store& store, CellOffset parent, uint32_t position, CellOffset meant, const Name& name);

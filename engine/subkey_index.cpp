@@ -2,16 +2,13 @@
 // SPDX-License-Identifier: MIT
 #include "subkey_index.h"
 
+#include <cassert>
 #include <cstdlib>
 #include <cstring>
 
 namespace engine {
 
 namespace {
-
-bool is_leaf(uint32_t signature) {
-    return signature == sig_fast_leaf || signature == sig_hash_leaf || signature == sig_index_leaf;
-}
 
 // The smallest cell that a key record can lie in bounds how many keys a hive can list.
 uint32_t most_keys(const Store& store) {
@@ -22,7 +19,7 @@ uint32_t most_keys(const Store& store) {
 bool read_leaf(Store& store, CellOffset offset, Leaf& leaf, bool& whole) {
     IndexHead head;
     if (!find_used_cell(store, offset, leaf.cell) || !read_part(store, leaf.cell, 0, &head, sizeof head) ||
-        !is_leaf(head.signature))
+        !is_leaf_signature(head.signature))
         return false;
     leaf.signature = head.signature;
     leaf.count = head.count;
@@ -96,10 +93,11 @@ Lookup search_each(Store& store, const SubkeyIndex& index, CellOffset parent, co
     KeyView other;
     KeyView* current = &key;
     KeyView* previous = &other;
+    OffsetBatch batch = {};
     bool complete = index.whole;
     bool sorted = true;
     for (uint32_t i = 0; i < index.total; i++) {
-        if (!read_key(store, subkey_at(store, index, i), *current)) {
+        if (!read_key(store, subkey_at(store, index, i, batch), *current)) {
             complete = false;
             continue;
         }
@@ -115,7 +113,8 @@ Lookup search_each(Store& store, const SubkeyIndex& index, CellOffset parent, co
         previous = current;
         current = next;
     }
-    if (sorted && complete)
+    // An empty one may be what a handle still knows of a key whose cell is another's by now.
+    if (sorted && complete && index.total > 0)
         store.sorted_key = parent;
     return complete ? Lookup::absent : Lookup::unreadable;
 }
@@ -155,6 +154,7 @@ bool load_key_index(Store& store, const KeyRecord& key, SubkeyIndex& index) {
 }
 
 uint32_t leaf_holding(const SubkeyIndex& index, uint32_t position) {
+    assert(index.leaf_count > 0);
     uint32_t low = 0;
     uint32_t high = index.leaf_count - 1;
     while (low < high) {  // the last leaf that begins at or before the position
@@ -196,6 +196,16 @@ uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, C
 CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position) {
     CellOffset offset;
     return subkeys_at(store, index, position, &offset, 1) == 1 ? offset : CellOffset::none;
+}
+
+CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position, OffsetBatch& batch) {
+    if (!batch.holds(position)) {
+        batch.first = position;
+        batch.count = subkeys_at(store, index, position, batch.offsets, OffsetBatch::most);
+        if (batch.count == 0)
+            return CellOffset::none;
+    }
+    return batch.offsets[position - batch.first];
 }
 
 Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,

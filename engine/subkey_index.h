@@ -18,6 +18,18 @@ struct Leaf {
     uint32_t used() const { return static_cast<uint32_t>(sizeof(IndexHead)) + count * entry_size(); }
 };
 
+// Offsets that lie side by side in an index or a list, read together: a caller that goes from one item to the next
+// then reads the items' records without coming back to the list for each, which the one window would have to follow.
+struct OffsetBatch {
+    static constexpr uint32_t most = 32;
+
+    uint32_t first;  // position of the first one
+    uint32_t count;
+    CellOffset offsets[most];
+
+    bool holds(uint32_t position) const { return position >= first && position - first < count; }
+};
+
 // What one index held when it was read. Nothing in it outlives a write: see generation.
 struct SubkeyIndex {
     Cell cell;  // the key's own index: a leaf, or a root over leaves
@@ -46,14 +58,18 @@ uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, C
 // The key offset at a position; none when it cannot be read or its leaf is neither "li" nor of the hive's kind.
 CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position);
 
+// The same for a caller that goes through the positions in turn, with a batch that was empty at first.
+CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position, OffsetBatch& batch);
+
 // absent is said only when every entry that could be the name was read.
 enum class Lookup { found, absent, unreadable };
 
 using NameOrder = int (*)(const Name& searched, const Name& stored);
 
-// Finds a subkey by name in whatever order the list stands: by the given order first, then by upper-cased order, then
-// by looking at each, unless the list of this key (its offset is parent) is known to be in upper-cased order.
-// found: position and key are set.
+// Finds a subkey by name in whatever order the list stands. The given order comes first: it is the one by which other
+// writers of hives find their way, so where a list has two keys of one name, the one that they would meet is met. Then
+// upper-cased order, in which Windows keeps its lists; then each entry, unless the list of this key (its offset is
+// parent) is known to be in upper-cased order. found: position and key are set.
 Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
                    uint32_t& position, KeyView& key);
 // Where upper-cased order wants a new name. false when a record on the way cannot be read.

@@ -141,7 +141,7 @@ int32_t walk(Store& store, Level* levels, uint32_t room, const Level& parent, ui
 }  // namespace
 
 int32_t check_own_lists(Store& store, const KeyView& key) {
-    return find_value_list(store, key.record).whole && is_own_cell(store, key.offset()) ? R_SUCCESS : R_FAILED;
+    return find_value_list(store, key.record).whole ? R_SUCCESS : R_FAILED;
 }
 
 int32_t check_tree(Store& store, CellOffset parent_offset, uint32_t depth, uint32_t position) {
@@ -150,7 +150,7 @@ int32_t check_tree(Store& store, CellOffset parent_offset, uint32_t depth, uint3
     if (memory.bytes == nullptr)
         return R_NOT_ENOUGH_MEMORY;
     auto* levels = reinterpret_cast<Level*>(memory.bytes);
-    Level& parent = levels[room];
+    Level& parent = levels[room];  // one more than the walk goes down to
     if (!read_key(store, parent_offset, parent.key))
         return R_FAILED;
     if (!load_key_index(store, parent.key.record, parent.children))

@@ -109,12 +109,11 @@ bool is_no_data(Store& store, const ValueView& value, const Cell& cell) {
 }
 
 bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
-    if (!is_own_cell(store, old.cell.offset))
-        return false;
     ValueRecord record = old.record;
     record.type = value.type;
     if (value.size <= inline_limit) {
-        // A data cell that the value had stays allocated: storing a value never frees one that fits.
+        // A data cell that the value had stays allocated. Freeing it would be one more write that can fail, for a
+        // change that is done; and a damaged hive may have another value's data there.
         put_inline(record, value);
         return rewrite_value(store, old, record) == Outcome::written;
     }
@@ -193,7 +192,7 @@ CellOffset grow_list(Store& store, const ValueList& list) {
     const uint32_t length = list.count * slot_size;
     const Block slots(length);
     if (slots.bytes != nullptr && read_part(store, list.cell, 0, slots.bytes, length) &&
-        (length == 0 || write_at(store, sig_none, record_position(cell), slots.bytes, length) == length))
+        write_at(store, sig_none, record_position(cell), slots.bytes, length) == length)
         return cell;
     free_cell(store, cell);
     return CellOffset::none;
@@ -212,17 +211,13 @@ KeyRecord with_maxima(const KeyRecord& key, uint32_t name_bytes, uint32_t data_s
 // Puts the record into the list's next slot, and list and maxima into the key.
 Outcome link_value(Store& store, CellOffset key_offset, KeyRecord& key, ValueList list, CellOffset offset,
                    const NewValue& value) {
-    CellOffset grown = CellOffset::none;
-    if (list.count == 0)
-        grown = allocate(store, slot_size);
-    else if (list.cell.room() < (list.count + 1) * slot_size)
-        grown = grow_list(store, list);
     const bool moves = list.count == 0 || list.cell.room() < (list.count + 1) * slot_size;
-    if (moves && grown == CellOffset::none)
-        return Outcome::unchanged;
     const CellOffset old = list.cell.offset;
-    if (moves)
-        list.cell.offset = grown;
+    if (moves) {
+        list.cell.offset = list.count == 0 ? allocate(store, slot_size) : grow_list(store, list);
+        if (list.cell.offset == CellOffset::none)
+            return Outcome::unchanged;
+    }
     Le32 slot;
     slot = raw(offset);
     KeyRecord changed = with_maxima(key, 2 * value.name.length, value.size);
@@ -232,7 +227,7 @@ Outcome link_value(Store& store, CellOffset key_offset, KeyRecord& key, ValueLis
     if (write_at(store, sig_none, slot_position(list, list.count), &slot, sizeof slot) == sizeof slot)
         outcome = rewrite_key(store, key_offset, key, changed);
     if (moves && outcome == Outcome::unchanged)
-        free_cell(store, grown);
+        free_cell(store, list.cell.offset);
     if (moves && outcome == Outcome::written && list.count > 0)
         free_cell(store, old);
     return outcome;
@@ -321,9 +316,7 @@ int32_t position_of_value(Store& store, const ValueList& list, const char* name)
     ValueView value;
     int32_t begun = no_value;
     const int32_t position = find_value(store, list, name_of(name != nullptr ? name : ""), value, &begun);
-    if (position >= 0)
-        return position;
-    return begun >= 0 ? begun : int32_t{R_FAILED};
+    return position == no_value ? begun : position;
 }
 
 // A new value, in turn: its data cell, its record, its slot in the list (in a longer copy of the list, where that has
@@ -331,7 +324,7 @@ int32_t position_of_value(Store& store, const ValueList& list, const char* name)
 // written the value is not there.
 Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const NewValue& value) {
     const ValueList list = find_value_list(store, key);
-    if (!list.whole || !is_own_cell(store, key_offset) || (list.count > 0 && !is_own_cell(store, list.cell.offset)))
+    if (!list.whole || !is_used_cell(store, key_offset) || (list.count > 0 && !is_used_cell(store, list.cell.offset)))
         return Stored::failed;
     ValueView old;
     const int32_t position = find_value(store, list, value.name, old);
@@ -363,8 +356,8 @@ Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const Ne
 //   a second time. Its data stays allocated.
 int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t position) {
     const ValueList list = find_value_list(store, key);
-    if (!list.whole || position >= list.count || !is_own_cell(store, key_offset) ||
-        !is_own_cell(store, list.cell.offset))
+    if (!list.whole || position >= list.count || !is_used_cell(store, key_offset) ||
+        !is_used_cell(store, list.cell.offset))
         return R_FAILED;
     const uint32_t behind = (list.count - position) * slot_size;  // the value's own slot and those after it
     const Block slots(behind);

@@ -28,7 +28,7 @@ constexpr int32_t unreadable_value = -2;
 int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value, int32_t* begun = nullptr);
 
 // The same for a name from a call, null being the empty one: the value that has it, else the first whose name it
-// begins, else -1.
+// begins, unless a record that cannot be read may be the one.
 int32_t position_of_value(Store& store, const ValueList& list, const char* name);
 
 struct NewValue {

@@ -61,8 +61,11 @@ TEST_F(Changing, every_call_on_a_read_only_hive_gives_1013) {
 }
 
 TEST_F(Changing, a_null_key_is_refused_by_every_call) {
-    RegistryKey* made = nullptr;
-    EXPECT_NE(RCreateKey(nullptr, "New", &made, nullptr), 0);
+    const Handle open = scene.OpenKey("Alpha");
+    RegistryKey* made = open.get();
+    EXPECT_EQ(RCreateKey(nullptr, "New", &made, nullptr), R_FAILED);
+    EXPECT_EQ(made, nullptr);
+    EXPECT_EQ(RCloseHive(scene.root()), R_DEVICE_IN_USE) << "a handle that stood in the output was closed";
     EXPECT_NE(RCreateKey(scene.root(), "New", nullptr, nullptr), 0);
     EXPECT_EQ(RSetValueExW(nullptr, "v", 1, "ab", 2), R_INVALID_HANDLE);
     EXPECT_EQ(RSetValueExA(nullptr, "v", 1, "ab", 2), R_INVALID_HANDLE);
@@ -191,6 +194,29 @@ TEST_F(Changing, the_handle_sees_the_key_made_through_it) {
     RQueryInfoKeyA(scene.root(), nullptr, nullptr, nullptr, nullptr, nullptr, &longest, nullptr, nullptr, nullptr,
                    nullptr, nullptr, nullptr);
     EXPECT_EQ(longest, 13U);
+}
+
+// Since Vista the field's upper half holds flags, in nine of ten keys of a real hive.
+TEST_F(Changing, the_longest_subkey_name_is_raised_beside_the_flags_that_windows_keeps_with_it) {
+    constexpr uint32_t flags = 0x00A10000;
+    HiveLayout layout;
+    layout.root.add("Top").add("one");
+    LaidHive laid = lay_out(layout);
+    const uint32_t top = laid.at("Top").record;
+    laid.put32(top, 52, flags | 2 * 3);
+    Scene other(laid.bytes);
+    const auto field = [&] { return get32(other.bytes(), LaidHive::position(top, 52)); };
+    EXPECT_EQ(other.Create("Top\\fourteen chars"), 0);
+    EXPECT_EQ(field(), flags | 2 * 14);
+    EXPECT_EQ(other.Rename("Top\\one", "nineteen characters"), 0);
+    EXPECT_EQ(field(), flags | 2 * 19);
+    EXPECT_EQ(other.Check(), "");
+    const Handle key = other.OpenKey("Top");
+    uint32_t longest = 0;
+    EXPECT_EQ(RQueryInfoKeyA(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, &longest, nullptr, nullptr,
+                             nullptr, nullptr, nullptr, nullptr),
+              0);
+    EXPECT_EQ(longest, 19U);
 }
 
 TEST_F(Changing, five_hundred_keys_grow_the_leaf_and_the_hive) {

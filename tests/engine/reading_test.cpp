@@ -428,4 +428,39 @@ INSTANTIATE_TEST_SUITE_P(
                     R_CAN_NOT_COMPLETE}),
     [](const auto& row) { return row.param.rule; });
 
+// Whoever hears that there is no value of a name may go on to store one.
+TEST(Values, one_that_could_not_be_read_is_never_said_to_be_missing) {
+    HiveLayout layout;
+    KeyLayout& key = layout.root.add("Top");
+    const std::u16string longer(u"name\0x", 6);
+    key.set("", 3, pattern(40)).name = longer;
+    for (int i = 0; i < 300; i++)
+        key.set("other" + std::to_string(i), 3, pattern(40));
+    key.set("name", 4, {1, 2, 3, 4});
+    Scene scene(layout);
+    const Bytes before = scene.bytes();
+    bool failed = true;
+    for (uint64_t nth = 1; failed; nth++) {
+        ASSERT_TRUE(scene.Reopen());
+        Handle handle = scene.OpenKey("Top");
+        const MemoryFile::Failure failure = {.call = MemoryFile::Call::read, .nth = nth};
+        scene.file().arm(failure);
+        const int32_t position = RFindValueA(handle.get(), "name");
+        EXPECT_TRUE(position == 301 || (scene.file().failed() && position == -1)) << nth << ": " << position;
+        scene.file().arm(failure);
+        EXPECT_NE(RQueryValueExA(handle.get(), "name", nullptr, nullptr, nullptr), R_FILE_NOT_FOUND) << nth;
+        EXPECT_NE(RQueryValueExW(handle.get(), "name", nullptr, nullptr, nullptr), R_FILE_NOT_FOUND) << nth;
+        scene.file().arm(failure);
+        const bool deleted = RDeleteValue(handle.get(), "name") == 0;
+        failed = scene.file().failed();
+        scene.file().disarm();
+        const Hive now = scene.Read();
+        EXPECT_EQ(now.find("Top")->values.size(), deleted ? 301U : 302U) << nth;
+        EXPECT_EQ(now.find("Top")->values.at(0).name, longer) << nth;
+        handle.reset();
+        ASSERT_EQ(scene.Close(), 0);
+        scene.file().bytes = before;
+    }
+}
+
 }  // namespace

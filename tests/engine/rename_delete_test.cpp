@@ -220,6 +220,58 @@ TEST_F(Moving, the_last_key_of_a_security_record_takes_it_along) {
     EXPECT_EQ(other.Check(), "");
 }
 
+// A count that is too low is believed only as long as the parent does not say otherwise.
+TEST_F(Moving, a_security_record_that_the_parent_still_refers_to_stays) {
+    HiveLayout layout;
+    layout.root.add("Top").add("one");
+    LaidHive hive = lay_out(layout);
+    hive.put32(hive.security[0], 12, 1);
+    Scene other(hive.bytes);
+    EXPECT_EQ(other.Delete("Top\\one"), 0);
+    EXPECT_LT(hive.cell_size(hive.security[0]), 0);
+    EXPECT_EQ(get32(other.bytes(), LaidHive::position(hive.security[0], 12)), 1U);
+    EXPECT_EQ(other.Create("Top\\two"), 0);
+    EXPECT_EQ(other.Delete("Top\\two"), 0);
+}
+
+// The record that stood there is gone, and with it what the handle knew: that there are no subkeys.
+TEST_F(Moving, an_old_handle_of_a_deleted_key_says_nothing_about_the_order_of_another_keys_list) {
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    top.add("aa");
+    KeyLayout& key = top.add("uu");
+    key.sorted = false;
+    for (const char* name : {"z", "y", "m", "b"})
+        key.add(name);
+    Scene other(layout);
+    Handle old = other.OpenKey("Top\\aa");
+    EXPECT_EQ(other.Delete("Top\\aa"), 0);
+    EXPECT_EQ(other.Rename("Top\\uu", "vv"), 0);
+    ASSERT_EQ(RKeyOffset(old.get()), RKeyOffset(other.OpenKey("Top\\vv").get()));
+    Handle none_there;
+    EXPECT_EQ(ROpenKey(old.get(), "none", none_there.out()), R_PATH_NOT_FOUND);
+    for (const char* name : {"z", "y", "m", "b"}) {
+        uint32_t disposition = 9;
+        EXPECT_EQ(other.Create(std::string("Top\\vv\\") + name, &disposition), 0);
+        EXPECT_EQ(disposition, 1U) << name;
+    }
+}
+
+// Each entry is looked for through the whole list. What must not come on top is a way back to the list for each.
+TEST_F(Moving, a_list_in_no_order_is_asked_about_without_going_to_and_fro_between_list_and_records) {
+    constexpr uint64_t count = 512;
+    HiveLayout layout;
+    KeyLayout& key = layout.root.add("Top").add("full");
+    key.sorted = false;
+    for (uint64_t i = count; i > 0; i--)
+        key.add("key" + std::to_string(1000 + i));
+    Scene other(layout);
+    const Handle top = other.OpenKey("Top");
+    other.file().disarm();
+    EXPECT_EQ(RCheckDeleteTree(top.get(), 0), 0);
+    EXPECT_LT(other.file().counts().reads, count * count / 4);
+}
+
 TEST_F(Moving, a_tree_deleted_leaf_by_leaf_is_gone_and_its_place_can_be_used_again) {
     for (const char* path : {"Top\\Middle\\Child1\\Deep", "Top\\Middle\\Child1", "Top\\Middle\\Child2"}) {
         EXPECT_EQ(scene.Delete(path), 0) << path;

@@ -256,7 +256,8 @@ private:
         const bool narrow = (get16(bytes_, p + 2) & 0x20) != 0;
         const uint16_t length = get16(bytes_, p + 72);
         const std::u16string name = text(p + 76, length, narrow);
-        if (get32(bytes_, parent_position + 52) < name.size() * 2)
+        // The field's upper half is Windows's own: flags, in most keys of a hive since Vista.
+        if (get16(bytes_, parent_position + 52) < name.size() * 2)
             fault("maximum", parent, "the longest subkey name is too low");
         const auto [kind, mark] = index.marks[i];
         if (kind == 'f' && narrow && mark != hint(name))

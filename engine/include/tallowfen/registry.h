@@ -18,10 +18,12 @@
 //   status that the function names.
 // * Status numbers are those of RegistryStatus. A call that fails leaves its outputs as they were unless it says
 //   otherwise, and frees all that it allocated itself.
-// * Handles are snapshots: a handle does not see changes made through another handle. One hive with all its handles
-//   is used by one thread at a time; the engine holds no locks.
+// * Handles are snapshots: a handle does not see changes made through another handle. Once its key is deleted, or
+//   renamed through another handle, a handle is only to be closed: its cell may be another key's by then.
+// * One hive with all its handles is used by one thread at a time; the engine holds no locks.
 // * Counts in a handle are cut to what the lists in the file can hold, so no caller loops over what cannot exist.
-//   A key whose counts had to be cut cannot be changed where they were.
+//   A key whose counts had to be cut cannot be changed where they were. REnumKeyInfoA alone, which opens no handle,
+//   hands out a subkey's count as its record has it.
 // * A key lies at most 512 levels below the root; deeper ones are not shown and not made.
 // * Memory comes from malloc, realloc and free. The engine never prints and never throws.
 
@@ -53,7 +55,8 @@ enum RegistryHandleFlag : uint32_t {
     R_HANDLE_KEY = 32,        // an ordinary key: neither a link nor flagged as a hive's root
 };
 
-// An open key. Made by ROpenHive, ROpenSubKey, ROpenKey, ROpenKeyEx and RCreateKey; released by RCloseKey alone.
+// An open key. Made by ROpenSubKey, ROpenKey, ROpenKeyEx and RCreateKey, and released by RCloseKey; the root's is made
+// by ROpenHive and ROpenHiveEx and released by RCloseHive.
 struct RegistryKey;
 
 // What the engine calls to reach the hive's bytes. `device` is handed back to every callback untouched. Positions are
@@ -112,17 +115,18 @@ int32_t ROpenSubKey(RegistryKey* key, uint32_t index, RegistryKey** out);
 // ROpenKeyEx without the position. Null key: -1.
 int32_t ROpenKey(RegistryKey* key, const char* path, RegistryKey** out);
 // Opens the key at `path` below `key`. Leading backslashes are skipped; components beyond 259 characters are cut
-// there. *out_index receives the last component's position in its parent.
-// 6: not a key. 87: null or empty path, or out null. 8: no memory. 3: not found. -1: a damaged record.
-// From the moment of allocation *out holds the new handle: after a failure it is an incomplete one, to be released
-// with RCloseKey (after 6, 87 and 8 *out is null).
+// there. *out_index receives the last component's position in its parent. 6: not a key. 87: null or empty path, or out
+// null. 8: no memory. 3: not found. -1: a damaged record. From the moment of allocation *out holds the new handle:
+// after a failure it is an incomplete one, to be released with RCloseKey. After 6 and 87, and after an 8 that is about
+// the handle itself, *out is null.
 int32_t ROpenKeyEx(RegistryKey* key, const char* path, RegistryKey** out, uint32_t* out_index);
 
 // ---- enumerating and querying -----------------------------------------------------------------------------------
-// The index-th subkey: its 8-bit name, how many subkeys it has, its class in 8 bits, its time.
-// Name: room larger than the name: terminated; room equal to it: not terminated, still 0; smaller: cut, 111, size
-// unchanged. No buffer or no room: size becomes length + 1. A name stored in UTF-16 gives 123, its bytes copied as
-// they stand. Class: see RQueryInfoKeyA's "A" sizes; without a buffer half the stored length + 1, 0 without a class.
+// The index-th subkey: its 8-bit name, how many subkeys it has, its class in 8 bits, its time. Name: room larger than
+// the name: terminated; room equal to it: not terminated, still 0; smaller: cut, 111, size unchanged. No buffer or no
+// room: size becomes length + 1. A name stored in UTF-16 gives 123, its bytes copied as they stand. Class: room larger
+// than it: terminated, class_size becomes its characters; otherwise as many characters as fit, never 111. Without a
+// buffer or room half the stored length + 1, 0 without a class; with them and no class, both are left as they were.
 // -1: not a key, or a damaged record. 259: index past the end. 8: no memory.
 int32_t REnumKeyInfoA(RegistryKey* key, uint32_t index, char* name, uint32_t* name_size, uint32_t* out_subkeys,
                       char* class_name, uint32_t* class_size, RegistryTime* out_last_write);
@@ -143,10 +147,11 @@ int32_t REnumValueA(RegistryKey* key, uint32_t index, char* name, uint32_t* name
 int32_t REnumValueW(RegistryKey* key, uint32_t index, uint16_t* name, uint32_t* name_size, uint32_t* out_type,
                     void* data, uint32_t* data_size);
 // The position of the value of that name, case ignored; a null or empty name means the unnamed (default) value. -1:
-// none. A name stored in UTF-16 is compared as text, never as bytes. A stored 8-bit name counts up to its first zero
-// byte, unless another value has just the name asked for.
+// none, or not sure. A name stored in UTF-16 is compared as text, never as bytes. A stored 8-bit name counts up to its
+// first zero byte, unless another value has, or a record that cannot be read may have, just the name asked for.
 int32_t RFindValueA(RegistryKey* key, const char* name);
-// A value by name. 6: not a key. 2: no such value. Otherwise as REnumValueA / REnumValueW without a name.
+// A value by name. 6: not a key. 2: there surely is no such value. -1: none was found, but a record that cannot be
+// read may be it. Otherwise as REnumValueA / REnumValueW without a name.
 int32_t RQueryValueExA(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size);
 int32_t RQueryValueExW(RegistryKey* key, const char* name, uint32_t* out_type, void* data, uint32_t* data_size);
 
@@ -168,28 +173,29 @@ int32_t RQueryInfoKeyW(RegistryKey* key, uint16_t* name, uint32_t* name_size, vo
                        uint32_t* out_security_size, RegistryTime* out_last_write);
 
 // ---- changing -----------------------------------------------------------------------------------------------------
-// Opens the key at `path`, or makes every missing component of it. *out_disposition: 1 opened, 0 made.
-// 87: null or empty path, or one that cannot be made. 1013: read-only. 8: no memory. 1003: the new record cannot be
-// read. *out is null unless the result is 0.
+// Opens the key at `path`, or makes every missing component of it. *out_disposition: 1 opened, 0 made. 87: null or
+// empty path, or one that cannot be made; out null. -1: null key. 6: an incomplete handle. 1013: read-only. 8: no
+// memory. 1003: the new record cannot be read. *out is null unless the result is 0.
 int32_t RCreateKey(RegistryKey* key, const char* path, RegistryKey** out, uint32_t* out_disposition);
 // Stores a value, replacing type and data of one with that name (case ignored) or adding it at the list's end.
 // null or empty name: the default value. 1013: read-only. 8: no memory. 6: not a key. -1: not stored.
 // W stores the bytes as given; A widens text of types 1, 2 and 6, and of type 7 with two zero bytes behind it.
 int32_t RSetValueExW(RegistryKey* key, const char* name, uint32_t type, const void* data, uint32_t size);
 int32_t RSetValueExA(RegistryKey* key, const char* name, uint32_t type, const void* data, uint32_t size);
-// Removes the value of that name. 1013: read-only. 6: not a key. 1003: no such value, or a failed write. -1: damaged.
+// Removes the value of that name. 1013: read-only. 6: not a key. 1003: no such value, or a failed write. 8: no memory.
+// -1: damaged.
 int32_t RDeleteValue(RegistryKey* key, const char* name);
 // Renames the index-th subkey; it stays the same key. 1013: read-only. 6: not a key. 87: null or empty name, one with
 // a backslash, or one that is too long. 3: the subkey cannot be opened. -1: a sibling has that name in any case, the
-// key is listed elsewhere too, or a step failed. 1003: a record could not be read or written. Unless 0, the key still
-// has its old name.
+// key is listed elsewhere too, or a step failed. 1003: a record could not be read or written. 8: no memory. Unless 0,
+// the key still has its old name.
 int32_t RRenameKey(RegistryKey* key, uint32_t index, const char* new_name);
 // Deletes the key at `path`, which must have no subkeys. 1013: read-only. 6: a handle without flag 32. 3: not found,
 // listed below an index root, or listed elsewhere too; also where the path ends in a backslash or in a component of
-// more than 259 characters. 145: it has subkeys. -1, 1003: a step failed.
+// more than 259 characters. 145: it has subkeys. 8: no memory. -1, 1003: a step failed. A null or empty path gives 3.
 int32_t RDeleteKey(RegistryKey* key, const char* path);
-// What RDeleteKey would say to the index-th subkey and to each key below it, leaves first; writes nothing. 0: the whole
-// subtree can be deleted key by key.
+// What RDeleteKey would say to the index-th subkey and to each key below it, leaves first; writes nothing. 0: the
+// whole subtree can be deleted key by key. 123: a name in it is stored in UTF-16, which no path can say.
 int32_t RCheckDeleteTree(RegistryKey* key, uint32_t index);
 // Where the key's cell lies, in bytes from the first bin: the same for every handle of one key, so that a key which a
 // damaged hive lists below itself can be told. UINT32_MAX: not a key. A rename gives the key another cell.
