@@ -102,7 +102,8 @@ public:
     // The name alone; nothing when the value's record cannot be read.
     std::optional<QString> value_name(int index);
     // The setters store under a name, making the value when there is none. With an index, the value of that name must
-    // be the one at that position. false: refused, for this or by the engine, or 8 bits cannot carry the name.
+    // be the one at that position; with new_value, there must surely be none. false: refused, for this or by the
+    // engine, or 8 bits cannot carry the name.
     bool set_string_value(const QString& name, const QString& text, uint type, int index = any_value);
     bool set_binary_value(const QString& name, const QByteArray& bytes, uint type, int index = any_value);
     bool set_dword_value(const QString& name, uint value, int order, int index = any_value);
@@ -116,6 +117,7 @@ public:
     QString new_value_name();
 
     static constexpr int any_value = -1;
+    static constexpr int new_value = -2;
 
     RegHive* hive() const { return hive_; }
 

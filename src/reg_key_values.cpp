@@ -127,6 +127,11 @@ QByteArray name_leading_to(RegistryKey* handle, int index) {
     return text.fits && RFindValueA(handle, text.bytes.constData()) == index ? text.bytes : QByteArray();
 }
 
+// Whether no value of the key has a name, and every record could be asked for its own.
+bool is_surely_free(RegistryKey* handle, const char* name) {
+    return RQueryValueExA(handle, name, nullptr, nullptr, nullptr) == R_FILE_NOT_FOUND;
+}
+
 }  // namespace
 
 RegValue RegKey::read_value_name(int index) {
@@ -179,12 +184,15 @@ std::unique_ptr<RegValue> RegKey::read_value(int index) {
 bool RegKey::store_value(const QString& name, uint type, const QByteArray& data, int index) {
     const StoredText stored = stored_text(name);
     // A longer name that is there already stays usable.
-    if (!stored.fits || (index == any_value && stored.bytes.size() > longest_value_name))
+    if (!stored.fits || (index < 0 && stored.bytes.size() > longest_value_name))
         return false;
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
     // Only the value at the index is meant: a name that leads to another one writes nothing.
-    if (index != any_value && RFindValueA(handle, stored.bytes.constData()) != index)
+    if (index >= 0 && RFindValueA(handle, stored.bytes.constData()) != index)
+        return false;
+    // A record that cannot be read now may have the very name, and be there to be overwritten a moment later.
+    if (index == new_value && !is_surely_free(handle, stored.bytes.constData()))
         return false;
     return RSetValueExW(handle, stored.bytes.constData(), type, data.constData(), static_cast<uint32_t>(data.size())) ==
            R_SUCCESS;
@@ -239,14 +247,14 @@ bool RegKey::rename_value(int index, const QString& new_name) {
         return false;
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
-    if (RQueryValueExA(handle, stored.bytes.constData(), nullptr, nullptr, nullptr) != R_FILE_NOT_FOUND ||
-        name_leading_to(handle, index).isNull() || read_value(index) == nullptr)
+    if (!is_surely_free(handle, stored.bytes.constData()) || name_leading_to(handle, index).isNull() ||
+        read_value(index) == nullptr)
         return false;
     // The bytes go over as they are stored: a record cannot carry text behind a zero, an odd size or a short number.
     const EnumeratedName old = enumerate_name(handle, index);
     QByteArray bytes;
     return read_bytes(hive_, handle, index, old.data_size, bytes) &&
-           store_value(new_name, old.type, bytes, any_value) && delete_value(index);
+           store_value(new_name, old.type, bytes, new_value) && delete_value(index);
 }
 
 QString RegKey::new_value_name() {

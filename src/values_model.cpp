@@ -239,20 +239,20 @@ bool ValuesModel::make_empty(const QString& name, int type) {
     case REG_SZ:
     case REG_EXPAND_SZ:
     case REG_LINK:
-        return key_->set_string_value(name, QString(), static_cast<uint>(type));
+        return key_->set_string_value(name, QString(), static_cast<uint>(type), RegKey::new_value);
     case REG_BINARY:
-        return key_->set_binary_value(name, QByteArray(), REG_BINARY);
+        return key_->set_binary_value(name, QByteArray(), REG_BINARY, RegKey::new_value);
     case REG_DWORD:
-        return key_->set_dword_value(name, 0, little_endian_order);
+        return key_->set_dword_value(name, 0, little_endian_order, RegKey::new_value);
     case REG_MULTI_SZ:
-        return key_->set_multi_string_value(name, QStringList());
+        return key_->set_multi_string_value(name, QStringList(), RegKey::new_value);
     case REG_QWORD:
-        return key_->set_qword_value(name, 0);
+        return key_->set_qword_value(name, 0, RegKey::new_value);
     default:
         return false;
     }
 }
 
 bool ValuesModel::add_default_value(const QString& data) {
-    return insert_at_end([&] { return key_->set_string_value(QString(), data, REG_SZ); });
+    return insert_at_end([&] { return key_->set_string_value(QString(), data, REG_SZ, RegKey::new_value); });
 }

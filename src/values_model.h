@@ -43,7 +43,7 @@ public:
     // Makes a value with a generated name and empty data, at the end. The signals of an inserted row come also for a
     // type that makes nothing; callers pass only the six types that can be made.
     bool add_value(int type);
-    // Makes the unnamed value, as text.
+    // Makes the unnamed value, as text; false where there may be one.
     bool add_default_value(const QString& data);
 
 private:

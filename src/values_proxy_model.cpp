@@ -159,15 +159,33 @@ bool ValuesProxyModel::make_default(const QModelIndex& index, const QVariant& va
     auto* values = qobject_cast<ValuesModel*>(sourceModel());
     if (index.column() != ValuesModel::DataColumn || values == nullptr)
         return false;
+    const int values_before = values->rowCount();
     const bool added = change_source([&] {
         const bool made = values->add_default_value(value.toString());
-        ask_for_default();
+        if (made || values->rowCount() > values_before)
+            ask_for_default();
         return made;
     });
+    if (!added)
+        give_way_to_default();
     sort(ValuesModel::NameColumn, Qt::AscendingOrder);
     if (added)
         emit dataChanged(index, index);
     return added;
+}
+
+// A key that could not be read whole when it was asked for its unnamed value may have one all the same: the made-up row
+// goes then.
+void ValuesProxyModel::give_way_to_default() {
+    if (!synthetic_default_)
+        return;
+    const int position = key()->default_value_position();
+    if (position < 0)
+        return;
+    beginRemoveRows(QModelIndex(), 0, 0);
+    synthetic_default_ = false;
+    unnamed_ = position;
+    endRemoveRows();
 }
 
 int ValuesProxyModel::rows_now(int otherwise) const {

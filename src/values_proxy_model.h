@@ -54,6 +54,7 @@ private:
     QVariant spoken_data(const QModelIndex& index) const;
     bool change_source(const std::function<bool()>& change);
     bool make_default(const QModelIndex& index, const QVariant& value);
+    void give_way_to_default();
     int rows_now(int otherwise) const;  // otherwise: where the key cannot say
     void announce_layout();
     void move_to_end(int row);

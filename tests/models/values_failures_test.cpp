@@ -36,10 +36,14 @@ testkit::HiveLayout layout() {
     // As much data as makes the engine go to the file often.
     for (int i = 0; i < 60; i++)
         wide.set("value " + std::to_string(i), 3, testkit::pattern(3000)).wide_name = true;
+    testkit::KeyLayout with_default = wide;
+    with_default.name = u"With default";
+    with_default.set("", 1, testkit::text_data("is set"));
+    hive.root.children.push_back(with_default);
     return hive;
 }
 
-enum Key { Bare, Full, Wide };
+enum Key { Bare, Full, Wide, WithDefault };
 
 // How often a model has begun to tell of new or lost rows, and not ended.
 struct Told {
@@ -294,6 +298,44 @@ private slots:
         QVERIFY(outcomes.done > 0);
         QVERIFY(outcomes.refused > 0);
         QVERIFY(outcomes.thrown > 0);
+    }
+
+    // One read that fails takes it for a key without one: what is typed into the made-up row then must not replace the
+    // value that is there, and the row gives way to it.
+    void an_unnamed_value_that_could_not_be_read_is_not_overwritten() {
+        int misled = 0;
+        bool failed = true;
+        for (int nth = 1; failed; nth++) {
+            Shown shown(WithDefault);
+            const testkit::Bytes before = shown.file.bytes();
+            ValuesProxyModel proxy;
+            {
+                const testkit::ReadFaults faults(nth);
+                try {
+                    proxy.setSourceModel(&shown.source);
+                } catch (const std::runtime_error&) {
+                    // not shown at all then
+                }
+                failed = faults.failed();
+            }
+            const int rows = shown.source.rowCount();
+            if (proxy.rowCount() == rows)
+                continue;
+            misled++;
+            QTableView view;
+            view.setModel(&proxy);
+            proxy.sort(0, Qt::AscendingOrder);
+            view.setCurrentIndex(proxy.index(0, 2));
+            QVERIFY(!proxy.setData(proxy.index(0, 2), QStringLiteral("typed"), Qt::EditRole));
+            QVERIFY(shown.file.bytes() == before);
+            QCOMPARE(proxy.rowCount(), rows);
+            QCOMPARE(view.verticalHeader()->count(), rows);
+            QCOMPARE(proxy.index(0, 2).data().toString(), QStringLiteral("is set"));
+            QCOMPARE(view.currentIndex().row(), 0);
+            QVERIFY(proxy.setData(proxy.index(0, 2), QStringLiteral("typed"), Qt::EditRole));
+            QCOMPARE(shown.file.stored("With default", ""), QByteArray("t\0y\0p\0e\0d\0\0\0", 12));
+        }
+        QVERIFY(misled > 0);
     }
 
     void a_deletion() {
