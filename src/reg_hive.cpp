@@ -131,7 +131,7 @@ RegistryKey* RegHive::open_child_handle(const RegKey* key, const RegKey* parent,
         if (index < 0 || ROpenSubKey(parent_handle, static_cast<uint32_t>(index), &handle) != R_SUCCESS)
             throw std::runtime_error("ROpenSubKey failed");
         // After a failed read, or in a damaged hive, the parent's list may have moved under its slots.
-        if (key->offset_ != UINT32_MAX && key->offset_ != RKeyOffset(handle)) {
+        if (key->offset_ != UINT32_MAX && (key->offset_ != RKeyOffset(handle) || has_left(key))) {
             RCloseKey(handle);
             throw std::runtime_error("ROpenSubKey failed");
         }
@@ -143,6 +143,23 @@ RegistryKey* RegHive::open_child_handle(const RegKey* key, const RegKey* parent,
 void RegHive::clear_handle_cache() {
     const std::lock_guard locker(cache_mutex_);
     handle_cache_.clear();
+}
+
+void RegHive::forget_other_handles(const RegKey* key) {
+    const std::lock_guard locker(cache_mutex_);
+    const QList<const RegKey*> cached = handle_cache_.keys();
+    for (const RegKey* other : cached) {
+        if (other != key && other->offset_ == key->offset_)
+            handle_cache_.remove(other);
+    }
+}
+
+void RegHive::note_freed(uint32_t offset) { freed_[offset] = ++times_freed_; }
+
+// Whether the key that an object was made for has left the cell that it was found in.
+bool RegHive::has_left(const RegKey* key) const {
+    const auto found = freed_.find(key->offset_);
+    return found != freed_.end() && found->second > key->freed_before_;
 }
 
 void RegHive::forget_handle(const RegKey* key) {

@@ -8,6 +8,7 @@
 #include <QFile>
 #include <QString>
 
+#include <map>
 #include <memory>
 #include <mutex>
 
@@ -57,6 +58,12 @@ public:
     void clear_handle_cache();
     // Takes one key's handle out of the cache, when the key object goes.
     void forget_handle(const RegKey* key);
+    // Takes the handles of the other objects that stand for the same key out of the cache, after a change of the key:
+    // a handle does not see what was done through another one.
+    void forget_other_handles(const RegKey* key);
+    // Notes that a key has left its cell, which may become another key's: a damaged hive may list it in other places
+    // too, and the objects there must not be taken for that other key's.
+    void note_freed(uint32_t offset);
     int cached_handles() const { return static_cast<int>(handle_cache_.count()); }
 
     // Both locks, in their order, for the whole of one operation: no handle is evicted while it is in use.
@@ -74,6 +81,9 @@ public:
     std::recursive_mutex* api_mutex() { return &api_mutex_; }
 
 private:
+    friend class RegKey;
+
+    bool has_left(const RegKey* key) const;
     void open_file();
     void load();
     void warn_if_dirty();
@@ -83,6 +93,8 @@ private:
     std::recursive_mutex api_mutex_;    // around every call into the engine for this hive
     std::recursive_mutex cache_mutex_;  // around every use of handle_cache_
     QCache<const RegKey*, KeyHandleHolder> handle_cache_;
+    std::map<uint32_t, int> freed_;  // cells that keys have left, each with how often one had by then
+    int times_freed_ = 0;
     std::unique_ptr<RegistryIo> io_;
     std::unique_ptr<RegKey> root_;
     RegistryKey* root_handle_ = nullptr;

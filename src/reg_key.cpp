@@ -38,6 +38,16 @@ uint32_t subkey_count(RegistryKey* handle) {
     return count;
 }
 
+// Where the index-th subkey lies; UINT32_MAX when it cannot be opened.
+uint32_t subkey_offset(RegistryKey* handle, int index) {
+    RegistryKey* subkey = nullptr;
+    if (ROpenSubKey(handle, static_cast<uint32_t>(index), &subkey) != R_SUCCESS)
+        return UINT32_MAX;
+    const uint32_t offset = RKeyOffset(subkey);
+    RCloseKey(subkey);
+    return offset;
+}
+
 // The position that the engine's own look-up finds a name at, -1 when it finds none.
 int position_by_path(RegistryKey* handle, const char* name) {
     RegistryKey* found = nullptr;
@@ -174,13 +184,20 @@ QString RegKey::name() {
 
 void RegKey::refresh_children(RegistryKey* handle) {
     children_.resize(subkey_count(handle), nullptr);
-    offset_ = RKeyOffset(handle);
+    learn_offset(RKeyOffset(handle));
+}
+
+void RegKey::learn_offset(uint32_t offset) {
+    offset_ = offset;
+    freed_before_ = hive_->times_freed_;
 }
 
 bool RegKey::slots_agree(RegistryKey* handle) const { return children_.size() == subkey_count(handle); }
 
 void RegKey::reload() {
     const RegHive::Dialogue dialogue(hive_);
+    // A handle from before does not see what came about in another place.
+    hive_->forget_handle(this);
     refresh_children(hive_->key_handle(this));
 }
 
@@ -254,13 +271,10 @@ bool RegKey::is_shown_at(RegistryKey* handle, int index) const {
     if (index < 0 || static_cast<size_t>(index) >= children_.size())
         return false;
     const auto* shown = static_cast<const RegKey*>(children_[static_cast<size_t>(index)]);
-    RegistryKey* listed = nullptr;
-    if (shown == nullptr || shown->offset_ == UINT32_MAX ||
-        ROpenSubKey(handle, static_cast<uint32_t>(index), &listed) != R_SUCCESS)
-        return true;  // nothing was shown, or nothing can be harmed
-    const bool same = RKeyOffset(listed) == shown->offset_;
-    RCloseKey(listed);
-    return same;
+    if (shown == nullptr || shown->offset_ == UINT32_MAX)
+        return true;  // nothing was shown
+    const uint32_t listed = subkey_offset(handle, index);
+    return listed == UINT32_MAX || listed == shown->offset_;  // what cannot be opened cannot be harmed
 }
 
 int RegKey::new_key() {
@@ -283,6 +297,7 @@ int RegKey::new_key() {
         if (status != R_SUCCESS || existed == 0)
             break;
     }
+    hive_->forget_other_handles(this);
     const int position = find_child_position(handle, name);
     if (position < 0) {
         // What cannot be shown must not be there.
@@ -306,9 +321,16 @@ bool RegKey::delete_key(int index) {
     // is no name to the engine, but a path.
     if (!is_shown_at(handle, index) || !slots_agree(handle) ||
         REnumKeyExA(handle, static_cast<uint32_t>(index), name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
-        std::strchr(name.data(), '\\') != nullptr || position_by_path(handle, name.data()) != index ||
-        RDeleteKey(handle, name.data()) != R_SUCCESS)
+        std::strchr(name.data(), '\\') != nullptr || position_by_path(handle, name.data()) != index)
         return false;
+    const uint32_t offset = subkey_offset(handle, index);
+    const bool is_deleted = RDeleteKey(handle, name.data()) == R_SUCCESS;
+    // Where a damaged hive lists the key, or keys below it, in other places too, handles from there would go on leading
+    // to cells that become other keys'.
+    hive_->clear_handle_cache();
+    if (!is_deleted)
+        return false;
+    hive_->note_freed(offset);
     const auto slot = children_.begin() + index;
     const std::unique_ptr<AbstractRegKey> gone(*slot);
     children_.erase(slot);
@@ -350,20 +372,17 @@ int RegKey::rename_key(int index, const QString& new_name) {
     // The key gets another record and the list another order: handles from before are of no use.
     hive_->clear_handle_cache();
     RegistryKey* handle = hive_->key_handle(this);
+    const uint32_t old_offset = subkey_offset(handle, index);
     if (!slots_agree(handle) || !is_shown_at(handle, index) ||
         RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
         return -1;
+    hive_->note_freed(old_offset);
     const int position = find_child_position(handle, name.bytes);
     if (position < 0)
         return -2;
     AbstractRegKey* renamed = children_[static_cast<size_t>(index)];
-    if (renamed != nullptr) {
-        RegistryKey* moved = nullptr;
-        const bool opens = ROpenSubKey(handle, static_cast<uint32_t>(position), &moved) == R_SUCCESS;
-        static_cast<RegKey*>(renamed)->offset_ = opens ? RKeyOffset(moved) : UINT32_MAX;
-        if (opens)
-            RCloseKey(moved);
-    }
+    if (renamed != nullptr)
+        static_cast<RegKey*>(renamed)->learn_offset(subkey_offset(handle, position));
     children_.erase(children_.begin() + index);
     children_.insert(children_.begin() + position, renamed);
     return position;

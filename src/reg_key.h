@@ -126,6 +126,7 @@ private:
 
     std::recursive_mutex* children_lock() const override;
     void refresh_children(RegistryKey* handle);
+    void learn_offset(uint32_t offset);
     bool is_shown_at(RegistryKey* handle, int index) const;
     bool agrees_below(int index);
     // Whether there is a slot for each subkey that the engine counts, so that its positions are those of the slots.
@@ -137,6 +138,7 @@ private:
     // Where the engine found the key, UINT32_MAX when it has not been asked since the key was made. What the parent
     // lists at this object's place is only taken for its key when it lies there.
     uint32_t offset_ = UINT32_MAX;
+    int freed_before_ = 0;  // how many cells keys had left when the offset was learnt
 };
 
 // A named group with no hive behind it: the first part of a mount name.

@@ -194,8 +194,10 @@ bool RegKey::store_value(const QString& name, uint type, const QByteArray& data,
     // A record that cannot be read now may have the very name, and be there to be overwritten a moment later.
     if (index == new_value && !is_surely_free(handle, stored.bytes.constData()))
         return false;
-    return RSetValueExW(handle, stored.bytes.constData(), type, data.constData(), static_cast<uint32_t>(data.size())) ==
-           R_SUCCESS;
+    const int32_t status =
+        RSetValueExW(handle, stored.bytes.constData(), type, data.constData(), static_cast<uint32_t>(data.size()));
+    hive_->forget_other_handles(this);
+    return status == R_SUCCESS;
 }
 
 bool RegKey::set_string_value(const QString& name, const QString& text, uint type, int index) {
@@ -231,7 +233,11 @@ bool RegKey::delete_value(int index) {
     if (index < 0)
         return false;
     const QByteArray name = name_leading_to(handle, index);
-    return !name.isNull() && RDeleteValue(handle, name.constData()) == R_SUCCESS;
+    if (name.isNull())
+        return false;
+    const int32_t status = RDeleteValue(handle, name.constData());
+    hive_->forget_other_handles(this);
+    return status == R_SUCCESS;
 }
 
 bool RegKey::can_delete_value(int index) {
