@@ -89,9 +89,9 @@ private:
     void move_persistent_indexes(const QModelIndex& renamed, const QModelIndex& moved);
 
     void push_next_sibling(const QModelIndex& key);
-    void push_key_frames(const Frame& frame, FindMode mode);
+    bool push_key_frames(const Frame& frame, FindMode mode);
     void push_value_frames(const QModelIndex& key, const std::vector<int>& rows);
-    void renew_value_frames();
+    bool renew_value_frames();
     std::vector<int> followed_rows(const std::vector<int>& awaited_rows, const std::vector<QString>& now) const;
     bool is_stopped();
     std::vector<Frame>::iterator sibling_frame(const AbstractRegKey* parent);

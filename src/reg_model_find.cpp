@@ -93,8 +93,10 @@ void RegModel::push_next_sibling(const QModelIndex& key) {
         search_.push_back({sibling, with_siblings});
 }
 
-// What a key leads to, so that its values come first, then its subkeys, then its later siblings.
-void RegModel::push_key_frames(const Frame& frame, FindMode mode) {
+// What a key leads to, so that its values come first, then its subkeys, then its later siblings. false: stopped, the
+// stack being as it was with the frame on it.
+bool RegModel::push_key_frames(const Frame& frame, FindMode mode) {
+    const size_t frames_before = search_.size();
     const AbstractRegKey* const visited = key_of(frame.key);
     const auto* const in_hive = dynamic_cast<const RegKey*>(visited);
     bool goes_on = true;
@@ -114,12 +116,19 @@ void RegModel::push_key_frames(const Frame& frame, FindMode mode) {
         search_.push_back({child, with_siblings});
     RegKey* const key = mode.testFlag(FindValues) ? editable_key(frame.key) : nullptr;
     if (key == nullptr)
-        return;
+        return true;
     // Read and sorted once for all of the key's values.
-    value_names_ = shown_value_names(*key, ValuesModel::default_name());
+    auto names = shown_value_names(*key, ValuesModel::default_name(), [this] { return is_stopped(); });
+    if (!names.has_value()) {
+        search_.resize(frames_before, frame);
+        search_.push_back(frame);
+        return false;
+    }
+    value_names_ = std::move(*names);
     std::vector<int> rows(value_names_.size());
     std::iota(rows.begin(), rows.end(), 0);
     push_value_frames(frame.key, rows);
+    return true;
 }
 
 void RegModel::push_value_frames(const QModelIndex& key, const std::vector<int>& rows) {
@@ -129,19 +138,25 @@ void RegModel::push_value_frames(const QModelIndex& key, const std::vector<int>&
 
 // The user may have changed the values of the key that the last hit was in, and with them the rows of the others. What
 // was not visited is visited in its row of now, and nothing else is; where a name is new, it may be what became of one
-// that is gone and was not visited: then it is visited too, at the price that another new name may be as well.
-void RegModel::renew_value_frames() {
+// that is gone and was not visited: then it is visited too, at the price that another new name may be as well. false:
+// stopped, with the stack as it was.
+bool RegModel::renew_value_frames() {
     if (search_.empty() || search_.back().value < 0)
-        return;
+        return true;
     const QModelIndex key = search_.back().key;
     std::vector<int> awaited_rows;
     for (; !search_.empty() && search_.back().value >= 0; search_.pop_back())
         awaited_rows.push_back(search_.back().value);
     // Without its frames already: should the key throw, the search goes on behind it the next time.
     searched_ = key;
-    std::vector<QString> now = shown_value_names(*editable_key(key), ValuesModel::default_name());
-    push_value_frames(key, now == value_names_ ? awaited_rows : followed_rows(awaited_rows, now));
-    value_names_ = std::move(now);
+    auto now = shown_value_names(*editable_key(key), ValuesModel::default_name(), [this] { return is_stopped(); });
+    if (!now.has_value()) {
+        push_value_frames(key, awaited_rows);
+        return false;
+    }
+    push_value_frames(key, *now == value_names_ ? awaited_rows : followed_rows(awaited_rows, *now));
+    value_names_ = std::move(*now);
+    return true;
 }
 
 // Where the awaited rows of value_names_ are in other names. The first row is the unnamed value's, whether there is
@@ -178,8 +193,8 @@ RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mod
     // The stack is the worker's from here on and goes back at the end. The pool orders the two ends already, but in
     // code that the thread sanitizer cannot see.
     const HandOver hand_over(&mutex_);
-    if (mode.testFlag(FindValues))
-        renew_value_frames();
+    if (mode.testFlag(FindValues) && !renew_value_frames())
+        return {};
     int counter = 1;
     while (!search_.empty()) {
         const Frame frame = search_.back();
@@ -188,7 +203,8 @@ RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mod
         if (frame.value == with_siblings && passed_over_.erase(key_of(frame.key)) > 0) {
             push_next_sibling(frame.key);
         } else if (frame.value < 0) {
-            push_key_frames(frame, mode);
+            if (!push_key_frames(frame, mode))
+                return {};
             if (mode.testFlag(FindKeys) && matches(data(frame.key, Qt::DisplayRole).toString(), text, kind))
                 return {frame.key, -1};
         } else if (mode.testFlag(FindValues)) {

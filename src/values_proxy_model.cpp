@@ -309,11 +309,12 @@ void ValuesProxyModel::announce_layout() {
 void ValuesProxyModel::sort(int, Qt::SortOrder) {
     emit layoutAboutToBeChanged();
     const int rows = sourceModel() != nullptr ? sourceModel()->rowCount() : 0;
+    const auto name_of = [this](int row) {
+        return sourceModel()->data(sourceModel()->index(row, 0), Qt::DisplayRole).toString();
+    };
     std::vector<QString> names;
-    names.reserve(static_cast<size_t>(rows));
     try {
-        for (int i = 0; i < rows; i++)
-            names.push_back(sourceModel()->data(sourceModel()->index(i, 0), Qt::DisplayRole).toString());
+        names = names_of_rows(rows, name_of).value();
     } catch (...) {
         mapping_.clear();
         emit layoutChanged();
