@@ -6,11 +6,31 @@
 
 #include <QIcon>
 
+#include <algorithm>
 #include <stdexcept>
 
 namespace {
 
-constexpr int most_cached_rows = 100;
+// A hundred rows, and fewer where they are large: a damaged hive can have many values share the data of one.
+constexpr qsizetype most_cached_rows = 100;
+constexpr qsizetype most_cached_bytes = 64000 << 10;
+constexpr qsizetype least_cost = most_cached_bytes / most_cached_rows;
+
+// About the memory that a datum takes, which for a list of short strings is many times what is stored.
+qsizetype memory_of(const QVariant& data) {
+    constexpr qsizetype character = sizeof(QChar);
+    if (data.typeId() == QMetaType::QByteArray)
+        return data.toByteArray().size();
+    if (data.typeId() == QMetaType::QString)
+        return data.toString().size() * character;
+    qsizetype bytes = 0;
+    if (data.typeId() == QMetaType::QStringList) {
+        const QStringList list = data.toStringList();
+        for (const QString& text : list)
+            bytes += static_cast<qsizetype>(sizeof(QString)) + text.size() * character;
+    }
+    return bytes;
+}
 
 // Whether an editor hands back what it was given. A text without lines becomes a list of one empty string in it.
 bool is_same_data(const QVariant& old, const QVariant& given) {
@@ -22,7 +42,7 @@ bool is_same_data(const QVariant& old, const QVariant& given) {
 }  // namespace
 
 ValuesModel::ValuesModel(RegKey* key, QObject* parent)
-    : QAbstractTableModel(parent), key_(key), cache_(most_cached_rows) {}
+    : QAbstractTableModel(parent), key_(key), cache_(most_cached_bytes) {}
 
 QString ValuesModel::default_name() { return tr("(Default)"); }
 
@@ -56,14 +76,16 @@ Qt::ItemFlags ValuesModel::flags(const QModelIndex& index) const {
     return Qt::ItemIsEnabled;
 }
 
-const RegValue* ValuesModel::lookup(int row) const {
-    if (RegValue* cached = cache_.object(row))
-        return cached;
+RegValue ValuesModel::lookup(int row) const {
+    if (const RegValue* cached = cache_.object(row))
+        return *cached;
     std::unique_ptr<RegValue> value = key_->read_value(row);
     if (value == nullptr)
-        value = std::make_unique<RegValue>(key_->read_value_name(row));
-    cache_.insert(row, value.release(), 1);
-    return cache_.object(row);
+        return key_->read_value_name(row);
+    RegValue found = *value;
+    // The row asked for last is kept, however large it is.
+    cache_.insert(row, value.release(), std::clamp(memory_of(found.data), least_cost, most_cached_bytes));
+    return found;
 }
 
 QVariant ValuesModel::data(const QModelIndex& index, int role) const {
@@ -78,14 +100,14 @@ QVariant ValuesModel::data(const QModelIndex& index, int role) const {
                 return QVariant();
             return name->isEmpty() ? default_name() : *name;
         }
-        const RegValue* value = lookup(index.row());
+        const RegValue value = lookup(index.row());
         if (index.column() == DataColumn)
-            return value->data;
-        const QString type = type_name(value->type);
+            return value.data;
+        const QString type = type_name(value.type);
         return type.isNull() ? QVariant() : QVariant(type);
     }
     if (role == Qt::DecorationRole && index.column() == NameColumn) {
-        const quint32 type = lookup(index.row())->type;
+        const quint32 type = lookup(index.row()).type;
         const bool text = type == REG_SZ || type == REG_EXPAND_SZ || type == REG_MULTI_SZ;
         return QIcon(QStringLiteral(TALLOWFEN_SHARE_DIR) +
                      (text ? QStringLiteral("type_string.ico") : QStringLiteral("type_binary.ico")));
@@ -102,11 +124,51 @@ bool ValuesModel::setData(const QModelIndex& index, const QVariant& value, int) 
         emit dataChanged(index, this->index(rowCount() - 1, NameColumn));
         return true;
     }
-    if (index.column() != DataColumn || !store(index.row(), value))
+    if (index.column() != DataColumn)
         return false;
-    cache_.remove(index.row());
-    emit dataChanged(index, index);
-    return true;
+    // What is compared and stored is what the file has now; and an attempt that failed may have changed something too.
+    const auto shown = take_shown();
+    bool stored = false;
+    try {
+        stored = store(index.row(), value);
+    } catch (...) {
+        cache_.clear();
+        announce_others(shown, -1);
+        throw;
+    }
+    cache_.clear();
+    if (stored)
+        emit dataChanged(index, index);
+    announce_others(shown, stored ? index.row() : -1);
+    return stored;
+}
+
+// Empties the cache.
+std::vector<std::pair<int, RegValue>> ValuesModel::take_shown() {
+    std::vector<std::pair<int, RegValue>> shown;
+    const QList<int> rows = cache_.keys();
+    for (const int row : rows)
+        shown.emplace_back(row, *cache_.object(row));
+    cache_.clear();
+    return shown;
+}
+
+// Tells of rows that do not read any more as they were shown: those of a value that was stored by half, and in a
+// damaged hive those of values that share their data with the one that was stored.
+void ValuesModel::announce_others(const std::vector<std::pair<int, RegValue>>& shown, int told) {
+    for (const auto& [row, before] : shown) {
+        if (row == told)
+            continue;
+        bool same = false;
+        try {
+            const RegValue now = lookup(row);
+            same = now.type == before.type && now.data == before.data;
+        } catch (const std::exception&) {
+            // Whoever shows the row will meet the failure.
+        }
+        if (!same)
+            emit dataChanged(createIndex(row, TypeColumn), createIndex(row, DataColumn));
+    }
 }
 
 // A renamed value moves to the end of the list, and every row behind it moves up. One that could only be stored under
@@ -143,7 +205,7 @@ void ValuesModel::announce_new_rows(int before) {
 }
 
 bool ValuesModel::store(int row, const QVariant& value) {
-    const RegValue old = *lookup(row);
+    const RegValue old = lookup(row);
     if (!old.data.isValid())
         return false;
     // The bytes may say more than the data that is made of them: text behind a zero, an odd byte, a number too short.

@@ -10,6 +10,8 @@
 #include <QCache>
 
 #include <functional>
+#include <utility>
+#include <vector>
 
 class RegKey;
 
@@ -46,8 +48,11 @@ public:
     // Makes the unnamed value, as text; false where there may be one.
     bool add_default_value(const QString& data);
 
+    // Bytes of memory that the rows kept take.
+    qsizetype cached_bytes() const { return cache_.totalCost(); }
+
 private:
-    const RegValue* lookup(int row) const;
+    RegValue lookup(int row) const;
     bool store(int row, const QVariant& value);
     bool rename(int row, const QString& name);
     bool insert_at_end(const std::function<bool()>& make);
@@ -55,8 +60,10 @@ private:
     int rows_now(int otherwise) const;  // otherwise: where the key cannot say
     void announce_new_rows(int before);
     void forget_from(int row);
+    std::vector<std::pair<int, RegValue>> take_shown();
+    void announce_others(const std::vector<std::pair<int, RegValue>>& shown, int told);
 
     RegKey* key_;
-    // The rows used last. A value whose data cannot be read stands here with an invalid variant.
+    // The rows used last. A value whose data cannot be read is not kept: it may be readable the next time.
     mutable QCache<int, RegValue> cache_;
 };

@@ -36,8 +36,10 @@ void ValuesProxyModel::setSourceModel(QAbstractItemModel* source) {
     if (sourceModel() != nullptr)
         disconnect(sourceModel(), nullptr, this, nullptr);
     QAbstractProxyModel::setSourceModel(source);
-    if (source != nullptr)
+    if (source != nullptr) {
         connect(source, &QAbstractItemModel::rowsInserted, this, &ValuesProxyModel::on_rows_inserted);
+        connect(source, &QAbstractItemModel::dataChanged, this, &ValuesProxyModel::on_data_changed);
+    }
     mapping_.clear();
     synthetic_default_ = false;
     unnamed_ = -1;
@@ -106,7 +108,7 @@ QVariant ValuesProxyModel::spoken_data(const QModelIndex& index) const {
 QVariant ValuesProxyModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid() || sourceModel() == nullptr)
         return QVariant();
-    if (role == Qt::AccessibleTextRole && index.column() == ValuesModel::DataColumn)
+    if (role == Qt::AccessibleTextRole)
         return spoken_data(index);
     if (!is_synthetic(index.row()))
         return sourceModel()->data(mapToSource(index), role);
@@ -348,4 +350,11 @@ void ValuesProxyModel::on_rows_inserted(const QModelIndex&, int first, int last)
         return;
     beginInsertRows(QModelIndex(), first, last);
     endInsertRows();
+}
+
+// Of the row that a change was made to this model says itself what is to be said. Types and data together are what the
+// source found changed beside it.
+void ValuesProxyModel::on_data_changed(const QModelIndex& first, const QModelIndex& last) {
+    if (first.column() == ValuesModel::TypeColumn)
+        emit dataChanged(mapFromSource(first), mapFromSource(last));
 }

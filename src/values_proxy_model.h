@@ -44,6 +44,7 @@ public:
 
 public slots:
     void on_rows_inserted(const QModelIndex& parent, int first, int last);
+    void on_data_changed(const QModelIndex& first, const QModelIndex& last);
 
 private:
     RegKey* key() const;

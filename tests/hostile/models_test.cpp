@@ -11,12 +11,16 @@
 #include "failure_report.h"
 #include "reg_key.h"
 #include "reg_model.h"
+#include "value_order.h"
 #include "values_model.h"
 #include "values_proxy_model.h"
 
 #include <QTest>
 
+#include <malloc.h>
+
 #include <algorithm>
+#include <set>
 
 namespace {
 
@@ -151,6 +155,24 @@ std::vector<Item> items_of(const testkit::Bytes& bytes, const std::string& key,
     return snapshot.items;
 }
 
+size_t memory_in_use() {
+    const struct mallinfo2 info = mallinfo2();
+    return info.uordblks + info.hblkhd;
+}
+
+// Notes how much memory is in use whenever it is asked.
+class WatchedModel : public ValuesModel {
+public:
+    using ValuesModel::ValuesModel;
+
+    QVariant data(const QModelIndex& index, int role) const override {
+        most = std::max(most, memory_in_use());
+        return ValuesModel::data(index, role);
+    }
+
+    mutable size_t most = 0;
+};
+
 }  // namespace
 
 class HostileModelsTest : public QObject {
@@ -207,7 +229,93 @@ private slots:
         QVERIFY(!read_tree(again).empty());
     }
 
+    // However many values share the data of one, and however much more memory it takes than it is stored in.
+    void data_that_many_values_share_is_held_within_bounds() {
+        constexpr int count = 40;
+        constexpr int strings = 200000;
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        for (int i = 0; i < count; i++)
+            key.set("v" + std::to_string(i), 7, testkit::Bytes(i == 0 ? 2 * strings : 8));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        const auto& values = laid.at("Key").values;
+        for (const testkit::ValuePlaces& value : values) {
+            laid.put32(value.record, 4, 2 * strings);
+            laid.put32(value.record, 8, values[0].data);
+        }
+        Mounted mounted(laid.bytes);
+        ValuesModel model(key_of_row(mounted, 0));
+        const size_t before = memory_in_use();
+        qsizetype most = 0;
+        for (int row = 0; row < count; row++) {
+            QCOMPARE(model.index(row, 2).data().toStringList().size(), strings - 1);
+            most = std::max(most, model.cached_bytes());
+        }
+        constexpr auto of_one = static_cast<qsizetype>(sizeof(QString)) * (strings - 1);
+        QVERIFY(model.cached_bytes() >= of_one);
+        QVERIFY2(most <= qsizetype{64} << 20, qPrintable(QString::number(most)));
+        QVERIFY(memory_in_use() < before + (size_t{96} << 20));
+    }
+
+    // However often a list leads to it.
+    void one_long_name_is_held_once() {
+        constexpr int rows = 2000;
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        for (int i = 0; i < rows; i++)
+            key.set(i < 2 ? std::string(65534, 'n') + (i == 0 ? 'a' : 'b') : std::to_string(i), 4, testkit::pattern(4));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        const testkit::KeyPlaces& places = laid.at("Key");
+        for (uint32_t i = 2; i < rows; i++)
+            laid.put32(places.value_list, 4 * i, places.values[i % 2].record);
+        Mounted mounted(laid.bytes);
+        RegKey* const listed = key_of_row(mounted, 0);
+        QCOMPARE(listed->value_count(), rows);
+        const auto names = shown_value_names(*listed, ValuesModel::default_name(), [] { return false; });
+        QVERIFY(names.has_value());
+        QCOMPARE(names->size(), size_t{rows + 1});
+        std::set<const QChar*> texts;
+        for (const QString& name : *names)
+            texts.insert(name.constData());
+        QCOMPARE(texts.size(), size_t{3});
+
+        WatchedModel model(listed);
+        ValuesProxyModel sorted;
+        sorted.setSourceModel(&model);
+        const size_t before = memory_in_use();
+        sorted.sort(0, Qt::AscendingOrder);
+        QVERIFY2(model.most < before + (size_t{16} << 20), qPrintable(QString::number(model.most - before)));
+        QVERIFY(sorted.index(rows / 2, 0).data().toString().endsWith(QLatin1Char('a')));
+        QVERIFY(sorted.index(rows / 2 + 1, 0).data().toString().endsWith(QLatin1Char('b')));
+    }
+
+    // Reading the names of one key may take long.
+    void a_search_is_stopped_amid_the_values_of_one_key() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        for (int i = 0; i < 1000; i++)
+            key.set("v" + std::to_string(i), 4, testkit::pattern(4));
+        Mounted mounted(testkit::lay_out(hive).bytes);
+        const QModelIndex index = mounted.model.index(0, 0, mounted.model.index(0, 0, mounted.model.index(0, 0)));
+        const RegModel::FindMode mode(RegModel::FindKeys | RegModel::FindValues);
+        const auto find = [&] { return mounted.model.find(QStringLiteral("Key"), mode, Qt::MatchFixedString).key; };
+        mounted.model.begin_find(mounted.model.index(0, 0));
+        QCOMPARE(find(), index);
+        mounted.model.begin_find(mounted.model.index(0, 0));
+        mounted.model.stop_find();
+        // What was not visited stays to be visited.
+        for (int i = 0; i < 3; i++) {
+            QVERIFY(!find().isValid());
+            QCOMPARE(mounted.model.searched_key(), index);
+        }
+    }
+
 private:
+    static RegKey* key_of_row(const Mounted& mounted, int row) {
+        const QModelIndex mount = mounted.model.index(0, 0, mounted.model.index(0, 0));
+        return RegModel::editable_key(mounted.model.index(row, 0, mount));
+    }
+
     static QString key_left_alone(Mounted& mounted, const QModelIndex& mount) {
         QString last;
         for (int row = 0; row < mounted.model.rowCount(mount); row++) {

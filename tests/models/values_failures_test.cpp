@@ -338,6 +338,53 @@ private slots:
         QVERIFY(misled > 0);
     }
 
+    // The cell is empty only as long as the file cannot be read.
+    void data_that_could_not_be_read_is_read_again() {
+        int empty = 0;
+        bool failed = true;
+        for (int nth = 1; failed; nth++) {
+            const Shown shown(Wide);
+            const int rows = shown.source.rowCount();
+            {
+                const testkit::ReadFaults faults(nth);
+                for (int row = 0; row < rows; row++) {
+                    try {
+                        empty += shown.source.index(row, 2).data().isValid() ? 0 : 1;
+                    } catch (const std::exception&) {
+                        // told
+                    }
+                }
+                failed = faults.failed();
+            }
+            for (int row = 0; row < rows; row++)
+                QVERIFY(shown.source.index(row, 2).data().isValid());
+        }
+        QVERIFY(empty > 0);
+    }
+
+    // A screen reader asks through parts of the toolkit that lose memory when an exception passes them.
+    void what_cannot_be_read_is_spoken_of_without_an_exception() {
+        QSet<QString> spoken;
+        for (int column = 0; column < 3; column++) {
+            bool failed = true;
+            for (int nth = 1; failed; nth++) {
+                const Shown shown(Wide);
+                const QModelIndex cell = shown.proxy.index(2, column);
+                const testkit::ReadFaults faults(nth, true);
+                const QVariant text = cell.data(Qt::AccessibleTextRole);
+                if (text.toString().isEmpty())
+                    cell.data(Qt::DisplayRole);  // as the toolkit does
+                else
+                    spoken.insert(QStringLiteral("%1: %2").arg(column).arg(text.toString().left(16)));
+                failed = faults.failed();
+            }
+        }
+        const QSet<QString> expected = {QStringLiteral("0: value 1"), QStringLiteral("1: REG_BINARY"),
+                                        QStringLiteral("1: (cannot be read)"), QStringLiteral("2: 01 08 0f 16 1d 2"),
+                                        QStringLiteral("2: (cannot be read)")};
+        QCOMPARE(spoken, expected);
+    }
+
     void a_deletion() {
         Outcomes outcomes;
         for (const Drops drops : {Drops::never, Drops::amid_the_change}) {

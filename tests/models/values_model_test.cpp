@@ -5,6 +5,7 @@
 #include "reg_hive.h"
 #include "reg_key.h"
 #include "values_model.h"
+#include "values_proxy_model.h"
 
 #include <QAbstractItemModelTester>
 #include <QSignalSpy>
@@ -171,6 +172,78 @@ private slots:
         QVERIFY(
             model.setData(cell, QStringList({QStringLiteral("a"), QString(), QStringLiteral("c")}), Qt::DisplayRole));
         QCOMPARE(file.stored("Key", "list"), QByteArray("a\0\0\0c\0\0\0\0\0", 10));
+    }
+
+    // Another key object, or a write that landed by half, may have changed what a row was shown with.
+    void data_is_compared_with_what_the_file_has() {
+        Opened opened;
+        const QModelIndex cell = opened.model.index(3, ValuesModel::DataColumn);
+        const QVariant shown = cell.data();
+        QVERIFY(opened.key->set_binary_value(QStringLiteral("bytes"), QByteArrayLiteral("other"), REG_BINARY, 3));
+        QVERIFY(opened.model.setData(cell, shown, Qt::EditRole));
+        QCOMPARE(opened.file.stored("Key", "bytes"), shown.toByteArray());
+    }
+
+    void after_a_refusal_every_row_is_read_again() {
+        Opened opened;
+        const QModelIndex cell = opened.model.index(3, ValuesModel::DataColumn);
+        cell.data();
+        opened.text(0, 2);
+        QVERIFY(opened.key->set_binary_value(QStringLiteral("bytes"), QByteArrayLiteral("other"), REG_BINARY, 3));
+        QSignalSpy changed(&opened.model, &QAbstractItemModel::dataChanged);
+        QVERIFY(!opened.model.setData(opened.model.index(5, 2), QByteArrayLiteral("x"), Qt::EditRole));
+        QCOMPARE(changed.size(), 1);
+        QCOMPARE(changed[0][0].toModelIndex(), opened.model.index(3, ValuesModel::TypeColumn));
+        QCOMPARE(changed[0][1].toModelIndex(), cell);
+        QCOMPARE(cell.data().toByteArray(), QByteArrayLiteral("other"));
+    }
+
+    // In a damaged hive the data of two values may lie in one cell.
+    void data_that_two_values_share_changes_in_both_rows_data() {
+        QTest::addColumn<bool>("through_the_table");
+        QTest::newRow("in the key's own order") << false;
+        QTest::newRow("in the table") << true;
+    }
+
+    void data_that_two_values_share_changes_in_both_rows() {
+        QFETCH(const bool, through_the_table);
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        for (const char* name : {"", "two", "one", "apart"})
+            key.set(name, 1, testkit::text_data("as it was"));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        const auto& values = laid.at("Key").values;
+        laid.put32(values[2].record, 8, values[1].data);
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        ValuesModel source(static_cast<RegKey*>(opened.root_key()->child(0)));
+        ValuesProxyModel table;
+        table.setSourceModel(&source);
+        table.sort(0, Qt::AscendingOrder);
+        QAbstractItemModel& model = through_the_table ? static_cast<QAbstractItemModel&>(table) : source;
+        const auto cell = [&](int row, int column) {
+            const QModelIndex index = source.index(row, column);
+            return through_the_table ? table.mapFromSource(index) : index;
+        };
+        for (int row = 0; row < 4; row++)
+            QCOMPARE(cell(row, 2).data().toString(), QStringLiteral("as it was"));
+        QSignalSpy changed(&model, &QAbstractItemModel::dataChanged);
+        const QString now = QStringLiteral("new text!");
+        QVERIFY(model.setData(cell(1, 2), now, Qt::EditRole));
+        QCOMPARE(cell(1, 2).data().toString(), now);
+        QCOMPARE(cell(2, 2).data().toString(), now);
+        QCOMPARE(changed.size(), 2);
+        QCOMPARE(changed[through_the_table ? 1 : 0][0].toModelIndex(), cell(1, 2));
+        QCOMPARE(changed[through_the_table ? 0 : 1][1].toModelIndex(), cell(2, 2));
+        // What the other one was shown with before is no longer what is stored.
+        QVERIFY(model.setData(cell(2, 2), QStringLiteral("as it was"), Qt::EditRole));
+        QCOMPARE(file.stored("Key", "one"), file.stored("Key", ""));
+        changed.clear();
+        QVERIFY(model.setData(cell(3, 2), now, Qt::EditRole));
+        QCOMPARE(changed.size(), 1);
+        QCOMPARE(changed[0][0].toModelIndex(), cell(3, 2));
+        QCOMPARE(changed[0][1].toModelIndex(), cell(3, 2));
     }
 
     void a_type_without_a_name_cannot_be_written() {
