@@ -119,6 +119,8 @@ RegistryKey* RegHive::key_handle(const RegKey* key) {
         return root_handle_;
     if (const KeyHandleHolder* holder = handle_cache_.object(key))
         return holder->handle();
+    if (key->stands_in_)
+        throw std::runtime_error("ROpenSubKey failed");
     return open_child_handle(key, static_cast<const RegKey*>(key->parent()), key->child_number());
 }
 

@@ -141,6 +141,7 @@ AbstractRegKey* RegKey::shown_child(int i) {
     } catch (const std::runtime_error&) {
         auto unopened = std::make_unique<RegKey>(hive_, this);
         unopened->number_hint(static_cast<size_t>(i));
+        unopened->stands_in_ = true;
         return children_[static_cast<size_t>(i)] = unopened.release();
     }
 }
@@ -307,8 +308,11 @@ int RegKey::new_key() {
     if (static_cast<size_t>(position) > children_.size())
         children_.resize(static_cast<size_t>(position), nullptr);  // made through another object, see is_shown_at
     children_.insert(children_.begin() + position, nullptr);
-    // The key is there, so it gets its row, even where it cannot be opened.
-    shown_child(position);
+    try {
+        child(position);
+    } catch (const std::runtime_error&) {
+        // The key is there, so it gets its row; it is tried again when that is shown.
+    }
     return position;
 }
 

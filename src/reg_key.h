@@ -28,7 +28,8 @@ public:
     virtual AbstractRegKey* child(int i);
     virtual QString name() = 0;
     // The child in a slot, for a row that is shown: where it cannot be opened, an object without subkeys stands for
-    // it, which throws when it is asked for anything, so that one damaged record does not hide its siblings.
+    // it, which throws when it is asked for anything, so that one damaged record does not hide its siblings. It goes on
+    // doing so should the key open later: its row has been shown without subkeys.
     virtual AbstractRegKey* shown_child(int i) { return child(i); }
     // Whether a damaged hive lists this key below itself: one of the keys above it is the same.
     virtual bool is_below_itself() const { return false; }
@@ -138,7 +139,8 @@ private:
     // Where the engine found the key, UINT32_MAX when it has not been asked since the key was made. What the parent
     // lists at this object's place is only taken for its key when it lies there.
     uint32_t offset_ = UINT32_MAX;
-    int freed_before_ = 0;  // how many cells keys had left when the offset was learnt
+    bool stands_in_ = false;  // for a key that could not be opened when its row was shown, see shown_child
+    int freed_before_ = 0;    // how many cells keys had left when the offset was learnt
 };
 
 // A named group with no hive behind it: the first part of a mount name.
