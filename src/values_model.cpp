@@ -26,8 +26,9 @@ qsizetype memory_of(const QVariant& data) {
     qsizetype bytes = 0;
     if (data.typeId() == QMetaType::QStringList) {
         const QStringList list = data.toStringList();
+        bytes = list.capacity() * static_cast<qsizetype>(sizeof(QString));
         for (const QString& text : list)
-            bytes += static_cast<qsizetype>(sizeof(QString)) + text.size() * character;
+            bytes += text.capacity() * character;
     }
     return bytes;
 }
