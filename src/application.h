@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The application object that meets exceptions from damaged keys, and what start-up needs around it.
+#pragma once
 
 #include <QApplication>
 #include <QString>

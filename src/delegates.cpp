@@ -29,9 +29,9 @@ void report_key_failure(const QModelIndex& index, const std::exception& failure)
 
 }  // namespace
 
-NameDelegate::NameDelegate(QWidget* main_window) : m_main_window(main_window) {
-    m_until_told.setSingleShot(true);
-    connect(&m_until_told, &QTimer::timeout, this, &NameDelegate::tell_refused_names);
+NameDelegate::NameDelegate(QWidget* main_window) : main_window_(main_window) {
+    until_told_.setSingleShot(true);
+    connect(&until_told_, &QTimer::timeout, this, &NameDelegate::tell_refused_names);
 }
 
 void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,
@@ -79,18 +79,18 @@ bool NameDelegate::write_back(const QWidget& editor, QAbstractItemModel& model, 
 }
 
 void NameDelegate::tell_later(const QString& text) const {
-    m_untold.append(text);
-    m_until_told.start(0);
+    untold_.append(text);
+    until_told_.start(0);
 }
 
 void NameDelegate::tell_refused_names() const {
-    while (!m_untold.isEmpty()) {
-        tell_failure(m_main_window, m_untold.takeFirst());
+    while (!untold_.isEmpty()) {
+        tell_failure(main_window_, untold_.takeFirst());
     }
 }
 
 QString ValueDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
-    return value_text(value, m_limit);
+    return value_text(value, limit_);
 }
 
 void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
@@ -122,7 +122,7 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
     try {
         const qsizetype limit = std::max<qsizetype>(shortest_cut, option->rect.width() / 2);
         // The base class asks displayText for the text, and takes font, icon and colours from the same index.
-        const QScopedValueRollback<qsizetype> cut(m_limit, limit);
+        const QScopedValueRollback<qsizetype> cut(limit_, limit);
         QStyledItemDelegate::initStyleOption(option, index);
         // Bytes and numbers have one order, whichever way the rest of the window reads.
         if (index.column() == ValuesModel::DataColumn) {

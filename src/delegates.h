@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The delegates of the two views: they render value data, commit in-place renames, and let no exception of a
 // damaged key pass through a paint.
+#pragma once
 
 #include <QStringList>
 #include <QStyledItemDelegate>
@@ -41,9 +41,9 @@ private:
     bool write_back(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index) const;
     void tell_later(const QString& text) const;
 
-    QWidget* m_main_window;
-    mutable QStringList m_untold;
-    mutable QTimer m_until_told;
+    QWidget* main_window_;
+    mutable QStringList untold_;
+    mutable QTimer until_told_;
 };
 
 class ValueDelegate : public NameDelegate {
@@ -66,7 +66,7 @@ protected:
 
 private:
     // How many characters displayText need give; fewer than all only while a cell is laid out.
-    mutable qsizetype m_limit = std::numeric_limits<qsizetype>::max();
+    mutable qsizetype limit_ = std::numeric_limits<qsizetype>::max();
 };
 
 class KeyDelegate : public NameDelegate {

@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 #include "edit_dialogs.h"
 
+#include "compact_dialog.h"
+
 #include <QAbstractItemModel>
 #include <QCoreApplication>
 #include <QDialog>
@@ -22,13 +24,13 @@ namespace {
 // reads it.
 class Loan {
 public:
-    explicit Loan(QWidget* widget) : m_widget(widget) {}
-    ~Loan() { m_widget->setParent(nullptr); }
+    explicit Loan(QWidget* widget) : widget_(widget) {}
+    ~Loan() { widget_->setParent(nullptr); }
     Loan(const Loan&) = delete;
     Loan& operator=(const Loan&) = delete;
 
 private:
-    QWidget* m_widget;
+    QWidget* widget_;
 };
 
 // Lays out an editor around its data widget and runs it; true for Ok.
@@ -52,12 +54,7 @@ bool run_editor(const QString& title, const QString& value_name, QWidget* data_w
     layout->addWidget(data_label);
     layout->addWidget(data_widget);
     layout->addWidget(buttons);
-    // The layout's own minimum first, so that the height which is then fixed is the one that the dialog has.
-    dialog.ensurePolished();
-    layout->activate();
-    dialog.resize(360, 60);
-    dialog.setMaximumHeight(dialog.height());
-    data_widget->setFocus();
+    make_compact(dialog, *data_widget);
     return dialog.exec() == QDialog::Accepted;
 }
 
@@ -109,8 +106,8 @@ bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QBy
     QLineEdit edit;
     take_any_length(edit);
     edit.setText(QString::fromLatin1(data.toHex()));
-    // One class of characters instead of three alternatives: the same language, without a match step per digit on
-    // the matcher's stack, which runs out at some ten thousand digits.
+    // One class of characters and no alternatives: these take a step per digit on the matcher's stack, which runs out
+    // at some ten thousand digits.
     edit.setValidator(new QRegularExpressionValidator(QRegularExpression(QStringLiteral("[a-fA-F0-9]*")), &edit));
     if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Binary Value", "dialog title"), value_name,
                     &edit)) {

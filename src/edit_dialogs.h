@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The modal editors for text, bytes and lists of texts, each run for one value at a time.
+#pragma once
 
 #include <QByteArray>
 #include <QString>

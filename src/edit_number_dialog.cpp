@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "edit_number_dialog.h"
 
+#include "compact_dialog.h"
 #include "validators.h"
 
 #include <QDialogButtonBox>
@@ -52,12 +53,7 @@ EditNumberDialog::EditNumberDialog(const QString& value_name, int bits)
     outer->addWidget(name_edit);
     outer->addLayout(make_data_row());
     outer->addWidget(buttons);
-    // The layout's own minimum first, so that the height which is then fixed is the one that the dialog has.
-    ensurePolished();
-    outer->activate();
-    resize(360, 60);
-    setMaximumHeight(height());
-    data_edit->setFocus();
+    make_compact(*this, *data_edit);
 }
 
 QLayout* EditNumberDialog::make_data_row() {

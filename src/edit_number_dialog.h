@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The modal editors for 32-bit and 64-bit numbers, in hexadecimal or decimal.
+#pragma once
 
 #include <QDialog>
 

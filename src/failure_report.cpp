@@ -28,59 +28,59 @@ FailureReport& FailureReport::instance() {
 void FailureReport::report(const QString& key_path, const std::exception& failure) {
     const QString reason = QString::fromLocal8Bit(failure.what());
     const QPair<QString, QString> cause(key_path, reason);
-    if (m_told.contains(cause)) {
+    if (told_.contains(cause)) {
         return;
     }
     // Rows that come into sight while the user scrolls would each bring a box. So many of one key's subkeys, damaged in
     // one way, are named; the others say so themselves.
-    int& told = m_told_below[{key_path.left(key_path.lastIndexOf(QLatin1Char('\\'))), reason}];
-    if (told >= max_lines && m_pending.isEmpty()) {
+    int& told = told_below_[{key_path.left(key_path.lastIndexOf(QLatin1Char('\\'))), reason}];
+    if (told >= max_lines && pending_.isEmpty()) {
         return;
     }
     ++told;
-    m_pending.append(told_elsewhere(key_path, reason));
-    if (!m_scheduled) {
-        m_scheduled = true;
+    pending_.append(told_elsewhere(key_path, reason));
+    if (!scheduled_) {
+        scheduled_ = true;
         QMetaObject::invokeMethod(this, &FailureReport::show_pending, Qt::QueuedConnection);
     }
 }
 
 QString FailureReport::told_elsewhere(const QString& key_path, const QString& reason) {
-    m_told.insert({key_path, reason});
+    told_.insert({key_path, reason});
     return key_path.isEmpty() ? tr("The registry cannot be read: %1").arg(reason)
                               : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
 }
 
 void FailureReport::report_at_current(const std::exception& failure, bool from_gesture) {
     const QString reason = QString::fromLocal8Bit(failure.what());
-    if (!is_told_below(from_gesture ? m_current_key + QLatin1Char('\\') : QString(), reason)) {
-        report(m_current_key, failure);
+    if (!is_told_below(from_gesture ? current_key_ + QLatin1Char('\\') : QString(), reason)) {
+        report(current_key_, failure);
     }
 }
 
 void FailureReport::report_at_shown(const std::exception& failure) {
-    if (!is_told_below(m_shown_key + QLatin1Char('\\'), QString::fromLocal8Bit(failure.what()))) {
-        report(m_shown_key, failure);
+    if (!is_told_below(shown_key_ + QLatin1Char('\\'), QString::fromLocal8Bit(failure.what()))) {
+        report(shown_key_, failure);
     }
 }
 
 bool FailureReport::is_told_below(const QString& key_path, const QString& reason) const {
-    return std::any_of(m_told.cbegin(), m_told.cend(), [&](const QPair<QString, QString>& told) {
+    return std::any_of(told_.cbegin(), told_.cend(), [&](const QPair<QString, QString>& told) {
         return told.second == reason && told.first.startsWith(key_path);
     });
 }
 
 void FailureReport::show_pending() {
     // What arrives while the box is open waits for the next one instead of stacking boxes.
-    while (!m_pending.isEmpty()) {
-        QStringList lines = m_pending.mid(0, max_lines);
-        if (m_pending.size() > max_lines) {
-            lines.append(tr("More keys cannot be read: %1").arg(m_pending.size() - max_lines));
+    while (!pending_.isEmpty()) {
+        QStringList lines = pending_.mid(0, max_lines);
+        if (pending_.size() > max_lines) {
+            lines.append(tr("More keys cannot be read: %1").arg(pending_.size() - max_lines));
         }
-        m_pending.clear();
+        pending_.clear();
         tell_failure(QApplication::activeWindow(), lines.join(QLatin1Char('\n')));
     }
-    m_scheduled = false;
+    scheduled_ = false;
 }
 
 void tell_failure(QWidget* parent, const QString& text) {

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // Tells the user what a damaged key did while the window runs: in one box, once per cause, never from inside a paint.
+#pragma once
 
 #include <QHash>
 #include <QModelIndex>
@@ -38,22 +38,22 @@ public:
     QString told_elsewhere(const QString& key_path, const QString& reason);
 
     // The key that the user's last gesture was about.
-    void set_current_key(const QString& key_path) { m_current_key = key_path; }
+    void set_current_key(const QString& key_path) { current_key_ = key_path; }
     // The key whose values are shown; the gesture that showed them was about it.
-    void set_shown_key(const QString& key_path) { m_current_key = m_shown_key = key_path; }
-    QString shown_key() const { return m_shown_key; }
+    void set_shown_key(const QString& key_path) { current_key_ = shown_key_ = key_path; }
+    QString shown_key() const { return shown_key_; }
 
 private:
     explicit FailureReport(QObject* parent);
     void show_pending();
     bool is_told_below(const QString& key_path, const QString& reason) const;
 
-    QString m_current_key;
-    QString m_shown_key;
-    QSet<QPair<QString, QString>> m_told;              // key path and reason
-    QHash<QPair<QString, QString>, int> m_told_below;  // path of the key above, and reason
-    QStringList m_pending;
-    bool m_scheduled = false;
+    QString current_key_;
+    QString shown_key_;
+    QSet<QPair<QString, QString>> told_;              // key path and reason
+    QHash<QPair<QString, QString>, int> told_below_;  // path of the key above, and reason
+    QStringList pending_;
+    bool scheduled_ = false;
 };
 
 // A critical box with the application's name that shows the text letter by letter: a key's name may look like markup.

@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 #include "find_dialog.h"
 
+#include "compact_dialog.h"
+
 #include <QCheckBox>
 #include <QCoreApplication>
 #include <QDialog>
@@ -43,12 +45,7 @@ bool ask_find_request(FindRequest& request) {
                                                            substring_button, whole_button, wildcard_button, buttons}) {
         layout->addWidget(widget);
     }
-    // The layout's own minimum first, so that the height which is then fixed is the one that the dialog has.
-    dialog.ensurePolished();
-    layout->activate();
-    dialog.resize(360, 60);
-    dialog.setMaximumHeight(dialog.height());
-    term_edit->setFocus();
+    make_compact(dialog, *term_edit);
     if (dialog.exec() != QDialog::Accepted) {
         return false;
     }
@@ -66,7 +63,7 @@ bool ask_find_request(FindRequest& request) {
 QDialog* make_searching_dialog(QWidget* parent) {
     auto* dialog = new QDialog(parent);
     dialog->setAttribute(Qt::WA_DeleteOnClose);
-    // The comment lacks its closing parenthesis in every translation too: it is part of the text's identity.
+    // The comment lacks its closing parenthesis in the translations' files too, where a text is found by it.
     dialog->setWindowTitle(QCoreApplication::translate("MainWindow", "Find", "dialog title (search in progress"));
     dialog->setAccessibleName(QStringLiteral("Searching..."));
     auto* busy = new QProgressBar;

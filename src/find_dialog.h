@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The dialog that asks what to search for, and the one that stays up while a search runs.
+#pragma once
 
 #include "reg_model.h"
 

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // Ends the in-place editors before anything changes, sorts or searches the rows that they stand on.
+#pragma once
 
 class QWidget;
 

@@ -57,7 +57,7 @@ QModelIndex KeysView::in_place(const QModelIndex& key) {
 
 void KeysView::show_keys_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
-    if (std::exchange(m_menu_is_stale, false) || !may_change_rows(*this)) {
+    if (std::exchange(menu_is_stale_, false) || !may_change_rows(*this)) {
         return;
     }
     const QModelIndex index = indexAt(point);
@@ -144,13 +144,13 @@ void KeysView::keyboardSearch(const QString& typed) {
     if (!model() || model()->rowCount() == 0 || typed.isEmpty()) {
         return;
     }
-    const bool goes_on = m_since_typed.isValid() && m_since_typed.elapsed() < QApplication::keyboardInputInterval() &&
-                         !m_typed.isEmpty();
-    m_typed = goes_on ? m_typed + typed : typed;
-    m_since_typed.start();
+    const bool goes_on =
+        since_typed_.isValid() && since_typed_.elapsed() < QApplication::keyboardInputInterval() && !typed_.isEmpty();
+    typed_ = goes_on ? typed_ + typed : typed;
+    since_typed_.start();
     // One letter again and again goes from match to match.
-    const bool is_repeated = m_typed.count(m_typed[0]) == m_typed.size();
-    const QString wanted = is_repeated ? m_typed.left(1) : m_typed;
+    const bool is_repeated = typed_.count(typed_[0]) == typed_.size();
+    const QString wanted = is_repeated ? typed_.left(1) : typed_;
     const QModelIndex current = currentIndex();
     if (!is_repeated && select_if_named(current, wanted)) {
         return;
@@ -231,7 +231,7 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
 }
 
 bool KeysView::take_press_from_naming(QPoint point) {
-    m_menu_is_stale = false;
+    menu_is_stale_ = false;
     if (state() != QAbstractItemView::EditingState) {
         return false;
     }
@@ -244,7 +244,7 @@ bool KeysView::take_press_from_naming(QPoint point) {
     if (pressed.isValid()) {
         setCurrentIndex(pressed);
     }
-    m_menu_is_stale = true;
+    menu_is_stale_ = true;
     return true;
 }
 

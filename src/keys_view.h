@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The key tree: its context menu, and the key commands of the shared actions.
+#pragma once
 
 #include <QElapsedTimer>
 #include <QTreeView>
@@ -43,7 +43,7 @@ private:
     void tell_refused(const QString& text);
 
     // The press that asks for the next context menu was meant for a row that has moved away.
-    bool m_menu_is_stale = false;
-    QString m_typed;
-    QElapsedTimer m_since_typed;
+    bool menu_is_stale_ = false;
+    QString typed_;
+    QElapsedTimer since_typed_;
 };

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The one top-level window: the key tree, the values of the current key, the menus, the status bar and the search.
+#pragma once
 
 #include "delegates.h"
 #include "reg_model.h"

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The one set of editing actions that the main menu and both context menus share.
+#pragma once
 
 class QAction;
 class QActionGroup;

@@ -29,15 +29,15 @@ QValidator::State judge(const QString& input, Number bottom, Number top, Parse p
 }  // namespace
 
 UintValidator::UintValidator(quint32 bottom, quint32 top, QObject* parent)
-    : QValidator(parent), m_bottom(bottom), m_top(top) {}
+    : QValidator(parent), bottom_(bottom), top_(top) {}
 
 QValidator::State UintValidator::validate(QString& input, int& /*pos*/) const {
-    return judge<quint32>(input, m_bottom, m_top, [&](bool* fits) { return input.toUInt(fits, 10); });
+    return judge<quint32>(input, bottom_, top_, [&](bool* fits) { return input.toUInt(fits, 10); });
 }
 
 Uint64Validator::Uint64Validator(quint64 bottom, quint64 top, QObject* parent)
-    : QValidator(parent), m_bottom(bottom), m_top(top) {}
+    : QValidator(parent), bottom_(bottom), top_(top) {}
 
 QValidator::State Uint64Validator::validate(QString& input, int& /*pos*/) const {
-    return judge<quint64>(input, m_bottom, m_top, [&](bool* fits) { return input.toULongLong(fits, 10); });
+    return judge<quint64>(input, bottom_, top_, [&](bool* fits) { return input.toULongLong(fits, 10); });
 }

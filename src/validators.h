@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // Validators for unsigned decimal numbers of 32 and 64 bits; the toolkit's own knows signed ones only.
+#pragma once
 
 #include <QValidator>
 
@@ -15,8 +15,8 @@ public:
     State validate(QString& input, int& pos) const override;
 
 private:
-    quint32 m_bottom;
-    quint32 m_top;
+    quint32 bottom_;
+    quint32 top_;
 };
 
 class Uint64Validator : public QValidator {
@@ -28,6 +28,6 @@ public:
     State validate(QString& input, int& pos) const override;
 
 private:
-    quint64 m_bottom;
-    quint64 m_top;
+    quint64 bottom_;
+    quint64 top_;
 };

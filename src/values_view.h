@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // The values table: its context menus, new, delete and rename, and the editor that fits each kind of data.
+#pragma once
 
 #include <QTableView>
 

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // A hive of its own in a model, and searches of it.
+#pragma once
 
 #include "hive_on_disk.h"
 

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // A laid-out hive in a file of its own, and the file's bytes read afresh by a reader that is not the engine's.
+#pragma once
 
 #include "hive_bytes.h"
 #include "hive_checker.h"

@@ -59,15 +59,15 @@ public:
 
 class OneDatumModel : public QAbstractTableModel {
 public:
-    explicit OneDatumModel(QVariant datum) : m_datum(std::move(datum)) {}
+    explicit OneDatumModel(QVariant datum) : datum_(std::move(datum)) {}
     int rowCount(const QModelIndex& parent = {}) const override { return parent.isValid() ? 0 : 1; }
     int columnCount(const QModelIndex& parent = {}) const override { return parent.isValid() ? 0 : 1; }
     QVariant data(const QModelIndex& /*index*/, int role) const override {
-        return role == Qt::DisplayRole ? m_datum : QVariant();
+        return role == Qt::DisplayRole ? datum_ : QVariant();
     }
 
 private:
-    QVariant m_datum;
+    QVariant datum_;
 };
 
 // What `act` writes to standard output.

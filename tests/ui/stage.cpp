@@ -48,11 +48,11 @@ testkit::HiveLayout layout() {
 Scene::Scene() : Scene(layout()) {}
 
 Scene::Scene(const testkit::HiveLayout& layout, const std::function<void(testkit::LaidHive&)>& change)
-    : m_laid(testkit::lay_out(layout)) {
+    : laid_(testkit::lay_out(layout)) {
     if (change) {
-        change(m_laid);
+        change(laid_);
     }
-    write(m_laid.bytes);
+    write(laid_.bytes);
 }
 
 void Scene::write(const testkit::Bytes& all) const {
@@ -64,13 +64,13 @@ void Scene::write(const testkit::Bytes& all) const {
 }
 
 void Scene::damage_key(const std::string& path) {
-    testkit::LaidHive damaged = m_laid;
+    testkit::LaidHive damaged = laid_;
     damaged.put16(damaged.at(path).record, 0, 0x7878);
     write(damaged.bytes);
 }
 
 void Scene::damage_value(const std::string& path, size_t place) {
-    testkit::LaidHive damaged = m_laid;
+    testkit::LaidHive damaged = laid_;
     damaged.put16(damaged.at(path).values.at(place).record, 0, 0x7878);
     write(damaged.bytes);
 }

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // A small hive of every kind of value, and the program's window over it.
+#pragma once
 
 #include "hive_bytes.h"
 #include "keys_view.h"
@@ -32,7 +32,7 @@ public:
     // `change` may damage the bytes.
     explicit Scene(const testkit::HiveLayout& layout, const std::function<void(testkit::LaidHive&)>& change = {});
 
-    QString file() const { return m_directory.filePath(QStringLiteral("hive")); }
+    QString file() const { return directory_.filePath(QStringLiteral("hive")); }
     // Writes the file anew with the signature of one key's record overwritten.
     void damage_key(const std::string& path);
     // The same for one value of a key, by its place in the key's list.
@@ -43,8 +43,8 @@ public:
 private:
     void write(const testkit::Bytes& all) const;
 
-    testkit::LaidHive m_laid;
-    QTemporaryDir m_directory;
+    testkit::LaidHive laid_;
+    QTemporaryDir directory_;
 };
 
 // The window over a scene, shown and active, as the program's entry makes it.

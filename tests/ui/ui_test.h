@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // What every test of the user interface starts from: the program's own application object, and a hand for the
 // modal dialogs that a call under test opens.
+#pragma once
 
 #include "application.h"
 
@@ -30,18 +30,18 @@ public:
     using Step = std::function<void(QWidget*)>;
 
     DialogHand() {
-        QObject::connect(&m_timer, &QTimer::timeout, &m_timer, [this] { look(); });
-        m_timer.start(1);
+        QObject::connect(&timer_, &QTimer::timeout, &timer_, [this] { look(); });
+        timer_.start(1);
     }
 
     // The "Searching..." dialog, which comes and goes by itself, is left to then_while_searching.
     DialogHand& then(Step step) {
-        m_steps.push_back({std::move(step), false});
+        steps_.push_back({std::move(step), false});
         return *this;
     }
 
     DialogHand& then_while_searching(Step step) {
-        m_steps.push_back({std::move(step), true});
+        steps_.push_back({std::move(step), true});
         return *this;
     }
 
@@ -60,12 +60,12 @@ public:
         });
     }
 
-    bool is_done() const { return m_steps.empty(); }
+    bool is_done() const { return steps_.empty(); }
 
     // Lets what is queued come; false when a dialog was or is among it that no step waits for.
     bool nothing_comes() const {
         QCoreApplication::processEvents();
-        return !m_was_surprised && !QApplication::activeModalWidget();
+        return !was_surprised_ && !QApplication::activeModalWidget();
     }
 
     // Of the last box that was pressed.
@@ -83,18 +83,18 @@ private:
             return;
         }
         const bool is_searching = dialog->accessibleName() == QStringLiteral("Searching...");
-        if (m_steps.empty()) {
-            if (!is_searching && !m_answered.contains(dialog)) {
+        if (steps_.empty()) {
+            if (!is_searching && !answered_.contains(dialog)) {
                 refuse(*dialog);
             }
             return;
         }
-        if ((!m_answered.isEmpty() && dialog == m_answered.last()) || is_searching != m_steps.front().second) {
+        if ((!answered_.isEmpty() && dialog == answered_.last()) || is_searching != steps_.front().second) {
             return;
         }
-        m_answered.append(dialog);
-        const Step step = std::move(m_steps.front().first);
-        m_steps.pop_front();
+        answered_.append(dialog);
+        const Step step = std::move(steps_.front().first);
+        steps_.pop_front();
         // Not from inside the timer's own event: a step may open the next dialog before it returns.
         const QPointer<QWidget> shown = dialog;
         QTimer::singleShot(0, qApp, [step, shown] {
@@ -105,17 +105,17 @@ private:
     }
 
     void refuse(QWidget& dialog) {
-        m_was_surprised = true;
+        was_surprised_ = true;
         const auto* box = qobject_cast<QMessageBox*>(&dialog);
         const QString what = box ? box->text() : dialog.windowTitle();
         QTest::qFail(qPrintable(QStringLiteral("a dialog that no step waits for: ") + what), __FILE__, __LINE__);
         dialog.hide();
     }
 
-    QTimer m_timer;
-    QList<QPointer<QWidget>> m_answered;
-    bool m_was_surprised = false;
-    std::deque<std::pair<Step, bool>> m_steps;  // and whether it is for the search's dialog
+    QTimer timer_;
+    QList<QPointer<QWidget>> answered_;
+    bool was_surprised_ = false;
+    std::deque<std::pair<Step, bool>> steps_;  // and whether it is for the search's dialog
 };
 
 // Clicks a button of a dialog that has a button box.

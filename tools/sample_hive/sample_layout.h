@@ -1,9 +1,9 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
-#pragma once
-
+//
 // Lays a tree of keys and values out as the bytes of a hive file. It shares no code with the engine on
 // purpose, so that the sample shows what the engine makes of a file that somebody else wrote.
+#pragma once
 
 #include <cstdint>
 #include <string>

@@ -40,8 +40,8 @@ void tell_window(const QMainWindow& window) {
 class Presser : public QObject {
 public:
     Presser() {
-        connect(&m_timer, &QTimer::timeout, this, &Presser::look);
-        m_timer.start(5);
+        connect(&timer_, &QTimer::timeout, this, &Presser::look);
+        timer_.start(5);
     }
 
 private:
@@ -52,14 +52,14 @@ private:
             tell("icon", box->icon() == QMessageBox::Critical ? QStringLiteral("critical") : QStringLiteral("other"));
             tell("buttons", QString::number(box->standardButtons()));
             tell("parent", box->parentWidget() ? QStringLiteral("some") : QStringLiteral("none"));
-            m_timer.stop();
+            timer_.stop();
             box->button(QMessageBox::Ok)->click();
             return;
         }
         for (const QWidget* widget : QApplication::topLevelWidgets()) {
             const auto* window = qobject_cast<const QMainWindow*>(widget);
             if (window && window->isVisible()) {
-                m_timer.stop();
+                timer_.stop();
                 tell_window(*window);
                 QCoreApplication::exit(qEnvironmentVariableIntValue("PRESSER_EXIT"));
                 return;
@@ -67,7 +67,7 @@ private:
         }
     }
 
-    QTimer m_timer;
+    QTimer timer_;
 };
 
 class PresserPlugin : public QGenericPlugin {
