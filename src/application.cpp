@@ -13,9 +13,13 @@
 #include <QMouseEvent>
 #include <QTranslator>
 
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <exception>
+
+#include <fcntl.h>
+#include <unistd.h>
 
 namespace {
 
@@ -66,8 +70,8 @@ bool Application::notify(QObject* receiver, QEvent* event) {
         // Here, since the toolkit moves the keyboard, which ends a naming, before any filter sees the press.
         if (event->type() == QEvent::MouseButtonPress && receiver->isWidgetType()) {
             auto* keys = qobject_cast<KeysView*>(receiver->parent());
-            const QPoint point = static_cast<QMouseEvent*>(event)->position().toPoint();
-            if (keys && receiver == keys->viewport() && keys->take_press_from_naming(point)) {
+            if (keys && receiver == keys->viewport() &&
+                keys->take_press_from_naming(*static_cast<QMouseEvent*>(event))) {
                 return true;
             }
         }
@@ -95,6 +99,17 @@ void load_translations(QTranslator& program, QTranslator& toolkit) {
         [[maybe_unused]] const bool loaded = toolkit.load(QStringLiteral("qtbase_") + locale, toolkit_directory);
     }
     QCoreApplication::installTranslator(&toolkit);
+}
+
+void prepare_streams() {
+    for (int stream = STDIN_FILENO; stream <= STDERR_FILENO; ++stream) {
+        // The lowest free number is taken, and those below are in use by now.
+        if (fcntl(stream, F_GETFD) == -1 && open("/dev/null", O_RDWR) != stream) {
+            std::abort();
+        }
+    }
+    std::signal(SIGXFSZ, SIG_IGN);
+    std::signal(SIGPIPE, SIG_IGN);
 }
 
 void install_terminate_handler() { std::set_terminate(tell_and_abort); }

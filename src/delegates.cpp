@@ -17,10 +17,6 @@
 
 namespace {
 
-// A cell shows no more letters than half its width in pixels; a row that is measured before it has a width is measured
-// by this many.
-constexpr qsizetype shortest_cut = 256;
-
 void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_shown(failure); }
 
 void report_key_failure(const QModelIndex& index, const std::exception& failure) {
@@ -120,10 +116,15 @@ QSize ValueDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIn
 
 void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
     try {
-        const qsizetype limit = std::max<qsizetype>(shortest_cut, option->rect.width() / 2);
+        // No more letters than half the cell's width in pixels.
+        const qsizetype most = std::max(shortest_cut, qsizetype{option->rect.width() / 2});
         // The base class asks displayText for the text, and takes font, icon and colours from the same index.
-        const QScopedValueRollback<qsizetype> cut(limit_, limit);
+        const QScopedValueRollback<qsizetype> cut(limit_, most + 1);
         QStyledItemDelegate::initStyleOption(option, index);
+        // Letters that take no room, line feeds among them, would hide that more follow.
+        if (option->text.size() > most) {
+            option->text = option->text.left(most) + QChar(0x2026);
+        }
         // Bytes and numbers have one order, whichever way the rest of the window reads.
         if (index.column() == ValuesModel::DataColumn) {
             option->direction = Qt::LeftToRight;

@@ -52,6 +52,9 @@ class ValueDelegate : public NameDelegate {
 public:
     using NameDelegate::NameDelegate;
 
+    // A cell lays out that many characters of a text at least; what is longer may be cut, and ends in an ellipsis then.
+    static constexpr qsizetype shortest_cut = 256;
+
     // The whole text of a datum, whatever its length; the locale is not used.
     QString displayText(const QVariant& value, const QLocale& locale) const override;
     void setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const override;

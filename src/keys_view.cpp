@@ -230,7 +230,8 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
     event->accept();
 }
 
-bool KeysView::take_press_from_naming(QPoint point) {
+bool KeysView::take_press_from_naming(const QMouseEvent& press) {
+    const QPoint point = press.position().toPoint();
     menu_is_stale_ = false;
     if (state() != QAbstractItemView::EditingState) {
         return false;
@@ -244,7 +245,7 @@ bool KeysView::take_press_from_naming(QPoint point) {
     if (pressed.isValid()) {
         setCurrentIndex(pressed);
     }
-    menu_is_stale_ = true;
+    menu_is_stale_ = press.button() == Qt::RightButton;
     return true;
 }
 

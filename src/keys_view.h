@@ -20,7 +20,7 @@ public:
 
     // Asked before a press of the mouse takes the keyboard from the editor of a name. Ends the naming; where that moves
     // the rows, the key that was pressed becomes current, and true says that the press has done its work.
-    bool take_press_from_naming(QPoint point);
+    bool take_press_from_naming(const QMouseEvent& press);
 
     // Moves to the next shown key whose name begins with what is being typed; passes over those without a name.
     void keyboardSearch(const QString& typed) override;

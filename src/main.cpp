@@ -28,6 +28,7 @@ void tell_hibernated() {
 }  // namespace
 
 int main(int argc, char** argv) {
+    prepare_streams();
     install_terminate_handler();
     Application application(argc, argv);
     QTranslator program_translator;

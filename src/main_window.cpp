@@ -244,6 +244,10 @@ void MainWindow::refresh_views() {
     if (current.isValid()) {
         values_table->setCurrentIndex(values_proxy->mapFromSource(current));
     }
+    // A value that became current has taken the actions, which are about what has the keyboard.
+    if (keys_tree->hasFocus()) {
+        set_key_actions(keys_tree->currentIndex());
+    }
 }
 
 void MainWindow::closeEvent(QCloseEvent* event) {

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "values_view.h"
 
+#include "delegates.h"
 #include "edit_dialogs.h"
 #include "edit_number_dialog.h"
 #include "failure_report.h"
@@ -269,9 +270,13 @@ bool ValuesView::viewportEvent(QEvent* event) {
     const auto* help = static_cast<QHelpEvent*>(event);
     const QModelIndex index = indexAt(help->pos());
     QString text;
-    if (index.isValid() && sizeHintForIndex(index).width() > columnWidth(index.column())) {
+    const QSize needed = sizeHintForIndex(index);
+    if (needed.isValid()) {  // it is not where the row cannot be read
         constexpr qsizetype longest = 1000;
-        text = shown_text(index, longest).left(longest);
+        const QString shown = shown_text(index, longest).left(longest);
+        if (shown.size() > ValueDelegate::shortest_cut || needed.width() > columnWidth(index.column())) {
+            text = shown;
+        }
     }
     // Made into paragraphs here, so that the tip takes no text for markup.
     QToolTip::showText(help->globalPos(), text.isEmpty() ? text : Qt::convertFromPlainText(text), viewport());

@@ -110,6 +110,8 @@ private slots:
     void a_megabyte_paints_like_a_kilobyte();
     void what_a_cell_shows_is_the_beginning_of_the_text_data();
     void what_a_cell_shows_is_the_beginning_of_the_text();
+    void a_text_that_is_cut_ends_in_an_ellipsis_data();
+    void a_text_that_is_cut_ends_in_an_ellipsis();
     void each_cell_has_its_own_icon();
 };
 
@@ -347,11 +349,40 @@ void DelegatesTest::what_a_cell_shows_is_the_beginning_of_the_text() {
         QPainter painter(&image);
         QStyleOptionViewItem option;
         option.rect = image.rect();
+        option.textElideMode = Qt::ElideRight;  // as the table's
         delegate.paint(&painter, option, model.index(0, 0));
         painter.end();
         return image;
     };
     QCOMPARE(painted(ValueDelegate(nullptr)), painted(PlainDelegate()));
+}
+
+void DelegatesTest::a_text_that_is_cut_ends_in_an_ellipsis_data() {
+    QTest::addColumn<QVariant>("datum");
+    QTest::addColumn<qsizetype>("length");
+    constexpr qsizetype all = ValueDelegate::shortest_cut;
+    QTest::newRow("text that fits") << QVariant(QString(all, QLatin1Char('\n'))) << all;
+    QTest::newRow("text one longer") << QVariant(QString(all + 1, QLatin1Char('\n'))) << all + 1;
+    QTest::newRow("bytes that fit") << QVariant(QByteArray(85, 'x')) << qsizetype{85 * 3 - 1};
+    QTest::newRow("bytes one more") << QVariant(QByteArray(86, 'x')) << all + 1;
+    QTest::newRow("texts that fit") << QVariant(QStringList(all / 2, QStringLiteral("a"))) << all - 1;
+    QTest::newRow("texts one more") << QVariant(QStringList(all / 2 + 1, QStringLiteral("a"))) << all + 1;
+}
+
+void DelegatesTest::a_text_that_is_cut_ends_in_an_ellipsis() {
+    QFETCH(QVariant, datum);
+    QFETCH(qsizetype, length);
+    class OpenDelegate : public ValueDelegate {
+    public:
+        using ValueDelegate::initStyleOption;
+        using ValueDelegate::ValueDelegate;
+    };
+    const OneDatumModel model(datum);
+    QStyleOptionViewItem option;
+    option.rect = QRect(0, 0, 400, 20);
+    OpenDelegate(nullptr).initStyleOption(&option, model.index(0, 0));
+    QCOMPARE(option.text.size(), length);
+    QCOMPARE(option.text.endsWith(QChar(0x2026)), length > ValueDelegate::shortest_cut);
 }
 
 // One delegate paints all cells in turn, and what it takes from one must not stay for the next.

@@ -3,14 +3,20 @@
 // The program's entry, run as a process: usage, exit codes, what is mounted, and what is told when a file is
 // no hive.
 
+#include "application.h"
 #include "stage.h"
 
 #include <QFile>
 #include <QProcess>
 #include <QTest>
 
+#include <cerrno>
 #include <csignal>
+#include <fcntl.h>
+#include <functional>
 #include <sys/file.h>
+#include <sys/resource.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
 namespace {
@@ -24,8 +30,10 @@ struct Ended {
 
 // Runs the program until it ends. The first line of standard error is the debug line of the translations,
 // which comes whatever the arguments are.
-Ended run(const QStringList& arguments, const QMap<QString, QString>& variables = {}) {
+Ended run(const QStringList& arguments, const QMap<QString, QString>& variables = {},
+          const std::function<void()>& in_child = {}) {
     QProcess process;
+    process.setChildProcessModifier(in_child);
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
     environment.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("offscreen"));
     environment.insert(QStringLiteral("QT_PLUGIN_PATH"), QStringLiteral(PRESSER_PLUGIN_PATH));
@@ -63,6 +71,9 @@ QString told(const Ended& ended) {
 const QString usage = QStringLiteral("usage: tallowfen [NAME FILE ...]\n");
 const QString tops = QStringLiteral("MACHINE/SYSTEM");
 
+// Something is said of such a hive when it is opened.
+void close_improperly(testkit::LaidHive& hive) { hive.put_base(8, 0x7f); }
+
 }  // namespace
 
 class EntryTest : public QObject {
@@ -77,6 +88,9 @@ private slots:
     void a_name_without_two_parts_mounts_nothing();
     void pairs_are_mounted_in_order();
     void a_hive_that_was_not_closed_properly_is_told();
+    void no_message_goes_into_a_hive_where_the_standard_streams_are_closed_data();
+    void no_message_goes_into_a_hive_where_the_standard_streams_are_closed();
+    void a_write_past_the_file_size_limit_fails_and_does_not_end_the_program();
     void the_event_loop_s_result_is_the_exit_status();
     void the_translation_line();
     void a_file_that_is_no_hive_ends_the_program_data();
@@ -160,12 +174,7 @@ void EntryTest::pairs_are_mounted_in_order() {
 }
 
 void EntryTest::a_hive_that_was_not_closed_properly_is_told() {
-    const Scene scene;
-    QFile file(scene.file());
-    constexpr qint64 second_sequence = 8;
-    QVERIFY(file.open(QIODevice::ReadWrite) && file.seek(second_sequence));
-    QCOMPARE(file.write("\x7f", 1), qint64(1));
-    file.close();
+    const Scene scene(testkit::HiveLayout(), close_improperly);
     const QByteArray before = scene.bytes();
     const Ended ended = run({tops, scene.file()}, {{QStringLiteral("PRESSER_EXIT"), QStringLiteral("0")}});
     QCOMPARE(ended.status, 0);
@@ -173,6 +182,45 @@ void EntryTest::a_hive_that_was_not_closed_properly_is_told() {
              QStringLiteral("warning: %1 was not closed properly; Windows may replay its logs over changes\n")
                  .arg(scene.file()));
     QCOMPARE(scene.bytes(), before);
+}
+
+void EntryTest::no_message_goes_into_a_hive_where_the_standard_streams_are_closed_data() {
+    QTest::addColumn<QList<int>>("closed");
+    QTest::newRow("all") << QList<int>{STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO};
+    QTest::newRow("output and error") << QList<int>{STDOUT_FILENO, STDERR_FILENO};
+    QTest::newRow("error") << QList<int>{STDERR_FILENO};
+}
+
+// The number of a closed stream goes to the next file that is opened.
+void EntryTest::no_message_goes_into_a_hive_where_the_standard_streams_are_closed() {
+    QFETCH(QList<int>, closed);
+    const Scene scene(testkit::HiveLayout(), close_improperly);
+    const QByteArray before = scene.bytes();
+    const Ended ended = run({tops, scene.file()}, {{QStringLiteral("PRESSER_EXIT"), QStringLiteral("0")}}, [&] {
+        for (const int stream : closed) {
+            close(stream);
+        }
+    });
+    QVERIFY2(!ended.crashed, qPrintable(ended.err));
+    QCOMPARE(ended.status, 0);
+    QCOMPARE(scene.bytes(), before);
+}
+
+void EntryTest::a_write_past_the_file_size_limit_fails_and_does_not_end_the_program() {
+    const QTemporaryDir directory;
+    const QByteArray path = QFile::encodeName(directory.filePath(QStringLiteral("file")));
+    const pid_t child = fork();
+    if (child == 0) {
+        prepare_streams();
+        const rlimit limit = {16, 16};
+        const int file = open(path.constData(), O_CREAT | O_WRONLY, 0600);
+        const bool limited = setrlimit(RLIMIT_FSIZE, &limit) == 0 && pwrite(file, "x", 1, 15) == 1;
+        _exit(limited && pwrite(file, "x", 1, 16) == -1 && errno == EFBIG ? 0 : 1);
+    }
+    int status = -1;
+    QCOMPARE(waitpid(child, &status, 0), child);
+    QVERIFY(WIFEXITED(status));
+    QCOMPARE(WEXITSTATUS(status), 0);
 }
 
 void EntryTest::the_event_loop_s_result_is_the_exit_status() {

@@ -6,14 +6,18 @@
 #include "shared_actions.h"
 #include "stage.h"
 #include "ui_test.h"
+#include "values_model.h"
 
 #include <QAction>
 #include <QApplication>
 #include <QClipboard>
+#include <QHelpEvent>
 #include <QLineEdit>
+#include <QMouseEvent>
 #include <QScrollBar>
 #include <QStyledItemDelegate>
 #include <QTest>
+#include <QToolTip>
 
 namespace {
 
@@ -32,6 +36,12 @@ testkit::HiveLayout many_keys() {
 }
 
 const QString services = QStringLiteral("MACHINE\\SYSTEM\\Services");
+
+// As the application object asks it, before the press goes anywhere.
+bool is_taken(KeysView& keys, QPoint point, Qt::MouseButton button = Qt::LeftButton) {
+    const QPointF global = keys.viewport()->mapToGlobal(point);
+    return keys.take_press_from_naming(QMouseEvent(QEvent::MouseButtonPress, point, global, button, button, {}));
+}
 
 QString below(const char* name) { return services + QLatin1Char('\\') + QLatin1String(name); }
 
@@ -68,7 +78,14 @@ private slots:
     }
 
     // The naming ends before the press, and the rows that it moves are not what was pressed.
+    void a_press_that_ends_a_naming_is_about_the_key_that_stood_there_data() {
+        QTest::addColumn<Qt::MouseButton>("button");
+        QTest::newRow("left") << Qt::LeftButton;
+        QTest::newRow("right") << Qt::RightButton;
+    }
+
     void a_press_that_ends_a_naming_is_about_the_key_that_stood_there() {
+        QFETCH(Qt::MouseButton, button);
         const Scene scene(many_keys());
         Stage stage(scene);
         stage.keys->expand(stage.key(services));
@@ -80,13 +97,37 @@ private slots:
         editor->setText(QStringLiteral("Zzz"));
         const QModelIndex meant = stage.key(below("EventLog"));
         const QPoint point = stage.keys->visualRect(meant).center();
-        QVERIFY(stage.keys->take_press_from_naming(point));
+        QVERIFY(is_taken(*stage.keys, point, button));
         QCOMPARE(stage.status(), below("EventLog"));
         QVERIFY(stage.keys->indexAt(point) != stage.keys->currentIndex());
         QVERIFY(stage.key(below("Zzz")).isValid());
-        // The menu that comes with the press would stand over another key.
-        QVERIFY(!with_context_menu(*stage.keys, point, [](QMenu&) {}));
+        // The menu that comes with a right press would stand over another key. The next is one that was asked for.
+        if (button == Qt::RightButton) {
+            QVERIFY(!with_context_menu(*stage.keys, point, [](QMenu&) {}));
+        }
         QVERIFY(with_context_menu(*stage.keys, point, [](QMenu&) {}));
+    }
+
+    // Letters that take no room leave an empty cell, which must say that there is more.
+    void a_text_that_a_cell_cuts_is_whole_in_its_tip_whatever_room_its_letters_take() {
+        testkit::HiveLayout layout;
+        testkit::KeyLayout& run = layout.root.add("Run");
+        run.set("feeds", 1, testkit::text_data(std::string(300, '\n') + "C:\\evil.exe"));
+        run.set("short", 1, testkit::text_data("x"));
+        const Scene scene(layout);
+        Stage stage(scene);
+        stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Run"));
+        stage.values->setColumnWidth(ValuesModel::DataColumn, 400);
+        const auto tip_of = [&](const char* name) {
+            const QPoint point =
+                stage.values->visualRect(stage.value(QLatin1String(name), ValuesModel::DataColumn)).center();
+            QHelpEvent asked(QEvent::ToolTip, point, stage.values->viewport()->mapToGlobal(point));
+            QApplication::sendEvent(stage.values->viewport(), &asked);
+            return QToolTip::isVisible() ? QToolTip::text() : QString();
+        };
+        QCOMPARE(tip_of("short"), QString());
+        const QString tip = tip_of("feeds");
+        QVERIFY2(tip.contains(QStringLiteral("C:\\evil.exe")), qPrintable(tip));
     }
 
     void a_press_beside_a_naming_that_moves_nothing_goes_on() {
@@ -94,11 +135,11 @@ private slots:
         Stage stage(scene);
         stage.keys->expand(stage.key(services));
         const QPoint point = stage.keys->visualRect(stage.key(below("Beep"))).center();
-        QVERIFY(!stage.keys->take_press_from_naming(point));
+        QVERIFY(!is_taken(*stage.keys, point));
         stage.select_key(below("cdrom"));
         stage.keys->setFocus();
         shared_actions().rename_action->trigger();
-        QVERIFY(!stage.keys->take_press_from_naming(point));
+        QVERIFY(!is_taken(*stage.keys, point));
         QVERIFY(!stage.keys->viewport()->findChild<QLineEdit*>() ||
                 stage.keys->viewport()->findChild<QLineEdit*>()->isHidden());
     }

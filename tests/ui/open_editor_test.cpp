@@ -166,6 +166,7 @@ private slots:
     void find_asks_after_the_name_is_stored();
     void refresh_names_the_value_before_it_sorts();
     void refresh_keeps_the_value_current();
+    void refresh_leaves_the_actions_to_the_key_that_has_the_keyboard();
     void find_next_names_the_value_before_it_sorts();
     void a_second_new_value_leaves_the_first_its_name();
     void a_new_key_leaves_the_value_its_name();
@@ -277,6 +278,23 @@ void OpenEditorTest::refresh_keeps_the_value_current() {
     QTest::keyClick(stage.values, Qt::Key_Delete);
     QVERIFY(hand.is_done());
     QCOMPARE(values_in_file(scene, "Alpha"), alpha_s_values);
+}
+
+void OpenEditorTest::refresh_leaves_the_actions_to_the_key_that_has_the_keyboard() {
+    const Scene scene;
+    Stage stage(scene);
+    name_a_new_value(stage, QStringLiteral("aaa"));
+    QTest::keyClick(editor_in(*stage.values), Qt::Key_Return);
+    const int row = stage.values->currentIndex().row();
+    stage.keys->setFocus();
+    const SharedActions& actions = shared_actions();
+    QVERIFY(!actions.delete_action->isEnabled());
+    stage.window.refresh_views();
+    QVERIFY2(stage.values->currentIndex().row() != row, "the value has not moved");
+    // A key at this depth can be neither deleted nor renamed.
+    QVERIFY(stage.keys->hasFocus());
+    QVERIFY(!actions.delete_action->isEnabled());
+    QVERIFY(!actions.rename_action->isEnabled());
 }
 
 void OpenEditorTest::find_next_names_the_value_before_it_sorts() {
