@@ -211,7 +211,7 @@ int RegKey::value_count() {
     const auto values = static_cast<int32_t>(count);
     if (values < 0) {
         char text[64];
-        // The text has always said keys, though it counts values; whoever looks for it looks for that.
+        // "keys", though it counts values: one text for any count that is beyond belief.
         std::snprintf(text, sizeof text, "RQueryInfoKeyW claimed there are %li keys", static_cast<long>(values));
         throw std::runtime_error(text);
     }

@@ -146,8 +146,8 @@ bool RegModel::setData(const QModelIndex& index, const QVariant& value, int) {
         emit dataChanged(index, index);
         return true;
     }
-    // Announced without layoutAboutToBeChanged and ahead of the index's move: the tree sits directly on this model, and
-    // what listens has come to rely on this order.
+    // Announced without layoutAboutToBeChanged and ahead of the index's move, an order that is part of this model's
+    // contract: the tree sits directly on it. The persistent indexes are moved by hand for that.
     emit layoutChanged();
     const QModelIndex moved = this->index(row, 0, parent);
     move_persistent_indexes(index, moved);

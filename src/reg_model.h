@@ -108,7 +108,7 @@ private:
     // The shown value names that the rows of the value frames count in; those frames are one key's, always.
     std::vector<QString> value_names_;
     QModelIndex searched_;  // set by find; the tree may have changed since
-    QMutex mutex_;          // guards stop_ alone
+    QMutex mutex_;          // guards stop_; held too where the search's stack goes to its thread and back
     bool stop_ = false;
     // How many keys of each hive the search may still visit, and go further down from. A damaged hive can list a key
     // more often than the file has room for keys; twice what its size allows bounds the walk, the first half of it

@@ -343,8 +343,8 @@ bool ValuesProxyModel::add_value(int type) {
     return added;
 }
 
-// With the source's row numbers as they are, without the offset: the rows are announced where they always were, and
-// what matters to a view, their number, is right.
+// With the source's row numbers as they are, without the offset: a view asks how many rows there are now, and for all
+// of them again; where they were announced does not matter to it.
 void ValuesProxyModel::on_rows_inserted(const QModelIndex&, int first, int last) {
     if (is_source_quiet_)
         return;

@@ -57,9 +57,16 @@ def problems_of_menus(messages):
             yield f"{message.source!r} has an accelerator and stands in no menu of this test"
 
 
+def problems_of_default_name(messages):
+    # The table puts the row of this name first, and two classes give it.
+    names = {m.translation for m in messages if m.source == "(Default)"}
+    if len(names) > 1:
+        yield f"the default value has more than one name: {sorted(names)}"
+
+
 def problems_of_file(name, messages, sources):
     """What is wrong with one file, as lines; sources are the keys that the program's sources give."""
-    found = [f"{name}: {text}" for text in problems_of_menus(messages)]
+    found = [f"{name}: {text}" for text in [*problems_of_menus(messages), *problems_of_default_name(messages)]]
     for message in messages:
         found += [f"{name}: {key(message)} {text}" for text in problems_of_message(message)]
         if name == "tallowfen_en_US.ts" and message.translation != message.source:

@@ -57,6 +57,11 @@ class Faults(unittest.TestCase):
     def test_accelerator_in_an_unknown_menu(self):
         self.expect_one(problems([text("&Other", "&Anders")]), "no menu of this test")
 
+    def test_two_names_of_the_default_value(self):
+        twice = [Message(context, "(Default)", None, translation, None)
+                 for context, translation in (("ValuesModel", "(Standard)"), ("ValuesProxyModel", "(Vorgabe)"))]
+        self.expect_one(problems(twice), "more than one name")
+
     def test_new_text_in_the_sources(self):
         sources = {key(m) for m in MENU} | {("KeysView", "Fresh", None)}
         self.expect_one(problems([], sources), "is missing")
