@@ -40,10 +40,10 @@ bool ask_find_request(FindRequest& request) {
     QObject::connect(buttons, &QDialogButtonBox::accepted, &dialog, &QDialog::accept);
     QObject::connect(buttons, &QDialogButtonBox::rejected, &dialog, &QDialog::reject);
 
-    auto* layout = new QVBoxLayout(&dialog);
+    QVBoxLayout layout(&dialog);
     for (QWidget* widget : std::initializer_list<QWidget*>{term_label, term_edit, keys_box, values_box,
                                                            substring_button, whole_button, wildcard_button, buttons}) {
-        layout->addWidget(widget);
+        layout.addWidget(widget);
     }
     make_compact(dialog, *term_edit);
     if (dialog.exec() != QDialog::Accepted) {
