@@ -276,8 +276,7 @@ Outcome move_between(Store& store, CellOffset parent_offset, KeyRecord& parent, 
 }  // namespace
 
 void free_leaf(Store& store, CellOffset leaf) {
-    KeyView root;
-    if (read_key(store, store.root, root) && cell_offset(root.record.subkey_index) != leaf)
+    if (!is_root_or_its_index(store, leaf))
         free_cell(store, leaf);
 }
 

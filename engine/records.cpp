@@ -147,7 +147,16 @@ bool is_key_record(Store& store, const Cell& cell) {
 
 }  // namespace
 
+bool is_root_or_its_index(Store& store, CellOffset offset) {
+    KeyView root;
+    // Where the root cannot be read now, nobody knows.
+    return offset == store.root || !read_key(store, store.root, root) ||
+           offset == cell_offset(root.record.subkey_index);
+}
+
 bool is_record(Store& store, const Cell& cell) {
+    if (is_root_or_its_index(store, cell.offset))
+        return true;
     IndexHead head;
     if (!read_part(store, cell, 0, &head, sizeof head))
         return false;

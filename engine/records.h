@@ -62,8 +62,12 @@ struct Block {
     ~Block();
 };
 
+// Whether the cell holds the root key or the index of its subkeys, without which the hive does not open.
+bool is_root_or_its_index(Store& store, CellOffset offset);
+
 // Whether the cell holds a record, judged by its signature and one more trait. A record that is damaged in another one
-// still counts. Plain data can pass for a record by chance; what takes it for another's then merely leaves it alone.
+// still counts, and the root's two do however they look. Plain data can pass for a record by chance; what takes it for
+// another's then merely leaves it alone.
 bool is_record(Store& store, const Cell& cell);
 
 }  // namespace engine

@@ -186,6 +186,33 @@ TEST(Damaged, data_that_leads_to_a_key_is_moved_and_the_key_stays) {
     }
 }
 
+// A root without a name, and an index of which the first entries lead nowhere, look like no records.
+TEST(Damaged, data_that_leads_to_the_root_or_its_index_is_moved_and_the_hive_opens_again) {
+    for (const bool to_index : {false, true}) {
+        for (const size_t size : {5U, 76U, 17000U}) {
+            HiveLayout layout;
+            layout.root.name.clear();
+            for (int i = 10; i < 30; i++)
+                layout.root.add("k" + std::to_string(i));
+            layout.root.add("last").set("Raw", 3, pattern(40));
+            LaidHive hive = lay_out(layout);
+            const KeyPlaces& root = hive.at("");
+            for (uint32_t entry = 0; to_index && entry < 16; entry++)
+                hive.put32(root.index, 4 + 8 * entry, none);
+            hive.put32(hive.at("last").values[0].record, 4, 60);
+            hive.put32(hive.at("last").values[0].record, 8, to_index ? root.index : root.record);
+            Scene scene(hive.bytes);
+            EXPECT_EQ(scene.Set("last", "Raw", 3, pattern(size, 5)), 0) << to_index << size;
+            ASSERT_TRUE(scene.Reopen()) << to_index << size;
+            const Handle last = scene.OpenKey("last");
+            Bytes data(size);
+            auto room = static_cast<uint32_t>(size);
+            EXPECT_EQ(RQueryValueExW(last.get(), "Raw", nullptr, data.data(), &room), 0);
+            EXPECT_EQ(data, pattern(size, 5));
+        }
+    }
+}
+
 TEST(Damaged, data_that_leads_to_its_own_value_does_not_destroy_it) {
     LaidHive hive = lay_out(tree());
     hive.put32(hive.at("Alpha").values[1].record, 4, 8);
