@@ -49,7 +49,9 @@ void free_index_cell(Store& store, const KeyRecord& key) {
 // the first: a deletion takes values off by ascending position from a list that closes up behind each, and a hive that
 // was written here is the same, cell by cell, as ever. The rest, and all data cells, stay allocated.
 void free_key(Store& store, const KeyView& key, const KeyView& parent) {
-    const ValueList values = find_value_list(store, key.record);
+    ValueList values = find_value_list(store, key.record);
+    if (values.count > 0 && is_record(store, values.cell))
+        values.count = 0;  // another's cell, whatever it leads to
     for (uint32_t i = 0; i < values.count; i += 2) {
         ValueView value;
         const CellOffset offset = value_at(store, values, i);
@@ -57,7 +59,7 @@ void free_key(Store& store, const KeyView& key, const KeyView& parent) {
             free_cell(store, offset);
     }
     free_index_cell(store, key.record);
-    if (values.count > 0 && !is_record(store, values.cell))
+    if (values.count > 0)
         free_cell(store, values.cell.offset);
     const CellOffset security = cell_offset(key.record.security);
     drop_security_reference(store, security, security == cell_offset(parent.record.security));

@@ -95,17 +95,23 @@ bool rewrite_data(Store& store, const ValueView& old, const ValueRecord& record,
     return outcome != Outcome::unknown;
 }
 
-// Whether what a data offset leads to is not data at all: a record, a list of values (which has no signature, but
-// leads to values), or a cell that is shorter than the data and tells of no pieces.
+// Whether the cell tells where big data lies. Plain data may begin like that by chance, and is then merely moved.
+bool is_big_data(Store& store, const Cell& cell) {
+    BigDataRecord big;
+    Cell list;
+    return read_part(store, cell, 0, &big, sizeof big) && big.signature == sig_big_data &&
+           find_used_cell(store, cell_offset(big.segment_list), list) && big.segment_count <= list.room() / slot_size;
+}
+
+// Whether what a data offset leads to is not the value's data: a record, a list of values (which has no signature, but
+// leads to values), or big data's record where the size is one cell's, or the other way round.
 bool is_no_data(Store& store, const ValueView& value, const Cell& cell) {
     Le32 first;
-    Le16 signature;
     ValueView listed;
     if (is_record(store, cell) ||
         (read_part(store, cell, 0, &first, sizeof first) && read_value(store, cell_offset(first), listed)))
         return true;
-    return value.size() > cell.room() &&
-           !(read_part(store, cell, 0, &signature, sizeof signature) && signature == sig_big_data);
+    return is_big_data(store, cell) != (value.size() > cell.room());
 }
 
 bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
@@ -356,8 +362,9 @@ Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const Ne
 //   a second time. Its data stays allocated.
 int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t position) {
     const ValueList list = find_value_list(store, key);
+    // An offset is a multiple of 8 and so begins like no record: where the list does, it is another's.
     if (!list.whole || position >= list.count || !is_used_cell(store, key_offset) ||
-        !is_used_cell(store, list.cell.offset))
+        !is_used_cell(store, list.cell.offset) || is_record(store, list.cell))
         return R_FAILED;
     const uint32_t behind = (list.count - position) * slot_size;  // the value's own slot and those after it
     const Block slots(behind);

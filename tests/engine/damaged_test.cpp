@@ -224,6 +224,42 @@ TEST(Damaged, data_that_leads_to_its_own_value_does_not_destroy_it) {
     EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->data, pattern(8, 5));
 }
 
+TEST(Damaged, data_that_leads_to_another_ones_big_data_is_moved_and_the_big_data_stays) {
+    for (const size_t size : {5U, 8U, 12U, 100U}) {
+        HiveLayout layout;
+        KeyLayout& key = layout.root.add("Alpha");
+        key.set("Raw", 3, pattern(40));
+        key.set("Big", 3, pattern(20000, 9)).storage = Storage::big;
+        LaidHive hive = lay_out(layout);
+        hive.put32(hive.at("Alpha").values[0].record, 4, 8);
+        hive.put32(hive.at("Alpha").values[0].record, 8, hive.at("Alpha").values[1].data);
+        Scene scene(hive.bytes);
+        EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(size, 5)), 0);
+        const Hive now = scene.Read();
+        EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->data, pattern(size, 5));
+        EXPECT_EQ(find_value(*now.find("Alpha"), "Big")->data, pattern(20000, 9));
+    }
+}
+
+// The hint of a leaf's entry happens to be a value's offset.
+TEST(Damaged, no_value_is_removed_from_a_list_that_is_an_index_of_keys) {
+    LaidHive hive = lay_out(tree());
+    const uint32_t index = hive.at("").index;
+    hive.put32(index, 8, hive.at("Alpha").values[1].record);
+    hive.put32(hive.at("Gamma\\leaf").record, 40, index);
+    hive.put32(hive.at("Gamma\\leaf").record, 36, 5);
+    Scene scene(hive.bytes);
+    const Handle key = scene.OpenKey("Gamma\\leaf");
+    ASSERT_EQ(RFindValueA(key.get(), "Raw"), 2);
+    EXPECT_EQ(RDeleteValue(key.get(), "Raw"), R_FAILED);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(scene.Delete("Gamma\\leaf"), 0);
+    const Hive now = scene.Read();
+    EXPECT_NE(now.find("Beta"), nullptr);
+    ASSERT_NE(find_value(*now.find("Alpha"), "Raw"), nullptr);
+    EXPECT_EQ(find_value(*now.find("Alpha"), "Raw")->data, pattern(100));
+}
+
 // A list of values has no signature.
 TEST(Damaged, data_that_leads_to_a_list_of_values_is_moved_and_the_list_stays) {
     for (const char* owner : {"Alpha", "Beta"}) {     // its own key's list, and another's
