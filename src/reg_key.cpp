@@ -197,8 +197,7 @@ bool RegKey::slots_agree(RegistryKey* handle) const { return children_.size() ==
 
 void RegKey::reload() {
     const RegHive::Dialogue dialogue(hive_);
-    // A handle from before does not see what came about in another place.
-    hive_->forget_handle(this);
+    hive_->forget_handle(this);  // it does not see what came about through another one
     refresh_children(hive_->key_handle(this));
 }
 

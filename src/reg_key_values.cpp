@@ -129,7 +129,15 @@ QByteArray name_leading_to(RegistryKey* handle, int index) {
 
 // Whether no value of the key has a name, and every record could be asked for its own.
 bool is_surely_free(RegistryKey* handle, const char* name) {
-    return RQueryValueExA(handle, name, nullptr, nullptr, nullptr) == R_FILE_NOT_FOUND;
+    if (RQueryValueExA(handle, name, nullptr, nullptr, nullptr) == R_FILE_NOT_FOUND)
+        return true;
+    // One whose name goes on behind a zero is found only where every record was read and none has just this name.
+    const int32_t position = RFindValueA(handle, name);
+    uint32_t size = 0;  // bytes, two a character and two more
+    return position >= 0 &&
+           REnumValueW(handle, static_cast<uint32_t>(position), nullptr, &size, nullptr, nullptr, nullptr) ==
+               R_SUCCESS &&
+           size / 2 - 1 > std::strlen(name);
 }
 
 }  // namespace

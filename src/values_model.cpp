@@ -20,9 +20,9 @@ constexpr qsizetype least_cost = most_cached_bytes / most_cached_rows;
 qsizetype memory_of(const QVariant& data) {
     constexpr qsizetype character = sizeof(QChar);
     if (data.typeId() == QMetaType::QByteArray)
-        return data.toByteArray().size();
+        return data.toByteArray().capacity();
     if (data.typeId() == QMetaType::QString)
-        return data.toString().size() * character;
+        return data.toString().capacity() * character;
     qsizetype bytes = 0;
     if (data.typeId() == QMetaType::QStringList) {
         const QStringList list = data.toStringList();
@@ -82,11 +82,19 @@ RegValue ValuesModel::lookup(int row) const {
         return *cached;
     std::unique_ptr<RegValue> value = key_->read_value(row);
     if (value == nullptr)
-        return key_->read_value_name(row);
+        value = std::make_unique<RegValue>(key_->read_value_name(row));
     RegValue found = *value;
     // The row asked for last is kept, however large it is.
     cache_.insert(row, value.release(), std::clamp(memory_of(found.data), least_cost, most_cached_bytes));
     return found;
+}
+
+void ValuesModel::forget_unreadable() {
+    const QList<int> rows = cache_.keys();
+    for (const int row : rows) {
+        if (!cache_.object(row)->data.isValid())
+            cache_.remove(row);
+    }
 }
 
 QVariant ValuesModel::data(const QModelIndex& index, int role) const {

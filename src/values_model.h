@@ -48,7 +48,11 @@ public:
     // Makes the unnamed value, as text; false where there may be one.
     bool add_default_value(const QString& data);
 
-    // Bytes of memory that the rows kept take.
+    // Lets the data that could not be read be tried again. Until then such a row is kept: where many values lead to the
+    // same long data, each painting of them would read all of it for each.
+    void forget_unreadable();
+
+    // Bytes of memory that the rows kept take at most: a short row counts as a hundredth of what may be kept.
     qsizetype cached_bytes() const { return cache_.totalCost(); }
 
 private:
@@ -64,6 +68,6 @@ private:
     void announce_others(const std::vector<std::pair<int, RegValue>>& shown, int told);
 
     RegKey* key_;
-    // The rows used last. A value whose data cannot be read is not kept: it may be readable the next time.
+    // The rows used last. A value whose data cannot be read stands here with an invalid variant.
     mutable QCache<int, RegValue> cache_;
 };

@@ -270,11 +270,11 @@ bool ValuesView::viewportEvent(QEvent* event) {
     const auto* help = static_cast<QHelpEvent*>(event);
     const QModelIndex index = indexAt(help->pos());
     QString text;
-    const QSize needed = sizeHintForIndex(index);
-    if (needed.isValid()) {  // it is not where the row cannot be read
+    if (index.isValid()) {
         constexpr qsizetype longest = 1000;
         const QString shown = shown_text(index, longest).left(longest);
-        if (shown.size() > ValueDelegate::shortest_cut || needed.width() > columnWidth(index.column())) {
+        if (shown.size() > ValueDelegate::shortest_cut ||
+            sizeHintForIndex(index).width() > columnWidth(index.column())) {
             text = shown;
         }
     }

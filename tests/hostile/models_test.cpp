@@ -258,6 +258,29 @@ private slots:
         QVERIFY2(more < size_t{96} << 20, qPrintable(QString::number(more)));
     }
 
+    // A text that ends early was decoded whole.
+    void texts_that_many_values_share_are_held_within_bounds() {
+        constexpr int count = 40;
+        constexpr uint32_t stored = 4000000;
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        for (int i = 0; i < count; i++)
+            key.set("v" + std::to_string(i), 1, testkit::Bytes(i == 0 ? stored : 8)).storage = testkit::Storage::cell;
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        const auto& values = laid.at("Key").values;
+        for (const testkit::ValuePlaces& value : values) {
+            laid.put32(value.record, 4, stored);
+            laid.put32(value.record, 8, values[0].data);
+        }
+        Mounted mounted(laid.bytes);
+        ValuesModel model(key_of_row(mounted, 0));
+        const size_t before = memory_in_use();
+        for (int row = 0; row < count; row++)
+            QCOMPARE(model.index(row, 2).data().toString(), QString());
+        const size_t more = memory_in_use() - before;
+        QVERIFY2(more < size_t{96} << 20, qPrintable(QString::number(more)));
+    }
+
     // However often a list leads to it.
     void one_long_name_is_held_once() {
         constexpr int rows = 2000;

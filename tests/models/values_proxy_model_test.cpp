@@ -109,6 +109,29 @@ private slots:
         QCOMPARE(proxy.index(1, 1).data(Qt::AccessibleTextRole).toString(), QStringLiteral("REG_BINARY"));
     }
 
+    // The engine finds such a value by what stands before the zero: here by nothing, the default value's name.
+    void the_default_is_made_beside_a_value_whose_name_begins_with_a_zero() {
+        for (const bool is_wide : {false, true}) {
+            testkit::HiveLayout hive;
+            testkit::ValueLayout& hidden = hive.root.add("Key").set("", 4, testkit::pattern(4));
+            hidden.name = std::u16string(u"\0run", 4);
+            hidden.wide_name = is_wide;
+            const HiveOnDisk file(hive);
+            DummyRegKey top(QStringLiteral("TOP"));
+            RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+            auto* key = static_cast<RegKey*>(opened.root_key()->child(0));
+            ValuesModel source(key);
+            ValuesProxyModel proxy;
+            proxy.setSourceModel(&source);
+            proxy.sort(0, Qt::AscendingOrder);
+            QVERIFY(proxy.setData(proxy.index(0, 2), QStringLiteral("typed"), Qt::EditRole));
+            QCOMPARE(proxy.index(0, 2).data().toString(), QStringLiteral("typed"));
+            QCOMPARE(key->value_count(), 2);
+            QCOMPARE(file.stored_type("Key", std::string("\0run", 4)), 4);
+            QCOMPARE(file.stored_type("Key", ""), 1);
+        }
+    }
+
     // Whichever of the two stands first in the key's list.
     void a_value_named_like_the_unnamed_one_stays_apart_from_it() {
         testkit::HiveLayout hive;

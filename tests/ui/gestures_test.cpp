@@ -3,6 +3,7 @@
 
 // What the hand and the eye take for one thing stays one: the row under the pointer, the row that is highlighted, the
 // text that is shown.
+#include "failure_report.h"
 #include "shared_actions.h"
 #include "stage.h"
 #include "ui_test.h"
@@ -229,7 +230,33 @@ private slots:
         QTRY_VERIFY(
             stage.keys->viewport()->rect().contains(stage.keys->visualRect(stage.keys->currentIndex()).center()));
     }
+
+    // What was pressed last in the tree has nothing to do with it.
+    void what_goes_wrong_in_the_table_is_about_the_key_whose_values_it_shows() {
+        testkit::HiveLayout layout;
+        testkit::KeyLayout& key = layout.root.add("Alpha");
+        key.set("sound", 4, testkit::pattern(4));
+        key.set("damaged", 4, testkit::pattern(4));
+        key.add("Deep").add("Deeper");
+        Scene scene(layout);
+        scene.damage_value("Alpha", 1);
+        Stage stage(scene);
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        stage.select_key(alpha);
+        QTRY_VERIFY(hand.is_done());
+        QCOMPARE(hand.text, QStringLiteral("The key \"%1\" cannot be read: index").arg(alpha));
+        FailureReport::instance().set_current_key(alpha + QStringLiteral("\\Deep"));
+        for (int row = 0; row < stage.values->model()->rowCount(); row++) {
+            const QPoint point = stage.values->visualRect(stage.values->model()->index(row, 0)).center();
+            QHelpEvent asked(QEvent::ToolTip, point, stage.values->viewport()->mapToGlobal(point));
+            QApplication::sendEvent(stage.values->viewport(), &asked);
+            stage.values->setCurrentIndex(stage.values->model()->index(row, 1));
+            QTest::keySequence(stage.values, QKeySequence::Copy);
+        }
+        QVERIFY2(hand.nothing_comes(), "told a second time, of another key");
+    }
 };
 
-QTEST_MAIN(GesturesTest)
+UI_TEST_MAIN(GesturesTest)
 #include "gestures_test.moc"
