@@ -4,7 +4,6 @@
 
 #include "failure_report.h"
 #include "keys_view.h"
-#include "values_view.h"
 
 #include <QDebug>
 #include <QFile>
@@ -67,7 +66,6 @@ Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
 bool Application::notify(QObject* receiver, QEvent* event) {
     // Asked first: afterwards the receiver may be gone.
     const bool is_gesture = receiver->isWidgetType() || event->type() == QEvent::Shortcut;
-    const bool is_about_values = qobject_cast<ValuesView*>(receiver) || qobject_cast<ValuesView*>(receiver->parent());
     try {
         // Here, since the toolkit moves the keyboard, which ends a naming, before any filter sees the press.
         if (event->type() == QEvent::MouseButtonPress && receiver->isWidgetType()) {
@@ -79,11 +77,7 @@ bool Application::notify(QObject* receiver, QEvent* event) {
         }
         return QApplication::notify(receiver, event);
     } catch (const std::exception& failure) {
-        if (is_about_values) {
-            FailureReport::instance().report_at_shown(failure);
-        } else {
-            FailureReport::instance().report_at_current(failure, is_gesture);
-        }
+        FailureReport::instance().report_at_current(failure, is_gesture);
         return true;
     }
 }

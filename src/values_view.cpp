@@ -96,6 +96,16 @@ void ValuesView::value_double_clicked(QModelIndex index) {
     if (!index.isValid() || !model() || index.column() != name_column || !may_change_rows(*this)) {
         return;
     }
+    try {
+        edit_value(index);
+    } catch (const std::exception& failure) {
+        // Told each time: the user has asked for an editor that does not come, or filled one in.
+        FailureReport& report = FailureReport::instance();
+        tell_failure(this, report.told_elsewhere(report.shown_key(), QString::fromLocal8Bit(failure.what())));
+    }
+}
+
+void ValuesView::edit_value(const QModelIndex& index) {
     const QString name = index.data(Qt::DisplayRole).toString();
     // Should the table show another key's values by the time the editor is left, this leads nowhere.
     const QPersistentModelIndex data_index = model()->index(index.row(), data_column);
@@ -153,8 +163,12 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
         value_double_clicked(currentIndex());
     } else if (event->matches(QKeySequence::Copy) && currentIndex().isValid()) {
         // As it is shown: the toolkit would take bytes for text, and a list of strings for nothing.
-        QApplication::clipboard()->setText(shown_text(currentIndex()));
         event->accept();
+        try {
+            QApplication::clipboard()->setText(shown_text(currentIndex()));
+        } catch (const std::exception& failure) {
+            FailureReport::instance().report_at_shown(failure);
+        }
     } else {
         QTableView::keyPressEvent(event);
     }
@@ -262,21 +276,26 @@ void ValuesView::paintEvent(QPaintEvent* event) {
     }
 }
 
+// The text of a cell that cuts it; of a very long one, the beginning.
+QString ValuesView::cut_text(const QModelIndex& index) const {
+    constexpr qsizetype longest = 1000;
+    const QString shown = shown_text(index, longest).left(longest);
+    const bool is_cut =
+        shown.size() > ValueDelegate::shortest_cut || sizeHintForIndex(index).width() > columnWidth(index.column());
+    return is_cut ? shown : QString();
+}
+
 bool ValuesView::viewportEvent(QEvent* event) {
     if (event->type() != QEvent::ToolTip) {
         return QTableView::viewportEvent(event);
     }
-    // A text that its cell cuts can be read whole; of a very long one, the beginning.
     const auto* help = static_cast<QHelpEvent*>(event);
     const QModelIndex index = indexAt(help->pos());
     QString text;
-    if (index.isValid()) {
-        constexpr qsizetype longest = 1000;
-        const QString shown = shown_text(index, longest).left(longest);
-        if (shown.size() > ValueDelegate::shortest_cut ||
-            sizeHintForIndex(index).width() > columnWidth(index.column())) {
-            text = shown;
-        }
+    try {
+        text = index.isValid() ? cut_text(index) : QString();
+    } catch (const std::exception& failure) {
+        FailureReport::instance().report_at_shown(failure);
     }
     // Made into paragraphs here, so that the tip takes no text for markup.
     QToolTip::showText(help->globalPos(), text.isEmpty() ? text : Qt::convertFromPlainText(text), viewport());

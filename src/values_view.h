@@ -29,6 +29,8 @@ protected:
 private:
     void size_columns(int old_count, int new_count);
     void make_current(const QModelIndex& index);
+    QString cut_text(const QModelIndex& index) const;
+    void edit_value(const QModelIndex& index);
     // False when what was entered could not be stored.
     bool edit_dword(const QString& value_name, quint32 number, const QPersistentModelIndex& data_index);
     bool edit_qword(const QString& value_name, quint64 number, const QPersistentModelIndex& data_index);

@@ -255,6 +255,11 @@ private slots:
             QTest::keySequence(stage.values, QKeySequence::Copy);
         }
         QVERIFY2(hand.nothing_comes(), "told a second time, of another key");
+        // Who asks for an editor is answered.
+        hand.then_press(QMessageBox::Ok);
+        stage.values->value_double_clicked(stage.values->model()->index(1, 0));
+        QVERIFY(hand.is_done());
+        QCOMPARE(hand.text, QStringLiteral("The key \"%1\" cannot be read: index").arg(alpha));
     }
 };
 
