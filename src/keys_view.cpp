@@ -83,7 +83,7 @@ void KeysView::run_new_key_action(bool /*checked*/) {
     }
     const int row = keys->new_key(current);
     if (row < 0) {
-        tell_refused(tr("The key could not be created."));
+        tell_failure(this, tr("The key could not be created."));
         return;
     }
     const QModelIndex created = keys->index(row, 0, current);
@@ -118,7 +118,7 @@ void KeysView::run_delete_key_action(bool /*checked*/) {
         setCurrentIndex(kept);
         setExpanded(kept, was_expanded);
     }
-    tell_refused(tr("The key could not be deleted."));
+    tell_failure(this, tr("The key could not be deleted."));
 }
 
 bool KeysView::confirm_remove() {
@@ -274,8 +274,4 @@ void KeysView::paintEvent(QPaintEvent* event) {
     } catch (const std::exception& failure) {
         FailureReport::instance().report_at_current(failure);
     }
-}
-
-void KeysView::tell_refused(const QString& text) {
-    QMessageBox::critical(this, QCoreApplication::applicationName(), text, QMessageBox::Ok);
 }

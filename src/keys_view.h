@@ -40,7 +40,6 @@ private:
     bool confirm_remove();
     void expand_below(const QModelIndex& top);
     bool select_if_named(const QModelIndex& key, const QString& beginning);
-    void tell_refused(const QString& text);
 
     // The press that asks for the next context menu was meant for a row that has moved away.
     bool menu_is_stale_ = false;

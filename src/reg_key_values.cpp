@@ -261,8 +261,9 @@ bool RegKey::rename_value(int index, const QString& new_name) {
         return false;
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
-    if (!is_surely_free(handle, stored.bytes.constData()) || name_leading_to(handle, index).isNull() ||
-        read_value(index) == nullptr)
+    // Stricter than store_value: a name that another one goes on behind a zero after is refused as well.
+    if (RQueryValueExA(handle, stored.bytes.constData(), nullptr, nullptr, nullptr) != R_FILE_NOT_FOUND ||
+        name_leading_to(handle, index).isNull() || read_value(index) == nullptr)
         return false;
     // The bytes go over as they are stored: a record cannot carry text behind a zero, an odd size or a short number.
     const EnumeratedName old = enumerate_name(handle, index);

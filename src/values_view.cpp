@@ -9,6 +9,7 @@
 #include "finish_editing.h"
 #include "shared_actions.h"
 #include "value_text.h"
+#include "values_model.h"
 #include "values_proxy_model.h"
 
 #include <QAction>
@@ -28,29 +29,30 @@
 
 namespace {
 
-constexpr int name_column = 0;
-constexpr int data_column = 2;
+constexpr int name_column = ValuesModel::NameColumn;
+constexpr int type_column = ValuesModel::TypeColumn;
+constexpr int data_column = ValuesModel::DataColumn;
 
 // The registry type that an action of the "new" group creates; -1 for the action that creates a key.
 int type_created_by(const QAction* action) {
     const SharedActions& actions = shared_actions();
     if (action == actions.new_string_action) {
-        return 1;
+        return REG_SZ;
     }
     if (action == actions.new_expand_string_action) {
-        return 2;
+        return REG_EXPAND_SZ;
     }
     if (action == actions.new_binary_action) {
-        return 3;
+        return REG_BINARY;
     }
     if (action == actions.new_dword_action) {
-        return 4;
+        return REG_DWORD;
     }
     if (action == actions.new_multi_string_action) {
-        return 7;
+        return REG_MULTI_SZ;
     }
     if (action == actions.new_qword_action) {
-        return 11;
+        return REG_QWORD;
     }
     return -1;
 }
@@ -88,7 +90,7 @@ void ValuesView::size_columns(int old_count, int new_count) {
     // Wide enough for most names, for the commonest type names and for a line of data; the user widens the rest.
     const int letter = fontMetrics().averageCharWidth();
     setColumnWidth(name_column, letter * 24);
-    setColumnWidth(1, letter * 20);
+    setColumnWidth(type_column, letter * 20);
     setColumnWidth(data_column, letter * 60);
 }
 
@@ -112,7 +114,7 @@ void ValuesView::edit_value(const QModelIndex& index) {
     const QVariant datum = data_index.data(Qt::DisplayRole);
     if (datum.typeId() >= QMetaType::User) {
         if (!edit_string(*model(), name, QString(), data_index)) {
-            tell_refused(tr("The value could not be created."));
+            tell_failure(this, tr("The value could not be created."));
         }
         return;
     }
@@ -134,11 +136,11 @@ void ValuesView::edit_value(const QModelIndex& index) {
         stored = edit_qword(name, datum.toULongLong(), data_index);
         break;
     default:
-        tell_refused(tr("Data type cannot be edited yet"));
+        tell_failure(this, tr("Data type cannot be edited yet"));
         break;
     }
     if (!stored) {
-        tell_refused(tr("The value could not be changed."));
+        tell_failure(this, tr("The value could not be changed."));
     }
 }
 
@@ -210,7 +212,7 @@ void ValuesView::run_new_value_action(QAction* action) {
         return;
     }
     if (!values->add_value(type)) {
-        tell_refused(tr("The value could not be created."));
+        tell_failure(this, tr("The value could not be created."));
         return;
     }
     const QModelIndex created = values->index(values->rowCount() - 1, name_column);
@@ -247,7 +249,7 @@ void ValuesView::run_delete_value_action(bool /*checked*/) {
     if (!model()->removeRows(row, 1, QModelIndex())) {
         // A removal that was announced and then refused has moved the selection to a neighbour.
         make_current(model()->index(row, column));
-        tell_refused(tr("The value could not be deleted."));
+        tell_failure(this, tr("The value could not be deleted."));
         return;
     }
     // The current index has moved to a neighbour as the row went, and the table was sorted since: it goes to what
@@ -300,8 +302,4 @@ bool ValuesView::viewportEvent(QEvent* event) {
     // Made into paragraphs here, so that the tip takes no text for markup.
     QToolTip::showText(help->globalPos(), text.isEmpty() ? text : Qt::convertFromPlainText(text), viewport());
     return true;
-}
-
-void ValuesView::tell_refused(const QString& text) {
-    QMessageBox::critical(this, QCoreApplication::applicationName(), text, QMessageBox::Ok);
 }

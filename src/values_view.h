@@ -34,5 +34,4 @@ private:
     // False when what was entered could not be stored.
     bool edit_dword(const QString& value_name, quint32 number, const QPersistentModelIndex& data_index);
     bool edit_qword(const QString& value_name, quint64 number, const QPersistentModelIndex& data_index);
-    void tell_refused(const QString& text);
 };

@@ -155,6 +155,21 @@ std::vector<Item> items_of(const testkit::Bytes& bytes, const std::string& key,
     return snapshot.items;
 }
 
+// A key with so many values of that type, which all lead to the same cell of zeros.
+testkit::Bytes hive_of_shared_zeros(int values, uint32_t type, uint32_t size) {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout& key = hive.root.add("Key");
+    for (int i = 0; i < values; i++)
+        key.set("v" + std::to_string(i), type, testkit::Bytes(i == 0 ? size : 8)).storage = testkit::Storage::cell;
+    testkit::LaidHive laid = testkit::lay_out(hive);
+    const uint32_t data = laid.at("Key").values[0].data;
+    for (const testkit::ValuePlaces& value : laid.at("Key").values) {
+        laid.put32(value.record, 4, size);
+        laid.put32(value.record, 8, data);
+    }
+    return laid.bytes;
+}
+
 size_t memory_in_use() {
     const struct mallinfo2 info = mallinfo2();
     return info.uordblks + info.hblkhd;
@@ -233,17 +248,7 @@ private slots:
     void data_that_many_values_share_is_held_within_bounds() {
         constexpr int count = 40;
         constexpr int strings = 200000;
-        testkit::HiveLayout hive;
-        testkit::KeyLayout& key = hive.root.add("Key");
-        for (int i = 0; i < count; i++)
-            key.set("v" + std::to_string(i), 7, testkit::Bytes(i == 0 ? 2 * strings : 8));
-        testkit::LaidHive laid = testkit::lay_out(hive);
-        const auto& values = laid.at("Key").values;
-        for (const testkit::ValuePlaces& value : values) {
-            laid.put32(value.record, 4, 2 * strings);
-            laid.put32(value.record, 8, values[0].data);
-        }
-        Mounted mounted(laid.bytes);
+        Mounted mounted(hive_of_shared_zeros(count, 7, 2 * strings));
         ValuesModel model(key_of_row(mounted, 0));
         const size_t before = memory_in_use();
         qsizetype most = 0;
@@ -262,17 +267,7 @@ private slots:
     void texts_that_many_values_share_are_held_within_bounds() {
         constexpr int count = 40;
         constexpr uint32_t stored = 4000000;
-        testkit::HiveLayout hive;
-        testkit::KeyLayout& key = hive.root.add("Key");
-        for (int i = 0; i < count; i++)
-            key.set("v" + std::to_string(i), 1, testkit::Bytes(i == 0 ? stored : 8)).storage = testkit::Storage::cell;
-        testkit::LaidHive laid = testkit::lay_out(hive);
-        const auto& values = laid.at("Key").values;
-        for (const testkit::ValuePlaces& value : values) {
-            laid.put32(value.record, 4, stored);
-            laid.put32(value.record, 8, values[0].data);
-        }
-        Mounted mounted(laid.bytes);
+        Mounted mounted(hive_of_shared_zeros(count, 1, stored));
         ValuesModel model(key_of_row(mounted, 0));
         const size_t before = memory_in_use();
         for (int row = 0; row < count; row++)

@@ -31,14 +31,15 @@ testkit::HiveLayout layout() {
 }
 
 struct Shown {
-    HiveOnDisk file{layout()};
+    HiveOnDisk file;
     DummyRegKey top{QStringLiteral("TOP")};
     RegHive hive{QStringLiteral("HIVE"), file.path(), &top};
     std::unique_ptr<ValuesModel> source;
     ValuesProxyModel proxy;
     QTableView view;
 
-    explicit Shown(int key) : source(new ValuesModel(static_cast<RegKey*>(hive.root_key()->child(key)))) {
+    explicit Shown(int key, const testkit::HiveLayout& shown = layout())
+        : file(shown), source(new ValuesModel(static_cast<RegKey*>(hive.root_key()->child(key)))) {
         proxy.setSourceModel(source.get());
         proxy.sort(0, Qt::AscendingOrder);
         // As the window has it.
@@ -92,13 +93,8 @@ private slots:
         key.set("list", 7, testkit::text_data(std::string("a\0b\0", 4)));
         key.set("number", 4, {42, 0, 0, 0});
         key.set("text", 1, testkit::text_data("as it is"));
-        const HiveOnDisk file(hive);
-        DummyRegKey top(QStringLiteral("TOP"));
-        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
-        ValuesModel source(static_cast<RegKey*>(opened.root_key()->child(0)));
-        ValuesProxyModel proxy;
-        proxy.setSourceModel(&source);
-        proxy.sort(0, Qt::AscendingOrder);
+        Shown shown(0, hive);
+        ValuesProxyModel& proxy = shown.proxy;
         QStringList spoken;
         for (int row = 0; row < proxy.rowCount(); row++)
             spoken.append(proxy.index(row, 2).data(Qt::AccessibleTextRole).toString());
@@ -116,19 +112,13 @@ private slots:
             testkit::ValueLayout& hidden = hive.root.add("Key").set("", 4, testkit::pattern(4));
             hidden.name = std::u16string(u"\0run", 4);
             hidden.wide_name = is_wide;
-            const HiveOnDisk file(hive);
-            DummyRegKey top(QStringLiteral("TOP"));
-            RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
-            auto* key = static_cast<RegKey*>(opened.root_key()->child(0));
-            ValuesModel source(key);
-            ValuesProxyModel proxy;
-            proxy.setSourceModel(&source);
-            proxy.sort(0, Qt::AscendingOrder);
+            Shown shown(0, hive);
+            ValuesProxyModel& proxy = shown.proxy;
             QVERIFY(proxy.setData(proxy.index(0, 2), QStringLiteral("typed"), Qt::EditRole));
             QCOMPARE(proxy.index(0, 2).data().toString(), QStringLiteral("typed"));
-            QCOMPARE(key->value_count(), 2);
-            QCOMPARE(file.stored_type("Key", std::string("\0run", 4)), 4);
-            QCOMPARE(file.stored_type("Key", ""), 1);
+            QCOMPARE(shown.source->rowCount(), 2);
+            QCOMPARE(shown.file.stored_type("Key", std::string("\0run", 4)), 4);
+            QCOMPARE(shown.file.stored_type("Key", ""), 1);
         }
     }
 
@@ -139,19 +129,14 @@ private slots:
         key.set("(Default)", 4, testkit::pattern(4));
         key.set("", 1, testkit::text_data("set"));
         key.set("b", 4, testkit::pattern(4));
-        const HiveOnDisk file(hive);
-        DummyRegKey top(QStringLiteral("TOP"));
-        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
-        ValuesModel source(static_cast<RegKey*>(opened.root_key()->child(0)));
-        ValuesProxyModel proxy;
-        proxy.setSourceModel(&source);
-        proxy.sort(0, Qt::AscendingOrder);
+        Shown shown(0, hive);
+        ValuesProxyModel& proxy = shown.proxy;
         QCOMPARE(proxy.index(0, 1).data().toString(), QStringLiteral("REG_SZ"));
         QVERIFY(!proxy.flags(proxy.index(0, 0)).testFlag(Qt::ItemIsEditable));
         QVERIFY(proxy.flags(proxy.index(1, 0)).testFlag(Qt::ItemIsEditable));
         QVERIFY(proxy.setData(proxy.index(1, 0), QStringLiteral("renamed"), Qt::EditRole));
-        QCOMPARE(file.stored("Key", ""), QByteArray("s\0e\0t\0\0\0", 8));
-        QCOMPARE(file.stored_type("Key", "renamed"), 4);
+        QCOMPARE(shown.file.stored("Key", ""), QByteArray("s\0e\0t\0\0\0", 8));
+        QCOMPARE(shown.file.stored_type("Key", "renamed"), 4);
         QCOMPARE(proxy.rowCount(), 3);
         proxy.sort(0, Qt::AscendingOrder);
         QCOMPARE(proxy.index(0, 1).data().toString(), QStringLiteral("REG_SZ"));

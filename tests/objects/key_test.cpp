@@ -195,6 +195,22 @@ private slots:
         QCOMPARE(deleted->value_count(), 0);
     }
 
+    // The engine finds such a value by what stands before the zero, and no value is renamed to what is found.
+    void no_value_is_renamed_to_the_beginning_of_a_name_that_goes_on_behind_a_zero() {
+        testkit::HiveLayout odd;
+        testkit::KeyLayout& layout = odd.root.add("Key");
+        layout.set("", 4, testkit::pattern(4)).name = std::u16string(u"one\0x", 5);
+        layout.set("other", 4, testkit::pattern(4));
+        const HiveOnDisk file(odd);
+        const testkit::Bytes before = file.bytes();
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        auto* key = static_cast<RegKey*>(hive.root_key()->child(0));
+        QVERIFY(!key->rename_value(1, QStringLiteral("one")));
+        QVERIFY(file.bytes() == before);
+        QVERIFY(key->rename_value(1, QStringLiteral("on")));
+    }
+
     void a_dummy_key_has_its_label_no_parent_and_the_children_it_was_given() {
         DummyRegKey top(QStringLiteral("TOP"));
         DummyRegKey other(QStringLiteral("other"));
