@@ -22,7 +22,7 @@ struct Bin {
     uint32_t offset;        // from the first bin
     uint32_t size;          // bytes, header included
     uint32_t largest_free;  // size of the largest free cell, 0 when there is none
-    bool unread;            // it could not be walked when that was to be found out; 0 is written there meanwhile
+    bool unread;            // it could not be walked when that was to be found out; it counts as full meanwhile
     bool mapped;            // its cells are in the cell map
 };
 

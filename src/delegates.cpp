@@ -20,7 +20,7 @@ namespace {
 void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_shown(failure); }
 
 void report_key_failure(const QModelIndex& index, const std::exception& failure) {
-    FailureReport::instance().report(key_path_of(index), failure);
+    FailureReport::instance().report_row(key_path_of(index), failure);
 }
 
 }  // namespace

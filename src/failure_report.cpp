@@ -13,6 +13,8 @@ namespace {
 // A hive can hold thousands of damaged keys; a box must still fit the screen.
 constexpr qsizetype max_lines = 10;
 
+QString reason_of(const std::exception& failure) { return QString::fromLocal8Bit(failure.what()); }
+
 }  // namespace
 
 FailureReport::FailureReport(QObject* parent) : QObject(parent) {}
@@ -26,18 +28,23 @@ FailureReport& FailureReport::instance() {
 }
 
 void FailureReport::report(const QString& key_path, const std::exception& failure) {
-    const QString reason = QString::fromLocal8Bit(failure.what());
-    const QPair<QString, QString> cause(key_path, reason);
-    if (told_.contains(cause)) {
-        return;
-    }
-    // Rows that come into sight while the user scrolls would each bring a box. So many of one key's subkeys, damaged in
-    // one way, are named; the others say so themselves.
-    int& told = told_below_[{key_path.left(key_path.lastIndexOf(QLatin1Char('\\'))), reason}];
-    if (told >= max_lines && pending_.isEmpty()) {
+    tell_once(key_path, reason_of(failure));
+}
+
+void FailureReport::report_row(const QString& key_path, const std::exception& failure) {
+    const QString reason = reason_of(failure);
+    int& told = rows_told_[{key_path.left(key_path.lastIndexOf(QLatin1Char('\\'))), reason}];
+    if (told_.contains({key_path, reason}) || (told >= max_lines && pending_.isEmpty())) {
         return;
     }
     ++told;
+    tell_once(key_path, reason);
+}
+
+void FailureReport::tell_once(const QString& key_path, const QString& reason) {
+    if (told_.contains({key_path, reason})) {
+        return;
+    }
     pending_.append(told_elsewhere(key_path, reason));
     if (!scheduled_) {
         scheduled_ = true;
@@ -52,17 +59,13 @@ QString FailureReport::told_elsewhere(const QString& key_path, const QString& re
 }
 
 void FailureReport::report_at_current(const std::exception& failure, bool from_gesture) {
-    const QString reason = QString::fromLocal8Bit(failure.what());
+    const QString reason = reason_of(failure);
     if (!is_told_below(from_gesture ? current_key_ + QLatin1Char('\\') : QString(), reason)) {
         report(current_key_, failure);
     }
 }
 
-void FailureReport::report_at_shown(const std::exception& failure) {
-    if (!is_told_below(shown_key_ + QLatin1Char('\\'), QString::fromLocal8Bit(failure.what()))) {
-        report(shown_key_, failure);
-    }
-}
+void FailureReport::report_at_shown(const std::exception& failure) { report(shown_key_, failure); }
 
 bool FailureReport::is_told_below(const QString& key_path, const QString& reason) const {
     return std::any_of(told_.cbegin(), told_.cend(), [&](const QPair<QString, QString>& told) {
@@ -87,6 +90,14 @@ void tell_failure(QWidget* parent, const QString& text) {
     QMessageBox box(QMessageBox::Critical, QCoreApplication::applicationName(), text, QMessageBox::Ok, parent);
     box.setTextFormat(Qt::PlainText);
     box.exec();
+}
+
+void meet_failures(QWidget* parent, const QString& key_path, const std::function<void()>& gesture) {
+    try {
+        gesture();
+    } catch (const std::exception& failure) {
+        tell_failure(parent, FailureReport::instance().told_elsewhere(key_path, reason_of(failure)));
+    }
 }
 
 QString key_path_of(const QModelIndex& index) {

@@ -74,28 +74,31 @@ void KeysView::show_keys_context_menu(QPoint point) {
 
 void KeysView::run_new_key_action(bool /*checked*/) {
     auto* keys = qobject_cast<RegModel*>(model());
-    if (!keys || !may_change_rows(*this)) {
-        return;
+    if (keys && may_change_rows(*this) && currentIndex().isValid()) {
+        meet_failures(this, key_path_of(currentIndex()), [&] { make_key(*keys); });
     }
+}
+
+void KeysView::make_key(RegModel& keys) {
     const QModelIndex current = currentIndex();
-    if (!current.isValid()) {
-        return;
-    }
-    const int row = keys->new_key(current);
+    const int row = keys.new_key(current);
     if (row < 0) {
         tell_failure(this, tr("The key could not be created."));
         return;
     }
-    const QModelIndex created = keys->index(row, 0, current);
+    const QModelIndex created = keys.index(row, 0, current);
     setCurrentIndex(created);
     edit(created);
 }
 
 void KeysView::run_delete_key_action(bool /*checked*/) {
     // The values table answers the same action.
-    if (!hasFocus() || !model() || !may_change_rows(*this)) {
-        return;
+    if (hasFocus() && model() && may_change_rows(*this)) {
+        meet_failures(this, key_path_of(currentIndex()), [this] { delete_key(); });
     }
+}
+
+void KeysView::delete_key() {
     // What is deleted is the key that was asked about.
     const QPersistentModelIndex asked = currentIndex();
     if (!asked.isValid() || !confirm_remove()) {
@@ -144,15 +147,10 @@ void KeysView::keyboardSearch(const QString& typed) {
     if (!model() || model()->rowCount() == 0 || typed.isEmpty()) {
         return;
     }
-    const bool goes_on =
-        since_typed_.isValid() && since_typed_.elapsed() < QApplication::keyboardInputInterval() && !typed_.isEmpty();
-    typed_ = goes_on ? typed_ + typed : typed;
-    since_typed_.start();
-    // One letter again and again goes from match to match.
-    const bool is_repeated = typed_.count(typed_[0]) == typed_.size();
-    const QString wanted = is_repeated ? typed_.left(1) : typed_;
+    typed_.add(typed);
+    const QString wanted = typed_.wanted();
     const QModelIndex current = currentIndex();
-    if (!is_repeated && select_if_named(current, wanted)) {
+    if (!typed_.is_repeated() && select_if_named(current, wanted)) {
         return;
     }
     // To the end, and once again from the top: the current key may stand in a closed branch, and not be met.

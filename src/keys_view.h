@@ -4,8 +4,11 @@
 // The key tree: its context menu, and the key commands of the shared actions.
 #pragma once
 
-#include <QElapsedTimer>
+#include "type_ahead.h"
+
 #include <QTreeView>
+
+class RegModel;
 
 class KeysView : public QTreeView {
     Q_OBJECT
@@ -37,12 +40,13 @@ protected:
     void paintEvent(QPaintEvent* event) override;
 
 private:
+    void make_key(RegModel& keys);
+    void delete_key();
     bool confirm_remove();
     void expand_below(const QModelIndex& top);
     bool select_if_named(const QModelIndex& key, const QString& beginning);
 
     // The press that asks for the next context menu was meant for a row that has moved away.
     bool menu_is_stale_ = false;
-    QString typed_;
-    QElapsedTimer since_typed_;
+    TypeAhead typed_;
 };

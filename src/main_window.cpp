@@ -61,6 +61,8 @@ MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
     // A program that ends by another way than this window must not leave a search behind, either.
     connect(qApp, &QCoreApplication::aboutToQuit, this, &MainWindow::end_search);
     connect(qApp, &QCoreApplication::aboutToQuit, this, [this] { finish_editing(*this); });
+    // Later: the table is told of other rows when it has done asking for these.
+    connect(values_table, &ValuesView::asked_in_vain, this, &MainWindow::let_go_of_lost_key, Qt::QueuedConnection);
     make_menus();
     menuBar()->installEventFilter(this);
     statusBar()->installEventFilter(this);
@@ -119,12 +121,13 @@ void MainWindow::make_menus() {
     find_action->setShortcut(QKeySequence::Find);
     connect(find_action, &QAction::triggered, this, &MainWindow::show_find_dialog);
     QAction* find_next_action = edit_menu->addAction(tr("Find next", "menu item"));
-    find_next_action->setShortcut(QKeySequence::FindNext);
+    // With every key that the desktop has for it: on some the first is not F3.
+    find_next_action->setShortcuts(QKeySequence::FindNext);
     connect(find_next_action, &QAction::triggered, this, &MainWindow::find_next);
 
     QMenu* view_menu = menuBar()->addMenu(tr("&View", "menu title"));
     QAction* refresh_action = view_menu->addAction(tr("Refresh", "menu item"));
-    refresh_action->setShortcut(QKeySequence::Refresh);
+    refresh_action->setShortcuts(QKeySequence::Refresh);
     connect(refresh_action, &QAction::triggered, this, &MainWindow::refresh_views);
     // A key that is clicked again does not become current again, though the actions may be a value's meanwhile.
     connect(qApp, &QApplication::focusChanged, this, [this](QWidget* /*old*/, const QWidget* now) {
@@ -204,6 +207,19 @@ void MainWindow::show_values_of(const QModelIndex& key) {
     }
 }
 
+// The same for a key that could be read when it was shown; one whose reads fail now and then is kept.
+void MainWindow::let_go_of_lost_key() {
+    try {
+        values_proxy->rowCount();
+        values_table->viewport()->update();
+    } catch (const std::exception&) {
+        close_editors(*values_table);
+        set_values_source(nullptr);
+        shared_actions().new_action_group->setEnabled(false);
+        set_key_actions(keys_tree->currentIndex());
+    }
+}
+
 void MainWindow::set_values_source(RegKey* key) {
     auto source = std::make_unique<ValuesModel>(key, nullptr);
     // The old source goes only when the proxy has let go of it, also where the new one's key throws.
@@ -227,7 +243,14 @@ void MainWindow::value_selected(const QModelIndex& current) {
     }
     const SharedActions& actions = shared_actions();
     actions.delete_action->setEnabled(true);
-    actions.rename_action->setEnabled(values_proxy->flags(current).testFlag(Qt::ItemIsEditable));
+    // Here, since the window system makes the window active, and so the table, past Application::notify.
+    bool is_editable = false;
+    try {
+        is_editable = values_proxy->flags(current).testFlag(Qt::ItemIsEditable);
+    } catch (const std::exception& failure) {
+        FailureReport::instance().report_at_shown(failure);
+    }
+    actions.rename_action->setEnabled(is_editable);
 }
 
 void MainWindow::value_selected(const QModelIndex& current, const QModelIndex& /*previous*/) {
@@ -238,12 +261,19 @@ void MainWindow::refresh_views() {
     if (!may_change_rows(*this)) {
         return;
     }
-    // The proxy leaves the current index at its row; the user's next key is meant for the value, not for its place.
-    const QModelIndex current = values_proxy->mapToSource(values_table->currentIndex());
-    values_proxy->sort(0, Qt::AscendingOrder);
-    if (current.isValid()) {
-        values_table->setCurrentIndex(values_proxy->mapFromSource(current));
+    if (!values_proxy->has_key() && keys_tree->currentIndex().isValid()) {
+        // The key was let go of; it is asked again.
+        reload_values(keys_tree->currentIndex());
+        return;
     }
+    meet_failures(this, FailureReport::instance().shown_key(), [this] {
+        // The proxy leaves the current index at its row; the user's next key is meant for the value, not for its place.
+        const QModelIndex current = values_proxy->mapToSource(values_table->currentIndex());
+        values_proxy->sort(0, Qt::AscendingOrder);
+        if (current.isValid()) {
+            values_table->setCurrentIndex(values_proxy->mapFromSource(current));
+        }
+    });
     // A value that became current has taken the actions, which are about what has the keyboard.
     if (keys_tree->hasFocus()) {
         set_key_actions(keys_tree->currentIndex());

@@ -60,6 +60,7 @@ private:
     void show_status(const QModelIndex& key);
     void show_values_of(const QModelIndex& key);
     void set_values_source(RegKey* key);
+    void let_go_of_lost_key();
     void set_key_actions(const QModelIndex& key);
     void start_search(const QModelIndex& start, const QString& term);
     void show_hit(const RegModel::FindResult& hit);

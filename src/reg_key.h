@@ -87,7 +87,7 @@ public:
 
     // Makes a subkey "New Key #%i" with the lowest free number; returns its position, negative on failure.
     int new_key();
-    // Deletes the index-th subkey, which must have none itself. false: refused, nothing changed.
+    // Deletes the index-th subkey, which must have none itself. false: refused, or a read or write failed.
     bool delete_key(int index);
     // Whether the index-th subkey can be deleted with all below it. Changes nothing.
     bool can_delete_tree(int index);

@@ -89,14 +89,6 @@ RegValue ValuesModel::lookup(int row) const {
     return found;
 }
 
-void ValuesModel::forget_unreadable() {
-    const QList<int> rows = cache_.keys();
-    for (const int row : rows) {
-        if (!cache_.object(row)->data.isValid())
-            cache_.remove(row);
-    }
-}
-
 QVariant ValuesModel::data(const QModelIndex& index, int role) const {
     if (!index.isValid() || key_ == nullptr)
         return QVariant();
@@ -188,11 +180,11 @@ bool ValuesModel::rename(int row, const QString& name) {
     try {
         renamed = key_->rename_value(row, name);
     } catch (...) {
-        forget_from(row);
+        forget_rows();
         announce_new_rows(rows);
         throw;
     }
-    forget_from(row);
+    forget_rows();
     announce_new_rows(rows);
     return renamed;
 }
@@ -245,14 +237,6 @@ bool ValuesModel::store(int row, const QVariant& value) {
     }
 }
 
-void ValuesModel::forget_from(int row) {
-    const QList<int> rows = cache_.keys();
-    for (const int cached : rows) {
-        if (cached >= row)
-            cache_.remove(cached);
-    }
-}
-
 bool ValuesModel::can_remove(int row) const {
     return key_ != nullptr && row >= 0 && row < rowCount() && key_->can_delete_value(row);
 }
@@ -270,7 +254,7 @@ bool ValuesModel::removeRows(int row, int count, const QModelIndex& parent) {
         }
     };
     beginRemoveRows(parent, row, row);
-    forget_from(row);
+    forget_rows();
     bool removed = false;
     try {
         removed = key_->delete_value(row);
@@ -287,6 +271,7 @@ bool ValuesModel::insert_at_end(const std::function<bool()>& make) {
         return false;
     const int row = rowCount();
     beginInsertRows(QModelIndex(), row, row);
+    forget_rows();
     bool made = false;
     try {
         made = make();

@@ -48,11 +48,12 @@ public:
     // Makes the unnamed value, as text; false where there may be one.
     bool add_default_value(const QString& data);
 
-    // Lets the data that could not be read be tried again. Until then such a row is kept: where many values lead to the
-    // same long data, each painting of them would read all of it for each.
-    void forget_unreadable();
+    // Lets every row be read again. Until then also those whose data could not be read are kept: where many values
+    // lead to the same long data, each painting of them would read all of it for each.
+    void forget_rows() { cache_.clear(); }
 
-    // Bytes of memory that the rows kept take at most: a short row counts as a hundredth of what may be kept.
+    // Bytes of memory that the data of the rows kept counts for: that of a short row as a hundredth of what may be
+    // kept, that of one longer than all that as just that.
     qsizetype cached_bytes() const { return cache_.totalCost(); }
 
 private:
@@ -63,7 +64,6 @@ private:
     bool make_empty(const QString& name, int type);
     int rows_now(int otherwise) const;  // otherwise: where the key cannot say
     void announce_new_rows(int before);
-    void forget_from(int row);
     std::vector<std::pair<int, RegValue>> take_shown();
     void announce_others(const std::vector<std::pair<int, RegValue>>& shown, int told);
 

@@ -311,7 +311,7 @@ void ValuesProxyModel::announce_layout() {
 void ValuesProxyModel::sort(int, Qt::SortOrder) {
     emit layoutAboutToBeChanged();
     if (auto* values = qobject_cast<ValuesModel*>(sourceModel()))
-        values->forget_unreadable();
+        values->forget_rows();
     const int rows = sourceModel() != nullptr ? sourceModel()->rowCount() : 0;
     const auto name_of = [this](int row) {
         return sourceModel()->data(sourceModel()->index(row, 0), Qt::DisplayRole).toString();

@@ -16,7 +16,6 @@
 #include <QActionGroup>
 #include <QApplication>
 #include <QClipboard>
-#include <QCoreApplication>
 #include <QHeaderView>
 #include <QHelpEvent>
 #include <QKeyEvent>
@@ -81,6 +80,7 @@ ValuesView::ValuesView(QWidget* parent) : QTableView(parent) {
     horizontalHeader()->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
     horizontalHeader()->setHighlightSections(false);
     connect(horizontalHeader(), &QHeaderView::sectionCountChanged, this, &ValuesView::size_columns);
+    horizontalHeader()->viewport()->installEventFilter(this);
 }
 
 void ValuesView::size_columns(int old_count, int new_count) {
@@ -98,13 +98,7 @@ void ValuesView::value_double_clicked(QModelIndex index) {
     if (!index.isValid() || !model() || index.column() != name_column || !may_change_rows(*this)) {
         return;
     }
-    try {
-        edit_value(index);
-    } catch (const std::exception& failure) {
-        // Told each time: the user has asked for an editor that does not come, or filled one in.
-        FailureReport& report = FailureReport::instance();
-        tell_failure(this, report.told_elsewhere(report.shown_key(), QString::fromLocal8Bit(failure.what())));
-    }
+    meet_failures(this, FailureReport::instance().shown_key(), [&] { edit_value(index); });
 }
 
 void ValuesView::edit_value(const QModelIndex& index) {
@@ -161,18 +155,33 @@ bool ValuesView::edit_qword(const QString& value_name, quint64 number, const QPe
 }
 
 void ValuesView::keyPressEvent(QKeyEvent* event) {
+    FailureReport::instance().set_current_key_to_shown();
     if (event->key() == Qt::Key_Return && state() != QAbstractItemView::EditingState) {
         value_double_clicked(currentIndex());
     } else if (event->matches(QKeySequence::Copy) && currentIndex().isValid()) {
         // As it is shown: the toolkit would take bytes for text, and a list of strings for nothing.
         event->accept();
-        try {
-            QApplication::clipboard()->setText(shown_text(currentIndex()));
-        } catch (const std::exception& failure) {
-            FailureReport::instance().report_at_shown(failure);
-        }
+        meet_failures(this, FailureReport::instance().shown_key(),
+                      [this] { QApplication::clipboard()->setText(shown_text(currentIndex())); });
     } else {
         QTableView::keyPressEvent(event);
+    }
+}
+
+// The table's own reads the data of the rows that it passes, and ends at the first that cannot be read.
+void ValuesView::keyboardSearch(const QString& typed) {
+    if (!model() || model()->rowCount() == 0 || typed.isEmpty()) {
+        return;
+    }
+    typed_.add(typed);
+    const int rows = model()->rowCount();
+    const int first = currentIndex().isValid() ? currentIndex().row() + (typed_.is_repeated() ? 1 : 0) : 0;
+    for (int passed = 0; passed < rows; ++passed) {
+        const QModelIndex value = model()->index((first + passed) % rows, name_column);
+        if (value.data(Qt::DisplayRole).toString().startsWith(typed_.wanted(), Qt::CaseInsensitive)) {
+            setCurrentIndex(value);
+            return;
+        }
     }
 }
 
@@ -208,14 +217,17 @@ void ValuesView::show_values_context_menu(QPoint point) {
 void ValuesView::run_new_value_action(QAction* action) {
     auto* values = qobject_cast<ValuesProxyModel*>(model());
     const int type = type_created_by(action);
-    if (!values || type < 0 || !values->has_key() || !may_change_rows(*this)) {
-        return;
+    if (values && type >= 0 && values->has_key() && may_change_rows(*this)) {
+        meet_failures(this, FailureReport::instance().shown_key(), [&] { make_value(*values, type); });
     }
-    if (!values->add_value(type)) {
+}
+
+void ValuesView::make_value(ValuesProxyModel& values, int type) {
+    if (!values.add_value(type)) {
         tell_failure(this, tr("The value could not be created."));
         return;
     }
-    const QModelIndex created = values->index(values->rowCount() - 1, name_column);
+    const QModelIndex created = values.index(values.rowCount() - 1, name_column);
     make_current(created);
     edit(created);
 }
@@ -229,9 +241,12 @@ void ValuesView::make_current(const QModelIndex& index) {
 
 void ValuesView::run_delete_value_action(bool /*checked*/) {
     // The key tree answers the same action.
-    if (!hasFocus() || !model() || !may_change_rows(*this)) {
-        return;
+    if (hasFocus() && model() && may_change_rows(*this)) {
+        meet_failures(this, FailureReport::instance().shown_key(), [this] { delete_value(); });
     }
+}
+
+void ValuesView::delete_value() {
     // What is deleted is the value that was asked about.
     const QPersistentModelIndex asked = currentIndex();
     if (!asked.isValid()) {
@@ -269,13 +284,37 @@ void ValuesView::run_rename_value_action(bool /*checked*/) {
     edit(current);
 }
 
+// Asked before a paint, which asks for rows and flags where an exception would leave its painter open.
+bool ValuesView::can_ask() {
+    try {
+        if (model()) {
+            model()->rowCount();
+        }
+        return true;
+    } catch (const std::exception& failure) {
+        FailureReport::instance().report_at_shown(failure);
+        emit asked_in_vain();
+        return false;
+    }
+}
+
 void ValuesView::paintEvent(QPaintEvent* event) {
-    // Last net: the table asks the model for its flags and its size from inside a paint too.
+    if (!can_ask()) {
+        return;
+    }
+    // Last net, should a read fail that has just gone well.
     try {
         QTableView::paintEvent(event);
     } catch (const std::exception& failure) {
         FailureReport::instance().report_at_shown(failure);
     }
+}
+
+bool ValuesView::eventFilter(QObject* watched, QEvent* event) {
+    if (watched == horizontalHeader()->viewport() && event->type() == QEvent::Paint && !can_ask()) {
+        return true;
+    }
+    return QTableView::eventFilter(watched, event);
 }
 
 // The text of a cell that cuts it; of a very long one, the beginning.
@@ -289,12 +328,15 @@ QString ValuesView::cut_text(const QModelIndex& index) const {
 
 bool ValuesView::viewportEvent(QEvent* event) {
     if (event->type() != QEvent::ToolTip) {
+        if (event->type() == QEvent::MouseButtonPress || event->type() == QEvent::ContextMenu) {
+            FailureReport::instance().set_current_key_to_shown();
+        }
         return QTableView::viewportEvent(event);
     }
     const auto* help = static_cast<QHelpEvent*>(event);
-    const QModelIndex index = indexAt(help->pos());
     QString text;
     try {
+        const QModelIndex index = indexAt(help->pos());
         text = index.isValid() ? cut_text(index) : QString();
     } catch (const std::exception& failure) {
         FailureReport::instance().report_at_shown(failure);

@@ -4,15 +4,25 @@
 // The values table: its context menus, new, delete and rename, and the editor that fits each kind of data.
 #pragma once
 
+#include "type_ahead.h"
+
 #include <QTableView>
 
 class QAction;
+class ValuesProxyModel;
 
 class ValuesView : public QTableView {
     Q_OBJECT
 
 public:
     explicit ValuesView(QWidget* parent);
+
+    // Moves to the next value whose name begins with what is being typed.
+    void keyboardSearch(const QString& typed) override;
+
+signals:
+    // The key whose values are shown does not say how many it has: nothing was painted.
+    void asked_in_vain();
 
 public slots:
     void value_double_clicked(QModelIndex index);
@@ -25,13 +35,20 @@ protected:
     void keyPressEvent(QKeyEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
     bool viewportEvent(QEvent* event) override;
+    // Of the header, which asks the key as well.
+    bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
     void size_columns(int old_count, int new_count);
     void make_current(const QModelIndex& index);
+    bool can_ask();
+    void make_value(ValuesProxyModel& values, int type);
+    void delete_value();
     QString cut_text(const QModelIndex& index) const;
     void edit_value(const QModelIndex& index);
     // False when what was entered could not be stored.
     bool edit_dword(const QString& value_name, quint32 number, const QPersistentModelIndex& data_index);
     bool edit_qword(const QString& value_name, quint64 number, const QPersistentModelIndex& data_index);
+
+    TypeAhead typed_;
 };

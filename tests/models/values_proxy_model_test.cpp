@@ -78,6 +78,52 @@ class ValuesProxyModelTest : public QObject {
     Q_OBJECT
 
 private slots:
+    // A damaged value can show what belongs to others, which any change may free.
+    void a_row_is_read_again_after_any_change_data() {
+        QTest::addColumn<int>("change");
+        QTest::newRow("new values") << 0;
+        QTest::newRow("a value renamed") << 1;
+    }
+
+    void a_row_is_read_again_after_any_change() {
+        QFETCH(int, change);
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& key = hive.root.add("Key");
+        key.set("a", 3, testkit::pattern(8));
+        key.set("b", 4, testkit::pattern(4));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        const auto& places = laid.at("Key");
+        // The data of the first is the list of both, or the record of the second.
+        constexpr uint32_t data_field = 8;
+        laid.put32(places.values.at(0).record, data_field,
+                   change == 0 ? places.value_list : places.values.at(1).record);
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        ValuesModel model(static_cast<RegKey*>(opened.root_key()->child(0)));
+        QVERIFY(model.index(0, ValuesModel::DataColumn).data().isValid());
+        if (change == 0) {
+            QVERIFY(model.add_value(REG_DWORD));
+            QVERIFY(model.add_value(REG_DWORD));
+        } else {
+            QVERIFY(model.setData(model.index(1, ValuesModel::NameColumn), QStringLiteral("c"), Qt::EditRole));
+        }
+        QVERIFY(!model.index(0, ValuesModel::DataColumn).data().isValid());
+    }
+
+    void a_sort_reads_every_row_again() {
+        Shown shown(Full);
+        const QModelIndex datum = shown.proxy.index(shown.proxy.rowCount() - 1, ValuesModel::DataColumn);
+        QCOMPARE(datum.siblingAtColumn(0).data().toString(), QStringLiteral("b"));
+        const QVariant before = datum.data();
+        // What else has the key may change it.
+        ValuesModel other(shown.source->key());
+        QVERIFY(other.setData(other.index(0, ValuesModel::DataColumn), 7U, Qt::DisplayRole));
+        QCOMPARE(datum.data(), before);
+        shown.proxy.sort(0, Qt::AscendingOrder);
+        QCOMPARE(datum.data(), QVariant(7U));
+    }
+
     void the_model_is_one_that_views_can_rely_on() {
         Shown shown(Bare);
         const QAbstractItemModelTester tester(&shown.proxy, QAbstractItemModelTester::FailureReportingMode::QtTest);

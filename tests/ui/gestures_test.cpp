@@ -251,15 +251,22 @@ private slots:
             const QPoint point = stage.values->visualRect(stage.values->model()->index(row, 0)).center();
             QHelpEvent asked(QEvent::ToolTip, point, stage.values->viewport()->mapToGlobal(point));
             QApplication::sendEvent(stage.values->viewport(), &asked);
-            stage.values->setCurrentIndex(stage.values->model()->index(row, 1));
-            QTest::keySequence(stage.values, QKeySequence::Copy);
         }
         QVERIFY2(hand.nothing_comes(), "told a second time, of another key");
-        // Who asks for an editor is answered.
-        hand.then_press(QMessageBox::Ok);
-        stage.values->value_double_clicked(stage.values->model()->index(1, 0));
-        QVERIFY(hand.is_done());
-        QCOMPARE(hand.text, QStringLiteral("The key \"%1\" cannot be read: index").arg(alpha));
+        // Who asks for a copy or an editor is answered, and keeps what was copied before.
+        const QModelIndex damaged = stage.values->model()->index(1, 0);
+        QApplication::clipboard()->setText(QStringLiteral("before"));
+        stage.values->setCurrentIndex(damaged.siblingAtColumn(1));
+        const auto copy = [&] { QTest::keySequence(stage.values, QKeySequence::Copy); };
+        const auto open = [&] { stage.values->value_double_clicked(damaged); };
+        for (const std::function<void()>& gesture : {std::function<void()>(copy), std::function<void()>(open)}) {
+            hand.text.clear();
+            hand.then_press(QMessageBox::Ok);
+            gesture();
+            QVERIFY(hand.is_done());
+            QCOMPARE(hand.text, QStringLiteral("The key \"%1\" cannot be read: index").arg(alpha));
+        }
+        QCOMPARE(QApplication::clipboard()->text(), QStringLiteral("before"));
     }
 };
 

@@ -16,8 +16,8 @@
 //   byte each there. Where a terminator is written, the size handed back never counts it.
 // * Every output pointer may be null; that output is then left out. A required pointer that is null gives the
 //   status that the function names.
-// * Status numbers are those of RegistryStatus. A call that fails leaves its outputs as they were unless it says
-//   otherwise, and frees all that it allocated itself.
+// * Status numbers are those of RegistryStatus. A call that fails may have set its outputs up to the one that failed,
+//   and no later one unless it says so. It frees all that it allocated itself.
 // * Handles are snapshots: a handle does not see changes made through another handle. Once its key is deleted, or
 //   renamed through another handle, a handle is only to be closed: its cell may be another key's by then.
 // * One hive with all its handles is used by one thread at a time; the engine holds no locks.
@@ -101,8 +101,8 @@ RegistryKey* ROpenHive(const RegistryIo* io);
 // The same with the handle flags given (ROpenHive passes R_HANDLE_HIVE).
 RegistryKey* ROpenHiveEx(const RegistryIo* io, uint32_t handle_flags);
 
-// Releases a handle. null: -1. A root handle goes to RCloseHive. An incomplete handle, which a failed ROpenKeyEx
-// left behind, is freed and gives 6. Otherwise 0.
+// Releases a handle. null: -1. A root handle goes to RCloseHive. An incomplete handle, which a failed ROpenKeyEx left
+// behind, and that of a key inside the hive which is flagged as a hive's root are freed and give 6. Otherwise 0.
 int32_t RCloseKey(RegistryKey* key);
 // Closes the hive and frees its root handle. null or no root handle: 6; 2404 while subkey handles are open (nothing
 // is freed); otherwise 0. Nothing is written.
@@ -135,15 +135,15 @@ int32_t REnumKeyExA(RegistryKey* key, uint32_t index, char* name, uint32_t* name
                     uint32_t* class_size, RegistryTime* out_last_write);
 
 // The index-th value in the order of the value list, text in 8 bits. Never reports a short buffer: what does not fit
-// is left out, and the size handed back is the whole one (names: characters as stored; text data of types 1, 2, 6:
-// characters; other data: bytes). 259: past the end. -1: not a key, or a damaged record. 8: no memory. 1003: data
-// that is not in one cell of its own.
+// is left out, and the size handed back is the whole one (names: characters as stored; data of types 1, 2, 6 and 7
+// that is handed out from a cell of its own: characters; all other, and any without a buffer: bytes). 259: past the
+// end. -1: not a key, or a damaged record. 8: no memory. 1003: data that is not in one cell of its own.
 int32_t REnumValueA(RegistryKey* key, uint32_t index, char* name, uint32_t* name_size, uint32_t* out_type, void* data,
                     uint32_t* data_size);
-// The index-th value, name in UTF-16 (size in bytes, needs two bytes more than the name), data as stored.
-// 259: past the end. 8: no memory. -1: not a key, or a damaged record. 111: the name buffer is too small (size becomes
-// the need, nothing else is handed out). 234: the data buffer is too small (size becomes the need). 1003, 1015, 1016:
-// the data cannot be read. Without a data buffer data_size becomes the stored size.
+// The index-th value, name in UTF-16 (size in bytes, needs two bytes more than the name), data as stored. 259: past
+// the end. -1: not a key, or a damaged record. 111: the name buffer is too small (size becomes the need, nothing else
+// is handed out). 234: the data buffer is too small (size becomes the need). 1003, 1015, 1016: the data cannot be
+// read. Without a data buffer data_size becomes the stored size.
 int32_t REnumValueW(RegistryKey* key, uint32_t index, uint16_t* name, uint32_t* name_size, uint32_t* out_type,
                     void* data, uint32_t* data_size);
 // The position of the value of that name, case ignored; a null or empty name means the unnamed (default) value. -1:
@@ -188,11 +188,11 @@ int32_t RDeleteValue(RegistryKey* key, const char* name);
 // Renames the index-th subkey; it stays the same key. 1013: read-only. 6: not a key. 87: null or empty name, one with
 // a backslash, or one that is too long. 3: the subkey cannot be opened. -1: a sibling has that name in any case, the
 // key is listed elsewhere too, or a step failed. 1003: a record could not be read or written. 8: no memory. Unless 0,
-// the key still has its old name.
+// the key has its old name, but after a 1003 where a write and its taking back both failed.
 int32_t RRenameKey(RegistryKey* key, uint32_t index, const char* new_name);
 // Deletes the key at `path`, which must have no subkeys. 1013: read-only. 6: a handle without flag 32. 3: not found,
 // listed below an index root, or listed elsewhere too; also where the path ends in a backslash or in a component of
-// more than 259 characters. 145: it has subkeys. 8: no memory. -1, 1003: a step failed. A null or empty path gives 3.
+// more than 259 characters. 145: it has subkeys. 8: no memory. -1: a step failed. A null or empty path gives 3.
 int32_t RDeleteKey(RegistryKey* key, const char* path);
 // What RDeleteKey would say to the index-th subkey and to each key below it, leaves first; writes nothing. 0: the
 // whole subtree can be deleted key by key. 123: a name in it is stored in UTF-16, which no path can say.

@@ -1,0 +1,258 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// What is shown, and cannot be read any more or again: who hears of it, of which key, and how often.
+#include "failure_report.h"
+#include "reg_key.h"
+#include "shared_actions.h"
+#include "stage.h"
+#include "ui_test.h"
+
+#include <QActionGroup>
+#include <QApplication>
+#include <QFile>
+#include <QHeaderView>
+#include <QRegularExpression>
+#include <QTest>
+
+namespace {
+
+const QString system_path = QStringLiteral("MACHINE\\SYSTEM");
+const QString alpha = system_path + QStringLiteral("\\Alpha");
+const QString beta = system_path + QStringLiteral("\\Beta");
+
+QString told(const QString& key, const char* reason) {
+    return QStringLiteral("The key \"%1\" cannot be read: %2").arg(key, QLatin1String(reason));
+}
+
+// More keys than handles are kept, and more data than the engine keeps of the file.
+testkit::HiveLayout large() {
+    testkit::HiveLayout layout;
+    testkit::KeyLayout& key = layout.root.add("Alpha");
+    key.set("number", 4, testkit::pattern(4));
+    key.set("text", 1, testkit::text_data("hello"));
+    key.add("Deep");
+    layout.root.add("Beta").add("Below");
+    layout.root.add("Filler").set("much", 3, testkit::pattern(40000));
+    for (int i = 0; i < 150; i++) {
+        layout.root.add("k" + std::to_string(i));
+    }
+    return layout;
+}
+
+// As when the user has been elsewhere in the tree for long.
+void forget_everything(const Stage& stage) {
+    const QModelIndex hive = stage.key(system_path);
+    for (int row = 0; row < stage.model->rowCount(hive); ++row) {
+        try {
+            stage.model->index(row, 0, hive).data();
+            RegKey* key = RegModel::editable_key(stage.model->index(row, 0, hive));
+            if (key->value_count() == 1) {
+                key->read_value(0);
+            }
+        } catch (const std::exception&) {
+            // The damaged one.
+        }
+    }
+}
+
+// The key cannot be read any more. What its row in the tree throws has been told.
+void lose_alpha(const Stage& stage, Scene& scene) {
+    FailureReport::instance().told_elsewhere(system_path + QStringLiteral("\\#0"),
+                                             QStringLiteral("ROpenSubKey failed"));
+    scene.damage_key("Alpha");
+    forget_everything(stage);
+}
+
+void put_back(const Scene& scene, const QByteArray& bytes) {
+    QFile file(scene.file());
+    QVERIFY(file.open(QIODevice::ReadWrite));
+    QCOMPARE(file.write(bytes), bytes.size());
+}
+
+}  // namespace
+
+class LostKeyTest : public QObject {
+    Q_OBJECT
+
+private slots:
+    // Nothing has been told yet.
+    void init() { delete &FailureReport::instance(); }
+
+    // The window system makes a window active, and so the table, past the application's own net.
+    void a_table_whose_key_is_lost_is_emptied() {
+        Scene scene(large());
+        const QByteArray sound = scene.bytes();
+        Stage stage(scene);
+        stage.select_value(alpha, QStringLiteral("number"));
+        QVERIFY(shared_actions().rename_action->isEnabled());
+        lose_alpha(stage, scene);
+        stage.keys->setFocus();
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        stage.values->setFocus();
+        QVERIFY(!shared_actions().rename_action->isEnabled());
+        QTRY_VERIFY(hand.is_done());
+        QCOMPARE(hand.text, told(alpha, "ROpenSubKey failed"));
+        QTRY_COMPARE(stage.values->model()->rowCount(), 0);
+        QVERIFY(!shared_actions().new_action_group->isEnabled());
+        QVERIFY(!shared_actions().delete_action->isEnabled());
+        QVERIFY(hand.nothing_comes());
+
+        put_back(scene, sound);
+        forget_everything(stage);
+        stage.return_to(*stage.keys);
+        QTest::keySequence(&stage.window, QKeySequence(QKeySequence::Refresh));
+        QCOMPARE(stage.value_names(),
+                 QStringList({QStringLiteral("(Default)"), QStringLiteral("number"), QStringLiteral("text")}));
+        QVERIFY(shared_actions().new_action_group->isEnabled());
+        QCOMPARE(scene.bytes(), sound);
+    }
+
+    void nothing_is_painted_of_a_table_whose_key_is_lost() {
+        Scene scene(large());
+        Stage stage(scene);
+        stage.select_key(alpha);
+        lose_alpha(stage, scene);
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        // An exception that passes a paint event leaves its painter open, which the next one is warned of.
+        QTest::failOnWarning(QRegularExpression(QStringLiteral("paint")));
+        stage.values->horizontalHeader()->viewport()->repaint();
+        stage.values->viewport()->repaint();
+        QTRY_VERIFY(hand.is_done());
+        QTRY_COMPARE(stage.values->model()->rowCount(), 0);
+        stage.window.repaint();
+        QVERIFY(hand.nothing_comes());
+    }
+
+    void a_gesture_in_the_table_is_about_the_key_that_it_shows_data() {
+        QTest::addColumn<bool>("is_new");
+        QTest::newRow("new") << true;
+        QTest::newRow("delete") << false;
+    }
+
+    // What was pressed last in the tree has nothing to do with it.
+    void a_gesture_in_the_table_is_about_the_key_that_it_shows() {
+        QFETCH(bool, is_new);
+        Scene scene(large());
+        Stage stage(scene);
+        stage.select_value(alpha, QStringLiteral("number"));
+        lose_alpha(stage, scene);
+        const QByteArray before = scene.bytes();
+        FailureReport::instance().set_current_key(beta);
+        DialogHand hand;
+        if (!is_new) {
+            hand.then_press(QMessageBox::Yes);
+        }
+        hand.then_press(QMessageBox::Ok);
+        (is_new ? shared_actions().new_dword_action : shared_actions().delete_action)->trigger();
+        QVERIFY(hand.is_done());
+        QCOMPARE(hand.text, told(alpha, "ROpenSubKey failed"));
+        QVERIFY(hand.nothing_comes());
+        QCOMPARE(scene.bytes(), before);
+    }
+
+    void typing_in_the_table_passes_over_what_cannot_be_read() {
+        testkit::HiveLayout layout;
+        testkit::KeyLayout& key = layout.root.add("Alpha");
+        for (const char* name : {"about", "damaged", "query", "quick"}) {
+            key.set(name, 4, testkit::pattern(4));
+        }
+        layout.root.add("Beta");
+        Scene scene(layout);
+        scene.damage_value("Alpha", 1);
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        for (const int column : {0, 1, 2}) {
+            Stage stage(scene);
+            stage.select_key(alpha);
+            QTRY_VERIFY(hand.is_done());
+            FailureReport::instance().set_current_key(beta);
+            stage.values->setFocus();
+            stage.values->setCurrentIndex(stage.value(QStringLiteral("about"), column));
+            QTest::keyClicks(stage.values, QStringLiteral("qui"));
+            QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("quick")));
+        }
+        // One letter again and again goes round.
+        Stage stage(scene);
+        stage.select_value(alpha, QStringLiteral("about"));
+        for (const char* name : {"query", "quick", "query"}) {
+            QTest::keyClick(stage.values, Qt::Key_Q);
+            QCOMPARE(stage.values->currentIndex(), stage.value(QLatin1String(name)));
+        }
+        QVERIFY(hand.nothing_comes());
+    }
+
+    // What a key below has thrown says nothing of this one.
+    void a_damaged_value_is_told_of_a_key_above_one_that_has_another() {
+        testkit::HiveLayout layout;
+        testkit::KeyLayout& key = layout.root.add("Alpha");
+        key.set("damaged", 4, testkit::pattern(4));
+        key.add("Deep").set("damaged", 4, testkit::pattern(4));
+        const Scene scene(layout, [](testkit::LaidHive& hive) {
+            hive.put16(hive.at("Alpha").values.at(0).record, 0, 0x7878);
+            hive.put16(hive.at("Alpha\\Deep").values.at(0).record, 0, 0x7878);
+        });
+        Stage stage(scene);
+        for (const QString& shown : {alpha + QStringLiteral("\\Deep"), alpha}) {
+            DialogHand hand;
+            hand.then_press(QMessageBox::Ok);
+            stage.select_key(shown);
+            QTRY_VERIFY(hand.is_done());
+            QCOMPARE(hand.text, told(shown, "index"));
+            QVERIFY(hand.nothing_comes());
+        }
+    }
+
+    // Its row says nothing of itself, and it was the user who went there.
+    void a_damaged_value_is_told_however_many_siblings_have_one() {
+        constexpr int siblings = 12;
+        testkit::HiveLayout layout;
+        for (int i = 0; i < siblings; ++i) {
+            layout.root.add("Key" + std::to_string(i)).set("damaged", 4, testkit::pattern(4));
+        }
+        const Scene scene(layout, [](testkit::LaidHive& hive) {
+            for (int i = 0; i < siblings; ++i) {
+                hive.put16(hive.at("Key" + std::to_string(i)).values.at(0).record, 0, 0x7878);
+            }
+        });
+        Stage stage(scene);
+        for (int i = 0; i < siblings; ++i) {
+            const QString shown = system_path + QStringLiteral("\\Key%1").arg(i);
+            DialogHand hand;
+            hand.then_press(QMessageBox::Ok);
+            stage.select_key(shown);
+            QTRY_VERIFY(hand.is_done());
+            QCOMPARE(hand.text, told(shown, "index"));
+        }
+    }
+
+    // Its row was shown when it could not be read, and stands for no key.
+    void a_deletion_that_meets_a_failure_is_answered_each_time() {
+        Scene scene(large());
+        const QByteArray sound = scene.bytes();
+        scene.damage_key("Alpha\\Deep");
+        Stage stage(scene);
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        stage.select_key(alpha);
+        stage.keys->expand(stage.key(alpha));
+        QTRY_VERIFY(hand.is_done());
+        put_back(scene, sound);
+        forget_everything(stage);
+        stage.keys->setCurrentIndex(stage.model->index(0, 0, stage.key(alpha)));
+        for (int i = 0; i < 2; ++i) {
+            stage.return_to(*stage.keys);
+            hand.then_press(QMessageBox::Yes).then_press(QMessageBox::Ok);
+            shared_actions().delete_action->trigger();
+            QVERIFY(hand.is_done());
+            QCOMPARE(hand.text, told(alpha + QStringLiteral("\\#0"), "ROpenSubKey failed"));
+        }
+        QVERIFY(hand.nothing_comes());
+        QCOMPARE(scene.bytes(), sound);
+    }
+};
+
+UI_TEST_MAIN(LostKeyTest)
+#include "lost_key_test.moc"
