@@ -155,4 +155,50 @@ def searching(scratch):
         session.unchanged("searching")
 
 
-run(browsing, painting, searching)
+def losing(scratch):
+    """A key that cannot be read any more while its values are shown: the table is emptied, and Refresh asks again"""
+    path = make_sample(os.path.join(scratch, "SYSTEM"), extra_keys=MANY)
+    with open(path, "rb") as file:
+        content = file.read()
+    signature = record_of(content, b"Setup")
+
+    def put(data):
+        with open(path, "r+b") as file:
+            file.seek(signature)
+            file.write(data)
+
+    with Session(path) as session:
+        program = session.program
+        group = ["Many", f"Group {FIRST_NUMBER}"]
+        session.open_key(group)
+        program.keys("Right")
+        session.cell(group + [f"Key {FIRST_NUMBER}"])
+        program.keys("End")
+        session.selected(["Setup"])
+        names = session.names()
+        program.click(session.value_cell("SetupType"))
+        # The tree's own row for the key is out of sight.
+        program.scroll_to(session.tree, session.cell(group))
+        put(b"xx")
+        # More names are asked for than handles are kept, as by turning the wheel.
+        session.cell(group + [f"Key {FIRST_NUMBER + MANY - 1}"])
+        program.keys("Down")
+        box = program.dialog(TITLE)
+        line = "The key \"{}\" cannot be read: ROpenSubKey failed".format("\\".join(session.root + ["Setup"]))
+        equal(program.labels(box)[0], line, "what the box says")
+        # The window gets the keyboard back, and its table with it.
+        program.click(program.button(box, "OK"))
+        program.gone(box)
+        until(lambda: session.rows() == [], "an empty table")
+        equal(program.open_titles(), [TITLE], "windows after the table was emptied")
+        session.picture("lost-key", session.main)
+        put(b"nk")
+        # So that the editor goes to the file for it once more.
+        session.cell(group + [f"Key {FIRST_NUMBER + MANY - 1}"])
+        program.keys("F5")
+        until(lambda: session.names() == names, "the values after Refresh")
+        session.leave()
+        session.unchanged("a key that was lost for a while")
+
+
+run(browsing, painting, searching, losing)
