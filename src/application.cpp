@@ -4,6 +4,7 @@
 
 #include "failure_report.h"
 #include "keys_view.h"
+#include "values_view.h"
 
 #include <QDebug>
 #include <QFile>
@@ -51,6 +52,13 @@ QByteArray& file_being_opened() {
     std::abort();
 }
 
+bool is_in_values_table(const QObject* part) {
+    while (part && !qobject_cast<const ValuesView*>(part)) {
+        part = part->parent();
+    }
+    return part != nullptr;
+}
+
 }  // namespace
 
 Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
@@ -66,6 +74,7 @@ Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
 bool Application::notify(QObject* receiver, QEvent* event) {
     // Asked first: afterwards the receiver may be gone.
     const bool is_gesture = receiver->isWidgetType() || event->type() == QEvent::Shortcut;
+    const bool is_in_table = is_in_values_table(receiver);
     try {
         // Here, since the toolkit moves the keyboard, which ends a naming, before any filter sees the press.
         if (event->type() == QEvent::MouseButtonPress && receiver->isWidgetType()) {
@@ -77,7 +86,12 @@ bool Application::notify(QObject* receiver, QEvent* event) {
         }
         return QApplication::notify(receiver, event);
     } catch (const std::exception& failure) {
-        FailureReport::instance().report_at_current(failure, is_gesture);
+        FailureReport& report = FailureReport::instance();
+        if (is_in_table) {
+            report.report_at_shown(failure);
+        } else {
+            report.report_at_current(failure, is_gesture);
+        }
         return true;
     }
 }

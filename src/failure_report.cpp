@@ -67,6 +67,10 @@ void FailureReport::report_at_current(const std::exception& failure, bool from_g
 
 void FailureReport::report_at_shown(const std::exception& failure) { report(shown_key_, failure); }
 
+void FailureReport::forget(const QString& key_path) {
+    told_.removeIf([&](const QPair<QString, QString>& told) { return told.first == key_path; });
+}
+
 bool FailureReport::is_told_below(const QString& key_path, const QString& reason) const {
     return std::any_of(told_.cbegin(), told_.cend(), [&](const QPair<QString, QString>& told) {
         return told.second == reason && told.first.startsWith(key_path);

@@ -43,9 +43,11 @@ public:
     // The line for a key that the caller tells about itself, in a box of its own; it is not told here again.
     QString told_elsewhere(const QString& key_path, const QString& reason);
 
+    // What a key throws from here on is told again.
+    void forget(const QString& key_path);
+
     // The key that the user's last gesture was about.
     void set_current_key(const QString& key_path) { current_key_ = key_path; }
-    void set_current_key_to_shown() { current_key_ = shown_key_; }
     // The key whose values are shown; the gesture that showed them was about it.
     void set_shown_key(const QString& key_path) { current_key_ = shown_key_ = key_path; }
     QString shown_key() const { return shown_key_; }

@@ -138,8 +138,10 @@ void KeysView::run_rename_key_action(bool /*checked*/) {
     if (!current.isValid()) {
         return;
     }
-    setCurrentIndex(current);
-    edit(current);
+    meet_failures(this, key_path_of(current), [&] {
+        setCurrentIndex(current);
+        edit(current);
+    });
 }
 
 // The tree's own asks every shown key for its name, and ends at the first that cannot be read.
@@ -221,6 +223,9 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
     case Qt::Key_Minus:
         collapse(currentIndex());
         break;
+    case Qt::Key_F2:
+        meet_failures(this, key_path_of(currentIndex()), [&] { QTreeView::keyPressEvent(event); });
+        return;
     default:
         QTreeView::keyPressEvent(event);
         return;

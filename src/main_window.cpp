@@ -207,14 +207,17 @@ void MainWindow::show_values_of(const QModelIndex& key) {
     }
 }
 
-// The same for a key that could be read when it was shown; one whose reads fail now and then is kept.
+// The same for a key that could be read when it was shown; one whose reads fail now and then is kept. Should it be
+// shown and lost once more, that is told once more.
 void MainWindow::let_go_of_lost_key() {
     try {
         values_proxy->rowCount();
         values_table->viewport()->update();
+        values_table->horizontalHeader()->viewport()->update();
     } catch (const std::exception&) {
         close_editors(*values_table);
         set_values_source(nullptr);
+        FailureReport::instance().forget(FailureReport::instance().shown_key());
         shared_actions().new_action_group->setEnabled(false);
         set_key_actions(keys_tree->currentIndex());
     }
@@ -262,7 +265,8 @@ void MainWindow::refresh_views() {
         return;
     }
     if (!values_proxy->has_key() && keys_tree->currentIndex().isValid()) {
-        // The key was let go of; it is asked again.
+        // The key was let go of. It is asked again, and what it throws is told again.
+        FailureReport::instance().forget(key_path_of(keys_tree->currentIndex()));
         reload_values(keys_tree->currentIndex());
         return;
     }

@@ -125,6 +125,10 @@ void MainWindow::show_hit(const RegModel::FindResult& hit) {
         keys_tree->setExpanded(step, true);
     }
     keys_tree->setCurrentIndex(key);
+    if (!values_proxy->has_key()) {
+        // Where the key was current already, and had been let go of.
+        reload_values(key);
+    }
     if (hit.value_row >= 0) {
         // The row is one of the sorted table, which a value added or renamed since has left unsorted.
         values_proxy->sort(0, Qt::AscendingOrder);

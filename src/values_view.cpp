@@ -155,7 +155,6 @@ bool ValuesView::edit_qword(const QString& value_name, quint64 number, const QPe
 }
 
 void ValuesView::keyPressEvent(QKeyEvent* event) {
-    FailureReport::instance().set_current_key_to_shown();
     if (event->key() == Qt::Key_Return && state() != QAbstractItemView::EditingState) {
         value_double_clicked(currentIndex());
     } else if (event->matches(QKeySequence::Copy) && currentIndex().isValid()) {
@@ -163,6 +162,8 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
         event->accept();
         meet_failures(this, FailureReport::instance().shown_key(),
                       [this] { QApplication::clipboard()->setText(shown_text(currentIndex())); });
+    } else if (event->key() == Qt::Key_F2) {
+        meet_failures(this, FailureReport::instance().shown_key(), [&] { QTableView::keyPressEvent(event); });
     } else {
         QTableView::keyPressEvent(event);
     }
@@ -280,8 +281,10 @@ void ValuesView::run_rename_value_action(bool /*checked*/) {
     if (!current.isValid()) {
         return;
     }
-    setCurrentIndex(current);
-    edit(current);
+    meet_failures(this, FailureReport::instance().shown_key(), [&] {
+        setCurrentIndex(current);
+        edit(current);
+    });
 }
 
 // Asked before a paint, which asks for rows and flags where an exception would leave its painter open.
@@ -328,9 +331,6 @@ QString ValuesView::cut_text(const QModelIndex& index) const {
 
 bool ValuesView::viewportEvent(QEvent* event) {
     if (event->type() != QEvent::ToolTip) {
-        if (event->type() == QEvent::MouseButtonPress || event->type() == QEvent::ContextMenu) {
-            FailureReport::instance().set_current_key_to_shown();
-        }
         return QTableView::viewportEvent(event);
     }
     const auto* help = static_cast<QHelpEvent*>(event);

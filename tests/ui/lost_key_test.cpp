@@ -10,8 +10,10 @@
 
 #include <QActionGroup>
 #include <QApplication>
+#include <QCheckBox>
 #include <QFile>
 #include <QHeaderView>
+#include <QLineEdit>
 #include <QRegularExpression>
 #include <QTest>
 
@@ -19,6 +21,7 @@ namespace {
 
 const QString system_path = QStringLiteral("MACHINE\\SYSTEM");
 const QString alpha = system_path + QStringLiteral("\\Alpha");
+const QString row_of_alpha = system_path + QStringLiteral("\\#0");  // where its name cannot be read
 const QString beta = system_path + QStringLiteral("\\Beta");
 
 QString told(const QString& key, const char* reason) {
@@ -58,8 +61,7 @@ void forget_everything(const Stage& stage) {
 
 // The key cannot be read any more. What its row in the tree throws has been told.
 void lose_alpha(const Stage& stage, Scene& scene) {
-    FailureReport::instance().told_elsewhere(system_path + QStringLiteral("\\#0"),
-                                             QStringLiteral("ROpenSubKey failed"));
+    FailureReport::instance().told_elsewhere(row_of_alpha, QStringLiteral("ROpenSubKey failed"));
     scene.damage_key("Alpha");
     forget_everything(stage);
 }
@@ -88,6 +90,8 @@ private slots:
         QVERIFY(shared_actions().rename_action->isEnabled());
         lose_alpha(stage, scene);
         stage.keys->setFocus();
+        // A branch was opened last.
+        FailureReport::instance().set_current_key(beta);
         DialogHand hand;
         hand.then_press(QMessageBox::Ok);
         stage.values->setFocus();
@@ -99,6 +103,15 @@ private slots:
         QVERIFY(!shared_actions().delete_action->isEnabled());
         QVERIFY(hand.nothing_comes());
 
+        // Asked again, it answers again.
+        for (int i = 0; i < 2; ++i) {
+            stage.return_to(*stage.keys);
+            hand.then_press(QMessageBox::Ok);
+            QTest::keySequence(&stage.window, QKeySequence(QKeySequence::Refresh));
+            QTRY_VERIFY(hand.is_done());
+            QCOMPARE(hand.text, told(row_of_alpha, "ROpenSubKey failed"));
+            QVERIFY(hand.nothing_comes());
+        }
         put_back(scene, sound);
         forget_everything(stage);
         stage.return_to(*stage.keys);
@@ -107,6 +120,39 @@ private slots:
                  QStringList({QStringLiteral("(Default)"), QStringLiteral("number"), QStringLiteral("text")}));
         QVERIFY(shared_actions().new_action_group->isEnabled());
         QCOMPARE(scene.bytes(), sound);
+
+        // And lost once more, it is told once more.
+        lose_alpha(stage, scene);
+        hand.then_press(QMessageBox::Ok);
+        stage.values->viewport()->repaint();
+        QTRY_VERIFY(hand.is_done());
+        QCOMPARE(hand.text, told(alpha, "ROpenSubKey failed"));
+        QTRY_COMPARE(stage.values->model()->rowCount(), 0);
+    }
+
+    void a_hit_in_a_key_that_was_let_go_of_is_shown() {
+        Scene scene(large());
+        const QByteArray sound = scene.bytes();
+        Stage stage(scene);
+        stage.select_key(alpha);
+        lose_alpha(stage, scene);
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        stage.values->viewport()->repaint();
+        QTRY_VERIFY(hand.is_done());
+        QTRY_COMPARE(stage.values->model()->rowCount(), 0);
+        put_back(scene, sound);
+        forget_everything(stage);
+        hand.then([](QWidget* dialog) {
+            dialog->findChild<QLineEdit*>()->setText(QStringLiteral("text"));
+            find_by_text<QCheckBox>(*dialog, QStringLiteral("Find values"))->setChecked(true);
+            press(*dialog, QDialogButtonBox::Ok);
+        });
+        stage.window.show_find_dialog();
+        QVERIFY(hand.is_done());
+        QCOMPARE(stage.status(), alpha);
+        QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("text")));
+        QVERIFY(stage.values->currentIndex().isValid());
     }
 
     void nothing_is_painted_of_a_table_whose_key_is_lost() {
@@ -226,6 +272,38 @@ private slots:
             QTRY_VERIFY(hand.is_done());
             QCOMPARE(hand.text, told(shown, "index"));
         }
+    }
+
+    void a_rename_of_what_cannot_be_read_is_answered_each_time_data() {
+        QTest::addColumn<bool>("by_key");
+        QTest::newRow("menu") << false;
+        QTest::newRow("F2") << true;
+    }
+
+    void a_rename_of_what_cannot_be_read_is_answered_each_time() {
+        QFETCH(bool, by_key);
+        Scene scene(large());
+        scene.damage_key("Alpha\\Deep");
+        Stage stage(scene);
+        DialogHand hand;
+        hand.then_press(QMessageBox::Ok);
+        stage.select_key(alpha);
+        stage.keys->expand(stage.key(alpha));
+        QTRY_VERIFY(hand.is_done());
+        stage.keys->setCurrentIndex(stage.model->index(0, 0, stage.key(alpha)));
+        for (int i = 0; i < 2; ++i) {
+            stage.return_to(*stage.keys);
+            hand.text.clear();
+            hand.then_press(QMessageBox::Ok);
+            if (by_key) {
+                QTest::keyClick(stage.keys, Qt::Key_F2);
+            } else {
+                shared_actions().rename_action->trigger();
+            }
+            QVERIFY(hand.is_done());
+            QCOMPARE(hand.text, told(alpha + QStringLiteral("\\#0"), "ROpenSubKey failed"));
+        }
+        QVERIFY(hand.nothing_comes());
     }
 
     // Its row was shown when it could not be read, and stands for no key.
