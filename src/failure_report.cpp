@@ -104,6 +104,11 @@ void meet_failures(QWidget* parent, const QString& key_path, const std::function
     }
 }
 
+void ask_for_name(const QModelIndex& index) {
+    [[maybe_unused]] const QVariant name = index.data(Qt::EditRole);
+    [[maybe_unused]] const Qt::ItemFlags flags = index.flags();
+}
+
 QString key_path_of(const QModelIndex& index) {
     QStringList names;
     QModelIndex step = index;

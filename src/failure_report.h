@@ -73,6 +73,10 @@ void tell_failure(QWidget* parent, const QString& text);
 // for something that does not come.
 void meet_failures(QWidget* parent, const QString& key_path, const std::function<void()>& gesture);
 
+// Reads what an editor in place at `index` will ask for. What cannot be read throws here, and not from inside the
+// toolkit, whose editing loses memory when an exception passes it.
+void ask_for_name(const QModelIndex& index);
+
 // The names from the outermost key down to `index`, joined with backslashes. For a name that cannot be read
 // stands the key's place among its siblings, as in "TOP\HIVE\#3": this never throws.
 QString key_path_of(const QModelIndex& index);

@@ -139,6 +139,7 @@ void KeysView::run_rename_key_action(bool /*checked*/) {
         return;
     }
     meet_failures(this, key_path_of(current), [&] {
+        ask_for_name(current);
         setCurrentIndex(current);
         edit(current);
     });
@@ -224,7 +225,10 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
         collapse(currentIndex());
         break;
     case Qt::Key_F2:
-        meet_failures(this, key_path_of(currentIndex()), [&] { QTreeView::keyPressEvent(event); });
+        meet_failures(this, key_path_of(currentIndex()), [&] {
+            ask_for_name(currentIndex());
+            QTreeView::keyPressEvent(event);
+        });
         return;
     default:
         QTreeView::keyPressEvent(event);

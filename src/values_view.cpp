@@ -163,7 +163,10 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
         meet_failures(this, FailureReport::instance().shown_key(),
                       [this] { QApplication::clipboard()->setText(shown_text(currentIndex())); });
     } else if (event->key() == Qt::Key_F2) {
-        meet_failures(this, FailureReport::instance().shown_key(), [&] { QTableView::keyPressEvent(event); });
+        meet_failures(this, FailureReport::instance().shown_key(), [&] {
+            ask_for_name(currentIndex());
+            QTableView::keyPressEvent(event);
+        });
     } else {
         QTableView::keyPressEvent(event);
     }
@@ -282,6 +285,7 @@ void ValuesView::run_rename_value_action(bool /*checked*/) {
         return;
     }
     meet_failures(this, FailureReport::instance().shown_key(), [&] {
+        ask_for_name(current);
         setCurrentIndex(current);
         edit(current);
     });
