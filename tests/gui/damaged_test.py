@@ -11,6 +11,7 @@ KEY_RECORD = 76  # bytes before the name
 VALUE_COUNT, VALUE_LIST = 36, 40  # fields of it
 NOWHERE = (0x7FFFFFF0).to_bytes(4, "little")
 MANY = 400
+SOME = 150  # more than the program keeps handles
 FIRST_NUMBER = 1000000
 
 
@@ -157,7 +158,7 @@ def searching(scratch):
 
 def losing(scratch):
     """A key that cannot be read any more while its values are shown: the table is emptied, and Refresh asks again"""
-    path = make_sample(os.path.join(scratch, "SYSTEM"), extra_keys=MANY)
+    path = make_sample(os.path.join(scratch, "SYSTEM"), extra_keys=SOME)
     with open(path, "rb") as file:
         content = file.read()
     signature = record_of(content, b"Setup")
@@ -181,7 +182,7 @@ def losing(scratch):
         program.scroll_to(session.tree, session.cell(group))
         put(b"xx")
         # More names are asked for than handles are kept, as by turning the wheel.
-        session.cell(group + [f"Key {FIRST_NUMBER + MANY - 1}"])
+        session.cell(group + [f"Key {FIRST_NUMBER + SOME - 1}"])
         program.keys("Down")
         box = program.dialog(TITLE)
         line = "The key \"{}\" cannot be read: ROpenSubKey failed".format("\\".join(session.root + ["Setup"]))
@@ -194,7 +195,7 @@ def losing(scratch):
         session.picture("lost-key", session.main)
         put(b"nk")
         # So that the editor goes to the file for it once more.
-        session.cell(group + [f"Key {FIRST_NUMBER + MANY - 1}"])
+        session.cell(group + [f"Key {FIRST_NUMBER + SOME - 1}"])
         program.keys("F5")
         until(lambda: session.names() == names, "the values after Refresh")
         session.leave()
