@@ -384,9 +384,11 @@ TEST_F(Changing, two_hundred_values_grow_the_list) {
 TEST_F(Changing, text_of_an_A_call_is_widened_and_other_data_is_not) {
     Handle key = scene.OpenKey("Empty");
     EXPECT_EQ(RSetValueExA(key.get(), "text", 1, "ab", 3), 0);
+    EXPECT_EQ(RSetValueExA(key.get(), "open", 1, "ab", 2), 0);  // without the zero that ends it
     EXPECT_EQ(RSetValueExA(key.get(), "multi", 7, "ab\0c\0", 5), 0);
     EXPECT_EQ(RSetValueExA(key.get(), "raw", 3, "abcdef", 6), 0);
     EXPECT_EQ(data("Empty", "text"), text_data("ab"));
+    EXPECT_EQ(data("Empty", "open"), (Bytes{'a', 0, 'b', 0}));
     EXPECT_EQ(data("Empty", "multi"), (Bytes{'a', 0, 'b', 0, 0, 0, 'c', 0, 0, 0, 0, 0}));
     EXPECT_EQ(data("Empty", "raw"), (Bytes{'a', 'b', 'c', 'd', 'e', 'f'}));
     EXPECT_EQ(scene.Check(), "");
