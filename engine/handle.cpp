@@ -51,9 +51,9 @@ KeyInfo* copy_key(Store& store, const KeyView& key, bool& damaged) {
     return info;
 }
 
-// Reads what the key's record says of its values. The first offsets come along, while the window is there.
-void take_values(RegistryKey& handle, Store& store, const KeyRecord& record) {
-    const uint32_t failed = store.failed_reads;
+// Reads what the key's record says of its values. The first offsets come along, while the window is there. failed: the
+// store's failed reads before the record was read.
+void take_values(RegistryKey& handle, Store& store, const KeyRecord& record, uint32_t failed) {
     handle.values = find_value_list(store, record);
     // What the device has failed to deliver is asked for again.
     handle.values_generation = store.failed_reads == failed ? store.generation : store.generation - 1;
@@ -63,9 +63,8 @@ void take_values(RegistryKey& handle, Store& store, const KeyRecord& record) {
 }
 
 // The same of its subkeys. false when memory ran out.
-bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record) {
+bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record, uint32_t failed) {
     handle.subkeys.count = 0;
-    const uint32_t failed = store.failed_reads;
     if (!load_key_index(store, record, handle.index))
         return false;
     if (store.failed_reads != failed)
@@ -76,13 +75,13 @@ bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record) {
 }
 
 // The counts that the handle knows, over the lists as they lie now: a list that was moved through another handle has
-// left its cell to whatever came next.
+// left its cell to whatever came next. Where the record cannot be read, they lie nowhere.
 KeyRecord snapshot(RegistryKey& handle) {
     KeyRecord record = {};
     record.subkey_count = handle.info->subkey_count;
-    record.subkey_index = raw(handle.info->subkey_index);
+    record.subkey_index = raw(CellOffset::none);
     record.value_count = handle.info->value_count;
-    record.value_list = raw(handle.info->value_list);
+    record.value_list = raw(CellOffset::none);
     KeyView key;
     if (read_key(*handle.store, handle.info->own, key)) {
         record.subkey_index = key.record.subkey_index;
@@ -113,9 +112,9 @@ int32_t fill_handle(RegistryKey& handle, Store& store, CellOffset offset, uint32
     handle.info = copy_key(store, key, damaged);
     if (handle.info == nullptr)
         return damaged ? R_FAILED : R_NOT_ENOUGH_MEMORY;
-    const bool indexed = take_index(handle, store, key.record);
+    const bool indexed = take_index(handle, store, key.record, failed);
     if (indexed)
-        take_values(handle, store, key.record);
+        take_values(handle, store, key.record, failed);
     // Lists that the device did not deliver would pass for empty ones.
     if (!indexed || store.failed_reads != failed) {
         free_index(handle.index);
@@ -155,12 +154,14 @@ bool current_index(RegistryKey& handle) {
     if (handle.index.generation == handle.store->generation)
         return true;
     free_index(handle.index);
-    return take_index(handle, *handle.store, snapshot(handle));
+    const uint32_t failed = handle.store->failed_reads;
+    return take_index(handle, *handle.store, snapshot(handle), failed);
 }
 
 ValueList& current_values(RegistryKey& handle) {
     if (handle.values_generation != handle.store->generation) {
-        take_values(handle, *handle.store, snapshot(handle));
+        const uint32_t failed = handle.store->failed_reads;
+        take_values(handle, *handle.store, snapshot(handle), failed);
     }
     return handle.values;
 }
@@ -191,9 +192,7 @@ void take_counts(RegistryKey& handle, const KeyRecord& record) {
     KeyInfo& info = *handle.info;
     const uint32_t listed = record.subkey_count < handle.index.total ? record.subkey_count : handle.index.total;
     info.subkey_count = handle.depth < depth_limit ? listed : 0;
-    info.subkey_index = cell_offset(record.subkey_index);
     info.value_count = handle.values.count;
-    info.value_list = cell_offset(record.value_list);
     info.longest_subkey = record.longest_subkey;
     info.longest_value = record.longest_value;
     info.largest_data = record.largest_data;
@@ -206,9 +205,9 @@ bool reread_counts(RegistryKey& handle) {
     if (!read_key(*handle.store, handle.info->own, key))
         return false;
     free_index(handle.index);
-    if (!take_index(handle, *handle.store, key.record))
+    if (!take_index(handle, *handle.store, key.record, failed))
         return false;
-    take_values(handle, *handle.store, key.record);
+    take_values(handle, *handle.store, key.record, failed);
     if (handle.store->failed_reads != failed)
         return false;
     take_counts(handle, key.record);

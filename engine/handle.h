@@ -17,9 +17,7 @@ struct KeyInfo {
     CellOffset parent;
     CellOffset own;
     uint32_t subkey_count;  // cut to what the index can hold
-    CellOffset subkey_index;
-    uint32_t value_count;  // cut to what the list can hold
-    CellOffset value_list;
+    uint32_t value_count;   // cut to what the list can hold
     CellOffset security;
     uint32_t longest_subkey;  // bytes, as the other lengths
     uint32_t longest_class;

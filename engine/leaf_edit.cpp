@@ -3,6 +3,7 @@
 #include "leaf_edit.h"
 
 #include "allocator.h"
+#include "kinship.h"
 
 #include <cassert>
 #include <cstring>
@@ -65,6 +66,18 @@ uint32_t leaf_for_new(const SubkeyIndex& index, uint32_t position) {
     const uint32_t holding = leaf_holding(index, position);
     const bool at_border = position == index.leaf(holding).first && holding > 0;
     return at_border && index.leaf(holding).count >= leaf_limit ? holding - 1 : holding;
+}
+
+// Whether a leaf stands in the index twice, or is another key's, which its first entry says.
+bool is_shared(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t number) {
+    const Leaf& leaf = index.leaf(number);
+    for (uint32_t i = 0; i < index.leaf_count; i++) {
+        if (i != number && index.leaf(i).cell.offset == leaf.cell.offset)
+            return true;
+    }
+    KeyView first;
+    return leaf.count > 0 && read_key(store, subkey_at(store, index, leaf.first), first) &&
+           has_other_parent(store, parent, first);
 }
 
 // A longer copy of a leaf, with half as many entries again to spare so that it is not moved for each; none on failure.
@@ -250,7 +263,7 @@ bool take_back_key(Store& store, CellOffset root, CellOffset key) {
 
 Outcome move_between(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
                      uint32_t position, uint32_t place, CellOffset key, const Name& name) {
-    if (!can_grow(index, place))
+    if (!can_grow(store, parent_offset, index, place))
         return Outcome::unchanged;
     const uint32_t number = leaf_for_new(index, place);
     const Leaf& target = index.leaf(number);
@@ -280,12 +293,15 @@ void free_leaf(Store& store, CellOffset leaf) {
         free_cell(store, leaf);
 }
 
-bool can_grow(const SubkeyIndex& index, uint32_t position) {
-    return index.leaf_count == 0 || index.leaf(leaf_for_new(index, position)).count < leaf_limit;
+bool can_grow(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position) {
+    if (index.leaf_count == 0)
+        return true;
+    const uint32_t number = leaf_for_new(index, position);
+    return index.leaf(number).count < leaf_limit && !is_shared(store, parent, index, number);
 }
 
-bool can_move(const SubkeyIndex& index, uint32_t position, uint32_t place) {
-    return stays_in_leaf(index, position, place) || can_grow(index, place);
+bool can_move(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position, uint32_t place) {
+    return stays_in_leaf(index, position, place) || can_grow(store, parent, index, place);
 }
 
 Outcome add_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,

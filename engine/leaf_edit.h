@@ -15,11 +15,13 @@ namespace engine {
 // without it the hive would not open again.
 void free_leaf(Store& store, CellOffset leaf);
 
-// Whether the leaf that a new entry at this position would go to has room in its count.
-bool can_grow(const SubkeyIndex& index, uint32_t position);
+// Whether a new entry at this position, in the index of the key at parent, has a leaf to go to: there is room in its
+// count, and nothing else leads to it. In a damaged hive the index may lead to a leaf twice, or to another key's,
+// whose subkeys would go when the leaf is moved.
+bool can_grow(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position);
 
-// Whether move_entry has room for the entry at a position in the leaf of its new place.
-bool can_move(const SubkeyIndex& index, uint32_t position, uint32_t place);
+// Whether move_entry can put the entry at a position into the leaf of its new place.
+bool can_move(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position, uint32_t place);
 
 // Puts in an entry for a key that is complete; parent follows what the file holds. In turn:
 //   the leaf has room: the parent's count, the leaf;

@@ -66,7 +66,7 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
     // Where a sibling cannot be read, the name may be there already.
     if (!index.whole || index.total != parent.record.subkey_count || lookup == Lookup::unreadable ||
         is_anothers(store, parent, index) || !place_for_name(store, index, name, position) ||
-        !can_grow(index, position))
+        !can_grow(store, parent.offset(), index, position))
         return Inserted::failed;
 
     const CellOffset security = cell_offset(parent.record.security);
@@ -120,7 +120,7 @@ Outcome switch_records(Store& store, KeyView& parent, const SubkeyIndex& index, 
 int32_t rename_record(Store& store, KeyView& parent, const SubkeyIndex& index, uint32_t position,
                       const SubkeyIndex& children, const KeyView& old, const Name& name) {
     uint32_t place = 0;
-    if (!place_for_name(store, index, name, place) || !can_move(index, position, place))
+    if (!place_for_name(store, index, name, place) || !can_move(store, parent.offset(), index, position, place))
         return R_FAILED;
     KeyRecord record = old.record;
     record.flags = static_cast<uint16_t>(record.flags | key_name_8bit);

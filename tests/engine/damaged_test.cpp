@@ -147,6 +147,48 @@ TEST(Damaged, no_key_is_made_in_a_list_that_is_another_ones) {
     EXPECT_EQ(scene.Create("Alpha\\New"), 0);
 }
 
+// A key whose index root leads to three leaves of two.
+LaidHive rooted_beside_alpha() {
+    HiveLayout layout = tree();
+    KeyLayout& rooted = layout.root.add("Rooted");
+    rooted.per_leaf = 2;
+    for (const char* name : {"a1", "a2", "m1", "m2", "z1", "z2"})
+        rooted.add(name);
+    return lay_out(layout);
+}
+
+// The leaf would be moved to a longer cell, and its old one be freed under the other key.
+TEST(Damaged, no_key_is_put_into_a_leaf_of_an_index_root_that_is_another_keys) {
+    LaidHive hive = rooted_beside_alpha();
+    hive.put32(hive.at("Rooted").index, 8, hive.at("Alpha").index);
+    {
+        Scene scene(hive.bytes);
+        EXPECT_EQ(scene.Create("Rooted\\Jay"), R_INVALID_PARAMETER);
+        EXPECT_EQ(scene.Rename("Rooted\\a1", "Jay"), R_FAILED);
+        EXPECT_EQ(scene.Rename("Rooted\\z2", "Jay"), R_FAILED);
+        EXPECT_TRUE(scene.Untouched());
+    }
+    Scene scene(hive.bytes);
+    const Handle rooted = scene.OpenKey("Rooted");
+    EXPECT_EQ(scene.Create("Rooted\\a15"), 0);  // the leaf ahead is the key's own
+    EXPECT_EQ(scene.Rename("Rooted\\z2", "z3"), 0);
+    EXPECT_EQ(subkey_names(scene.OpenKey("Alpha").get()), (std::vector<std::string>{"Inner", "Other"}));
+}
+
+// The leaf would be moved for the root's one entry, and the other lead to a free cell, where the list ends.
+TEST(Damaged, no_key_is_put_into_a_leaf_that_an_index_root_has_twice) {
+    LaidHive hive = rooted_beside_alpha();
+    const KeyPlaces& rooted = hive.at("Rooted");
+    hive.put32(rooted.index, 8, rooted.leaves[0]);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Create("Rooted\\a"), R_INVALID_PARAMETER);
+    EXPECT_EQ(scene.Rename("Rooted\\z2", "a"), R_FAILED);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(scene.Create("Rooted\\zz"), 0);  // the last leaf stands there once
+    EXPECT_TRUE(scene.OpenKey("Rooted\\z1"));
+    EXPECT_TRUE(scene.OpenKey("Rooted\\zz"));
+}
+
 TEST(Damaged, a_key_made_in_the_list_of_the_root_leaves_the_root_its_list) {
     HiveLayout layout;
     layout.root.add("Loop");

@@ -423,6 +423,62 @@ TEST_F(Moving, an_old_handle_reads_its_own_keys_list_wherever_it_is_now) {
     }
 }
 
+// The record that says where the list is now cannot be read: the old cell, another key's by now, is not asked in its
+// place, and once reads succeed the list is the key's own.
+TEST_F(Moving, an_old_handle_takes_no_other_keys_lists_for_its_own_after_a_failed_read) {
+    HiveLayout layout;
+    KeyLayout& key = layout.root.add("Key");
+    for (const char* name : {"f", "m", "q"}) {
+        key.add(name);
+        key.set(name, 3, pattern(3));
+    }
+    KeyLayout& others = layout.root.add("Other");
+    others.add("a");
+    others.set("a", 3, pattern(3));
+    layout.no_free_space = true;
+    const LaidHive laid = lay_out(layout);
+    for (uint64_t nth = 1;; nth++) {
+        SCOPED_TRACE(nth);
+        Scene other(laid.bytes);
+        const Handle old = other.OpenKey("Key");
+        EXPECT_EQ(other.Set("Key", "n", 3, pattern(3)), 0);
+        EXPECT_EQ(other.Create("Key\\n"), 0);
+        for (const char* path : {"Other\\b", "Other\\c"})
+            EXPECT_EQ(other.Create(path), 0);
+        for (const char* name : {"b", "c"})
+            EXPECT_EQ(other.Set("Other", name, 3, pattern(3)), 0);
+        const uint32_t record = other.Read().find("Other")->offset;
+        ASSERT_EQ(get32(other.bytes(), LaidHive::position(record, 28)), laid.at("Key").index);
+        ASSERT_EQ(get32(other.bytes(), LaidHive::position(record, 40)), laid.at("Key").value_list);
+        EXPECT_EQ(other.Set("", "elsewhere", 3, pattern(40000)), 0);
+        std::vector<char> data(40000);
+        auto length = static_cast<uint32_t>(data.size());
+        EXPECT_EQ(RQueryValueExA(other.root(), "elsewhere", nullptr, data.data(), &length), 0);  // the window is there
+        other.file().arm({MemoryFile::Call::read, nth, false, false});
+        std::string answers;
+        for (const bool faulty : {true, false}) {
+            for (uint32_t i = 0; i < 3; i++) {
+                char name[100] = "?";
+                uint32_t size = sizeof name;
+                if (REnumKeyExA(old.get(), i, name, &size, nullptr, nullptr, nullptr) == 0)
+                    answers += name;
+                size = sizeof name;
+                if (REnumValueA(old.get(), i, name, &size, nullptr, nullptr, nullptr) == 0)
+                    answers += name;
+            }
+            if (faulty)
+                EXPECT_EQ(answers.find_first_of("abc"), std::string::npos) << answers;
+            else
+                EXPECT_EQ(answers, "ffmmnq") << nth;
+            answers.clear();
+        }
+        if (!other.file().failed()) {
+            EXPECT_GT(nth, 1U);
+            break;
+        }
+    }
+}
+
 TEST_F(Moving, a_link_without_subkeys_and_a_name_of_259_characters_can_be_deleted) {
     HiveLayout layout;
     KeyLayout& top = layout.root.add("Top");

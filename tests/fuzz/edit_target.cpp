@@ -30,12 +30,26 @@ std::string subkey_name(RegistryKey* key, uint32_t index) {
     return name;
 }
 
-void change(RegistryKey* key, Script& script) {
+std::string value_name(RegistryKey* key, uint32_t index) {
+    char name[300] = {};
+    uint32_t size = sizeof name - 1;
+    REnumValueA(key, index, name, &size, nullptr, nullptr, nullptr);
+    return name;
+}
+
+// A name of the script's own, or one that a value of the key has.
+std::string chosen_name(RegistryKey* key, uint8_t choice) {
     static const char* const names[] = {"a", "B", "New Key #1", "zz", "_", "m\\n", "control", ""};
+    constexpr uint8_t count = sizeof names / sizeof names[0];
+    return choice % (2 * count) < count ? names[choice % count] : value_name(key, choice / (2 * count));
+}
+
+void change(RegistryKey* key, Script& script) {
     static const uint32_t sizes[] = {0, 1, 4, 5, 16, 100, 4090, 17000};
     static const uint8_t data[17000] = {1, 2, 3};
     const uint8_t what = script.take();
-    const char* name = names[script.take() % 8];
+    const std::string chosen = chosen_name(key, script.take());
+    const char* const name = chosen.c_str();
     const uint8_t number = script.take();
     RegistryKey* made = nullptr;
     switch (what % 6) {

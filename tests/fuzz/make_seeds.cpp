@@ -60,5 +60,21 @@ int main(int argc, char** argv) {
     plain.root.children[0].leaf = Leaf::plain;
     fill(plain.root.children[0]).class_name = u"class";
     save(directory, "plain", plain);
+    HiveLayout secured;
+    secured.security_records = 3;
+    KeyLayout& parent = fill(secured.root.add("parent"));
+    for (size_t i = 0; i < parent.children.size(); i++)
+        parent.children[i].security = i % 3;
+    parent.set("wide", 3, pattern(20)).wide_name = true;
+    save(directory, "secured", secured);
+    // Roots over leaves of the other two kinds.
+    HiveLayout fast_rooted;
+    fast_rooted.leaf = Leaf::fast;
+    fill(fast_rooted.root.add("parent")).per_leaf = 2;
+    KeyLayout& plain_rooted = fill(fast_rooted.root.add("plain"));
+    plain_rooted.own_leaf = true;
+    plain_rooted.leaf = Leaf::plain;
+    plain_rooted.per_leaf = 3;
+    save(directory, "fast_rooted", fast_rooted);
     return 0;
 }
