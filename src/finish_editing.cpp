@@ -13,10 +13,11 @@ namespace {
 
 void close_editors_of(const QAbstractItemView& view) {
     QAbstractItemDelegate* delegate = view.itemDelegate();
-    // The views put nothing but editors into their viewports. One that is closed is hidden until it is deleted.
+    // The views put nothing but editors into their viewports, and tips, which are windows. An editor that is closed is
+    // hidden until it is deleted.
     for (QWidget* child : view.viewport()->findChildren<QWidget*>(QString(), Qt::FindDirectChildrenOnly)) {
         const QPointer<QWidget> editor = child;
-        if (!delegate || child->isHidden()) {
+        if (!delegate || child->isHidden() || child->isWindow()) {
             continue;
         }
         // By the delegate's signals, as when the editor loses the keyboard: it need not have it now.

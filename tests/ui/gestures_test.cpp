@@ -15,6 +15,7 @@
 #include <QHelpEvent>
 #include <QLineEdit>
 #include <QMouseEvent>
+#include <QRegularExpression>
 #include <QScrollBar>
 #include <QStyledItemDelegate>
 #include <QTest>
@@ -129,6 +130,23 @@ private slots:
         QCOMPARE(tip_of("short"), QString());
         const QString tip = tip_of("feeds");
         QVERIFY2(tip.contains(QStringLiteral("C:\\evil.exe")), qPrintable(tip));
+    }
+
+    // A tip that shows hangs below its view, as an editor does, and what leads away from the row closes editors.
+    void a_tip_is_taken_for_no_editor() {
+        testkit::HiveLayout layout;
+        layout.root.add("Run").set("long", 1, testkit::text_data(std::string(300, 'x')));
+        const Scene scene(layout);
+        Stage stage(scene);
+        stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Run"));
+        const QPoint point =
+            stage.values->visualRect(stage.value(QStringLiteral("long"), ValuesModel::DataColumn)).center();
+        QHelpEvent asked(QEvent::ToolTip, point, stage.values->viewport()->mapToGlobal(point));
+        QApplication::sendEvent(stage.values->viewport(), &asked);
+        QVERIFY(QToolTip::isVisible());
+        QTest::failOnWarning(QRegularExpression(QStringLiteral("editor")));
+        stage.select_key(QStringLiteral("MACHINE\\SYSTEM"));
+        QVERIFY(QToolTip::isVisible());
     }
 
     void a_press_beside_a_naming_that_moves_nothing_goes_on() {
