@@ -377,7 +377,7 @@ void SearchTest::cancelled_and_started_again_fifty_times() {
     for (int i = 0; i < 50; ++i) {
         hand.then(ask({QStringLiteral("not there"), true, true})).then_while_searching([&](QWidget* dialog) {
             model.entered.acquire();
-            // The window goes on painting, scrolling and expanding beside the worker.
+            // The window paints and expands while the worker is in the middle of a key.
             stage.keys->setExpanded(stage.key(alpha), i % 2 == 0);
             stage.window.repaint();
             escape(dialog);
