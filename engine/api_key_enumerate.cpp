@@ -15,9 +15,12 @@ int32_t give_class(Store& store, const KeyRecord& record, char* class_name, uint
     if (class_size == nullptr)
         return R_SUCCESS;
     const uint32_t length = record.class_length;
+    const uint32_t failed = store.failed_reads;
     Cell cell;
     const bool there = length > 0 && cell_offset(record.class_name) != CellOffset::none &&
                        find_used_cell(store, cell_offset(record.class_name), cell) && length <= cell.room();
+    if (store.failed_reads != failed)
+        return R_FAILED;
     if (class_name == nullptr || *class_size == 0) {
         *class_size = there ? length / 2 + 1 : 0;
         return R_SUCCESS;

@@ -14,12 +14,9 @@ uint32_t times_listed(Store& store, const SubkeyIndex& index, CellOffset key) {
     return times;
 }
 
-}  // namespace
-
-// A wrong parent in the record alone does no harm and is passed over: a rename that was cut short leaves some.
-bool has_other_parent(Store& store, CellOffset parent, const KeyView& key) {
-    if (key.offset() == store.root)
-        return true;
+// Whether the way up from a key by what its record and its parents' say leads to the root past the given parent, each
+// on it listing the one below.
+bool reaches_root_past(Store& store, CellOffset parent, const KeyView& key) {
     CellOffset below = key.offset();
     CellOffset above = cell_offset(key.record.parent);
     if (above == parent)
@@ -41,8 +38,18 @@ bool has_other_parent(Store& store, CellOffset parent, const KeyView& key) {
     return false;
 }
 
+}  // namespace
+
+// A wrong parent in the record alone does no harm and is passed over: a rename that was cut short leaves some.
+bool has_other_parent(Store& store, CellOffset parent, const KeyView& key) {
+    const uint32_t failed = store.failed_reads;
+    return key.offset() == store.root || reaches_root_past(store, parent, key) || store.failed_reads != failed;
+}
+
 bool belongs_elsewhere(Store& store, CellOffset parent, const SubkeyIndex& index, const KeyView& key) {
-    return times_listed(store, index, key.offset()) > 1 || has_other_parent(store, parent, key);
+    const uint32_t failed = store.failed_reads;
+    return times_listed(store, index, key.offset()) > 1 || store.failed_reads != failed ||
+           has_other_parent(store, parent, key);
 }
 
 }  // namespace engine

@@ -11,8 +11,8 @@ namespace engine {
 
 // Whether a key that is listed under parent has its place elsewhere too: it is the hive's root, it stands in the index
 // twice, or its own record names another parent that lists it, and that is reached from the root in the same way.
-// Taking such a key away here would take it from there as well. Also true where memory runs out; a parent whose record
-// cannot be read reaches no root.
+// Taking such a key away here would take it from there as well. Also true where memory runs out or the device fails a
+// read, since nobody knows then; a parent whose record is damaged reaches no root.
 bool belongs_elsewhere(Store& store, CellOffset parent, const SubkeyIndex& index, const KeyView& key);
 // The same, but a key that stands in the index twice passes: for a caller that looks at each entry anyway.
 bool has_other_parent(Store& store, CellOffset parent, const KeyView& key);

@@ -68,7 +68,7 @@ uint32_t leaf_for_new(const SubkeyIndex& index, uint32_t position) {
     return at_border && index.leaf(holding).count >= leaf_limit ? holding - 1 : holding;
 }
 
-// Whether a leaf stands in the index twice, or is another key's, which its first entry says.
+// Whether a leaf stands in the index twice, or may be another key's, which its first entry says.
 bool is_shared(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t number) {
     const Leaf& leaf = index.leaf(number);
     for (uint32_t i = 0; i < index.leaf_count; i++) {
@@ -76,8 +76,8 @@ bool is_shared(Store& store, CellOffset parent, const SubkeyIndex& index, uint32
             return true;
     }
     KeyView first;
-    return leaf.count > 0 && read_key(store, subkey_at(store, index, leaf.first), first) &&
-           has_other_parent(store, parent, first);
+    return leaf.count > 0 &&
+           (!read_key(store, subkey_at(store, index, leaf.first), first) || has_other_parent(store, parent, first));
 }
 
 // A longer copy of a leaf, with half as many entries again to spare so that it is not moved for each; none on failure.
@@ -281,8 +281,11 @@ Outcome move_between(Store& store, CellOffset parent_offset, KeyRecord& parent, 
         return outcome;
     const Outcome removed = removal.write(store);
     const bool undone = removed == Outcome::unchanged && take_back_key(store, index.cell.offset, key);
-    if (removed == Outcome::written || undone)
-        rewrite_key(store, parent_offset, parent, before);
+    // Tried again where it fails: with a count above its list the key takes no other subkey.
+    for (int attempt = 0; attempt < 2 && (removed == Outcome::written || undone); attempt++) {
+        if (rewrite_key(store, parent_offset, parent, before) == Outcome::written)
+            break;
+    }
     return removed == Outcome::unchanged && !undone ? Outcome::unknown : removed;
 }
 

@@ -145,18 +145,7 @@ bool is_key_record(Store& store, const Cell& cell) {
            (key.record.name_length > 0 || signature_at(store, cell_offset(key.record.parent)) == sig_key);
 }
 
-}  // namespace
-
-bool is_root_or_its_index(Store& store, CellOffset offset) {
-    KeyView root;
-    // Where the root cannot be read now, nobody knows.
-    return offset == store.root || !read_key(store, store.root, root) ||
-           offset == cell_offset(root.record.subkey_index);
-}
-
-bool is_record(Store& store, const Cell& cell) {
-    if (is_root_or_its_index(store, cell.offset))
-        return true;
+bool has_form_of_record(Store& store, const Cell& cell) {
     IndexHead head;
     if (!read_part(store, cell, 0, &head, sizeof head))
         return false;
@@ -172,6 +161,20 @@ bool is_record(Store& store, const Cell& cell) {
     default:
         return is_leaf_signature(head.signature) && is_index_record(store, cell, head);
     }
+}
+
+}  // namespace
+
+bool is_root_or_its_index(Store& store, CellOffset offset) {
+    KeyView root;
+    // Where the root cannot be read now, nobody knows.
+    return offset == store.root || !read_key(store, store.root, root) ||
+           offset == cell_offset(root.record.subkey_index);
+}
+
+bool is_record(Store& store, const Cell& cell) {
+    const uint32_t failed = store.failed_reads;
+    return is_root_or_its_index(store, cell.offset) || has_form_of_record(store, cell) || store.failed_reads != failed;
 }
 
 }  // namespace engine

@@ -67,7 +67,7 @@ bool is_root_or_its_index(Store& store, CellOffset offset);
 
 // Whether the cell holds a record, judged by its signature and one more trait. A record that is damaged in another one
 // still counts, and the root's two do however they look. Plain data can pass for a record by chance; what takes it for
-// another's then merely leaves it alone.
+// another's then merely leaves it alone. Also true where the device fails a read, since nobody knows then.
 bool is_record(Store& store, const Cell& cell);
 
 }  // namespace engine

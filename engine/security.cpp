@@ -16,35 +16,33 @@ bool rewrite_security(Store& store, CellOffset offset, const SecurityRecord& bef
     return rewrite_at(store, record_position(offset), &now, &before, sizeof now) == Outcome::written;
 }
 
-// Takes the record out of its ring. In turn: the next one's way back, the previous one's way forward. A stop between
-// the two leaves the record reachable from one side; no key refers to it any more.
+// Takes the record out of its ring. In turn: the next one's way back, the previous one's way forward; where the two are
+// one, both at once. A stop between the two leaves the record reachable from one side; no key refers to it any more.
 bool unlink(Store& store, CellOffset self, const SecurityRecord& record) {
     const CellOffset next = cell_offset(record.next);
     const CellOffset previous = cell_offset(record.previous);
     if (next == self || previous == self)
         return false;
-    SecurityRecord after;
-    SecurityRecord before;
+    SecurityRecord after = {};
+    SecurityRecord before = {};
     const bool has_next = static_cast<int32_t>(next) > 0;
     const bool has_previous = static_cast<int32_t>(previous) > 0;
     if ((has_next && (!read_security(store, next, after) || cell_offset(after.previous) != self)) ||
         (has_previous && (!read_security(store, previous, before) || cell_offset(before.next) != self)))
         return false;
-    if (has_next) {
-        const SecurityRecord unchanged = after;
-        after.previous = record.previous;
-        if (!rewrite_security(store, next, unchanged, after))
-            return false;
-    }
-    if (has_previous) {
-        if (!read_security(store, previous, before))  // the same record as the next one in a ring of two
-            return false;
-        const SecurityRecord unchanged = before;
-        before.next = record.next;
-        if (!rewrite_security(store, previous, unchanged, before))
-            return false;
-    }
-    return true;
+    SecurityRecord linked_after = after;
+    SecurityRecord linked_before = before;
+    linked_after.previous = record.previous;
+    linked_before.next = record.next;
+    if (has_next && next == previous)
+        linked_after.next = record.next;
+    if (has_next && !rewrite_security(store, next, after, linked_after))
+        return false;
+    if (!has_previous || next == previous || rewrite_security(store, previous, before, linked_before))
+        return true;
+    if (has_next)
+        rewrite_security(store, next, linked_after, after);
+    return false;
 }
 
 }  // namespace

@@ -45,11 +45,11 @@ CellOffset place_key(Store& store, const KeyRecord& record, const Name& name) {
     return CellOffset::none;
 }
 
-// Whether the list is another key's, which its first subkey says.
+// Whether the list may be another key's, which its first subkey says.
 bool is_anothers(Store& store, const KeyView& parent, const SubkeyIndex& index) {
     KeyView first;
-    return index.total > 0 && read_key(store, subkey_at(store, index, 0), first) &&
-           has_other_parent(store, parent.offset(), first);
+    return index.total > 0 &&
+           (!read_key(store, subkey_at(store, index, 0), first) || has_other_parent(store, parent.offset(), first));
 }
 
 Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& index, const Name& name,

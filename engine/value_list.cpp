@@ -127,7 +127,12 @@ bool replace_value(Store& store, const ValueView& old, const NewValue& value) {
     const CellOffset data = cell_offset(old.record.data);
     Cell cell;
     // An offset that leads to no cell, or to something else than data, is replaced; what lies there is left alone.
-    if (old.is_inline() || old.size() == 0 || !find_used_cell(store, data, cell) || is_no_data(store, old, cell))
+    const uint32_t failed = store.failed_reads;
+    const bool leads_elsewhere =
+        old.is_inline() || old.size() == 0 || !find_used_cell(store, data, cell) || is_no_data(store, old, cell);
+    if (store.failed_reads != failed)
+        return false;  // nobody knows what lies there
+    if (leads_elsewhere)
         return move_data(store, old, record, value);
     if (cell.room() >= value.size)
         return old.size() == value.size && old.record.type == value.type ? rewrite_in_place(store, old, record, value)

@@ -228,7 +228,8 @@ std::string structure(const Bytes& before, const Bytes& after) {
     return text;
 }
 
-std::string judge(const Case& hive, const Snapshot& before, const Change& change, int32_t status, MemoryFile& file) {
+std::string judge(const Case& hive, const Snapshot& before, const Change& change, int32_t status, MemoryFile& file,
+                  bool faulty) {
     file.rewind();
     const RegistryIo io = file.io();
     RegistryKey* root = ROpenHive(&io);
@@ -237,11 +238,11 @@ std::string judge(const Case& hive, const Snapshot& before, const Change& change
     const Snapshot after = take_snapshot(root, judged_limits(file.bytes.size()));
     std::string text = RCloseKey(root) == R_SUCCESS ? "" : "the hive does not close\n";
     const bool shares =
-        status == R_SUCCESS && std::any_of(hive.shared.begin(), hive.shared.end(), [&](const auto& place) {
+        (status == R_SUCCESS || faulty) && std::any_of(hive.shared.begin(), hive.shared.end(), [&](const auto& place) {
             return any_covers({place}, change.named.front()) || any_covers({change.named.front()}, place);
         });
     std::vector<std::string> exempt = hive.unsettled;
-    if (status == R_SUCCESS)
+    if (status == R_SUCCESS || faulty)
         exempt.insert(exempt.end(), change.named.begin(), change.named.end());
     if (shares)
         exempt.insert(exempt.end(), hive.shared.begin(), hive.shared.end());
@@ -346,7 +347,8 @@ std::vector<Change> changes_to(const Snapshot& snapshot) {
     return all;
 }
 
-std::string try_change(const Case& hive, const Snapshot& before, const Change& change) {
+std::string try_change(const Case& hive, const Snapshot& before, const Change& change,
+                       const MemoryFile::Failure& failure, bool* struck) {
     MemoryFile file(hive.bytes);
     const RegistryIo io = file.io();
     RegistryKey* root = ROpenHive(&io);
@@ -361,7 +363,13 @@ std::string try_change(const Case& hive, const Snapshot& before, const Change& c
             text = "the key cannot be reached\n";
         } else {
             const Watch watch(file, hive.untouchable);
+            if (failure.nth > 0)
+                file.arm(failure);
             status = call(key, change);
+            if (struck != nullptr)
+                *struck = file.failed();
+            if (failure.nth > 0)
+                file.disarm();
             text = watch.problems();
         }
     }
@@ -369,7 +377,7 @@ std::string try_change(const Case& hive, const Snapshot& before, const Change& c
         text += std::to_string(file.counts().writes) + " writes\n";
     if (RCloseKey(root) != R_SUCCESS)
         return text + "the hive does not close\n";
-    return text + judge(hive, before, change, status, file);
+    return text + judge(hive, before, change, status, file, failure.nth > 0);
 }
 
 }  // namespace hostile

@@ -35,6 +35,8 @@ std::vector<Change> changes_to(const testkit::Snapshot& snapshot);
 
 // Makes the change on a copy of the case's bytes. What was done to anything that the change does not name,
 // what was written where nothing may be, a success that is none; empty when all is well.
-std::string try_change(const Case& hive, const testkit::Snapshot& before, const Change& change);
+// A call of the file that fails meanwhile may be given; struck then tells whether it was reached.
+std::string try_change(const Case& hive, const testkit::Snapshot& before, const Change& change,
+                       const testkit::MemoryFile::Failure& failure = {}, bool* struck = nullptr);
 
 }  // namespace hostile

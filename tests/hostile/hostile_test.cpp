@@ -149,6 +149,29 @@ TEST_P(Changing, harms_nothing_that_is_not_named) {
         std::printf("[ LEFT OUT ] %zu of %zu changes of %s\n", all.size() - tried, all.size(), entry().name.c_str());
 }
 
+class ChangingWithFaults : public Hives {};
+
+// A failed read must not make what is damaged pass for sound. Of all changes to all hives few are tried;
+// TALLOWFEN_HOSTILE_ALL makes it all.
+TEST_P(ChangingWithFaults, harms_nothing_that_is_not_named) {
+    if (entry().readable == Readable::no || entry().large)
+        return;
+    constexpr size_t sampled = 64;
+    const size_t stride = std::getenv("TALLOWFEN_HOSTILE_ALL") == nullptr ? sampled : 1;
+    const Case hive = entry().make();
+    const Snapshot before = snapshot_of(hive.bytes, judged_limits(hive.bytes.size()));
+    const std::vector<Change> all = changes_to(before);
+    for (size_t i = GetParam() % stride; i < all.size(); i += stride) {
+        for (const bool lasting : {false, true}) {
+            bool struck = true;
+            for (uint64_t nth = 1; struck; nth++) {
+                EXPECT_EQ(try_change(hive, before, all[i], {MemoryFile::Call::read, nth, lasting, false}, &struck), "")
+                    << all[i].text() << ", read " << nth << (lasting ? " and all after" : "");
+            }
+        }
+    }
+}
+
 std::string name_of(const testing::TestParamInfo<size_t>& info) {
     std::string name = catalogue()[info.param].name;
     std::replace_if(
@@ -157,6 +180,7 @@ std::string name_of(const testing::TestParamInfo<size_t>& info) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Catalogue, Reading, testing::Range(size_t{0}, catalogue().size()), name_of);
+INSTANTIATE_TEST_SUITE_P(Catalogue, ChangingWithFaults, testing::Range(size_t{0}, catalogue().size()), name_of);
 INSTANTIATE_TEST_SUITE_P(Catalogue, Changing, testing::Range(size_t{0}, catalogue().size()), name_of);
 
 TEST(Catalogue, names_each_hive_once) {

@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <stdexcept>
 
 namespace testkit {
 
@@ -17,6 +18,31 @@ using Change = std::function<int32_t(RegistryKey*)>;
 std::string below(const std::string& path, const std::string& name) { return path.empty() ? name : path + "\\" + name; }
 
 std::string first_component(const std::string& path) { return path.substr(0, path.find('\\')); }
+
+Operation remove_value(const std::string& what, const std::string& path, const std::string& name) {
+    return {what, path, [name](RegistryKey* key) { return RDeleteValue(key, name.c_str()); }, {path + "|" + name}};
+}
+
+Operation remove_key(const std::string& what, const std::string& path, const std::string& name) {
+    return {what, path, [name](RegistryKey* key) { return RDeleteKey(key, name.c_str()); }, {below(path, name)}};
+}
+
+Operation set_text(const std::string& what, const std::string& path, const std::string& name, size_t characters) {
+    const Change change = [=](RegistryKey* key) {
+        const std::string text(characters, 't');
+        return RSetValueExA(key, name.c_str(), 1, text.c_str(), static_cast<uint32_t>(text.size()) + 1);
+    };
+    return {what, path, change, {path + "|" + name}};
+}
+
+void fill(KeyLayout& key) {
+    key.set("inline", 4, pattern(4));
+    key.set("middle", 3, pattern(40));
+    key.set("large", 3, pattern(120));
+    key.set("last", 1, text_data("text"));
+}
+
+}  // namespace
 
 Operation create(const std::string& what, const std::string& path, const std::string& name) {
     const Change change = [name](RegistryKey* key) {
@@ -34,14 +60,6 @@ Operation set(const std::string& what, const std::string& path, const std::strin
     return {what, path, change, {path + "|" + name}};
 }
 
-Operation remove_value(const std::string& what, const std::string& path, const std::string& name) {
-    return {what, path, [name](RegistryKey* key) { return RDeleteValue(key, name.c_str()); }, {path + "|" + name}};
-}
-
-Operation remove_key(const std::string& what, const std::string& path, const std::string& name) {
-    return {what, path, [name](RegistryKey* key) { return RDeleteKey(key, name.c_str()); }, {below(path, name)}};
-}
-
 Operation rename(const std::string& what, const std::string& path, const std::string& old_name,
                  const std::string& name) {
     const Change change = [=](RegistryKey* key) {
@@ -54,19 +72,12 @@ Operation rename(const std::string& what, const std::string& path, const std::st
     return {what, path, change, {below(path, old_name), below(path, name)}};
 }
 
-void fill(KeyLayout& key) {
-    key.set("inline", 4, pattern(4));
-    key.set("middle", 3, pattern(40));
-    key.set("large", 3, pattern(120));
-    key.set("last", 1, text_data("text"));
-}
-
-}  // namespace
-
 HiveLayout operation_layout(Leaf leaf) {
     HiveLayout layout;
     layout.leaf = leaf;
+    layout.security_records = 3;
     KeyLayout& flat = layout.root.add("Flat");
+    flat.class_name = u"Flat class";
     for (const char* name : {"alpha", "beta", "delta", "gamma"})
         fill(flat.add(name));
     KeyLayout& parent = layout.root.add("Parent");
@@ -83,6 +94,10 @@ HiveLayout operation_layout(Leaf leaf) {
     single.per_leaf = 1;
     for (const char* name : {"a", "b", "c", "d", "e"})
         single.add(name);
+    KeyLayout& guarded = layout.root.add("Guarded");
+    guarded.add("alone").security = 1;
+    guarded.add("other").security = 2;
+    layout.root.add("Emptied").add("gone");
     KeyLayout& plain = layout.root.add("Simple");
     plain.own_leaf = true;
     plain.leaf = Leaf::plain;
@@ -92,6 +107,13 @@ HiveLayout operation_layout(Leaf leaf) {
     segments.set("big", 3, pattern(40000)).storage = Storage::big;
     segments.set("small", 3, pattern(30));
     return layout;
+}
+
+Bytes operation_hive(Leaf leaf) {
+    Scene scene(operation_layout(leaf));
+    if (scene.Delete("Emptied\\gone") != R_SUCCESS)
+        throw std::logic_error("the leaf is not emptied");
+    return scene.bytes();
 }
 
 int32_t Operation::run(RegistryKey* root) const {
@@ -107,11 +129,14 @@ std::vector<Operation> operations() {
         create("subkey ahead of all", "Parent\\branch", "a"),
         create("subkey below an index root", "Rooted", "m25"),
         create("subkey in an index leaf", "Simple", "p25"),
+        create("first subkey into an emptied leaf", "Emptied", "new"),
         create("path of three", "Flat\\beta", "x\\y\\z"),
         set("new inline value", "Flat\\alpha", "new", 4, 4),
         set("new value with a cell", "Flat\\alpha", "new", 3, 200),
         set("first value of a key", "Flat", "new", 3, 60),
         set("new value that needs a bin", "Flat\\alpha", "new", 3, 20000),
+        set("default value", "Flat\\alpha", "", 3, 60),
+        set_text("text in 8 bits", "Flat\\alpha", "last", 60),
         set("value made larger", "Flat\\alpha", "middle", 3, 300),
         set("value made smaller", "Flat\\alpha", "large", 3, 50),
         set("value of the same size", "Flat\\alpha", "large", 3, 120),
@@ -126,6 +151,8 @@ std::vector<Operation> operations() {
         remove_value("last value removed", "Flat\\alpha", "last"),
         remove_value("only value removed", "Parent\\other", "v"),
         remove_key("key deleted", "Flat", "beta"),
+        remove_key("key deleted by a path", "Parent", "branch\\three"),
+        remove_key("last user of a security record deleted", "Guarded", "alone"),
         remove_key("last key of a leaf deleted", "Flat", "gamma"),
         remove_key("key in an index leaf deleted", "Simple", "p2"),
         rename("key renamed down", "Flat", "alpha", "zeta"),

@@ -25,8 +25,16 @@ struct Operation {
     int32_t run(RegistryKey* root) const;
 };
 
+// A change of one kind by name: below the key at path, or of a value of it.
+Operation create(const std::string& what, const std::string& path, const std::string& name);
+Operation set(const std::string& what, const std::string& path, const std::string& name, uint32_t type, size_t size);
+Operation rename(const std::string& what, const std::string& path, const std::string& old_name,
+                 const std::string& name);
+
 // A hive with an index of each kind, for the operations to work on.
 HiveLayout operation_layout(Leaf leaf);
+// Its bytes, with a key whose list has been emptied.
+Bytes operation_hive(Leaf leaf);
 std::vector<Operation> operations();
 // The same kinds of change where any hive has the keys and values for them.
 std::vector<Operation> operations_on(const Bytes& hive);

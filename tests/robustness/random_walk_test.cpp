@@ -264,7 +264,7 @@ void walk(const Bytes& start, uint32_t seed) {
 TEST(RandomWalk, OnMadeHives) {
     for (const Leaf leaf : {Leaf::fast, Leaf::hash}) {
         for (uint32_t seed = 1; seed <= 4; seed++)
-            walk(lay_out(operation_layout(leaf)).bytes, seed);
+            walk(operation_hive(leaf), seed);
     }
 }
 

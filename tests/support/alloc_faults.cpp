@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <cstring>
 
 namespace {
 
@@ -49,10 +50,12 @@ extern "C" {
 void* __real_malloc(size_t size);
 void* __real_calloc(size_t count, size_t size);
 void* __real_realloc(void* block, size_t size);
+char* __real_strdup(const char* text);
 void __real_free(void* block);
 void* __wrap_malloc(size_t size);
 void* __wrap_calloc(size_t count, size_t size);
 void* __wrap_realloc(void* block, size_t size);
+char* __wrap_strdup(const char* text);
 void __wrap_free(void* block);
 
 void* __wrap_malloc(size_t size) { return fails(size) ? nullptr : taken(__real_malloc(size)); }
@@ -67,6 +70,9 @@ void* __wrap_realloc(void* block, size_t size) {
     if (moved != nullptr)
         held -= before;
     return taken(moved);
+}
+char* __wrap_strdup(const char* text) {
+    return fails(strlen(text) + 1) ? nullptr : static_cast<char*>(taken(__real_strdup(text)));
 }
 void __wrap_free(void* block) {
     given_back(block);

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// Makes the N-th malloc, calloc or realloc of statically linked code fail, and measures what it takes. Works in a
-// program that links tallowfen_alloc_faults; operator new is not touched.
+// Makes the N-th malloc, calloc, realloc or strdup of statically linked code fail, and measures what it takes. Works in
+// a program that links tallowfen_alloc_faults; operator new is not touched.
 #pragma once
 
 #include <cstdint>
