@@ -110,15 +110,16 @@ int32_t RCloseHive(RegistryKey* root);
 
 // ---- opening keys ---------------------------------------------------------------------------------------------
 // Opens the index-th subkey in the order of the key's index. *out is null unless the result is 0.
-// 259: no such index, or its entry leads nowhere. 8: no memory. -1: no key given, or a damaged record. 87: out null.
+// 259: no such index, or its entry leads nowhere or could not be read. 8: no memory. -1: no key given, or a damaged
+// record. 87: out null.
 int32_t ROpenSubKey(RegistryKey* key, uint32_t index, RegistryKey** out);
 // ROpenKeyEx without the position. Null key: -1.
 int32_t ROpenKey(RegistryKey* key, const char* path, RegistryKey** out);
 // Opens the key at `path` below `key`. Leading backslashes are skipped; components beyond 259 characters are cut
 // there. *out_index receives the last component's position in its parent. 6: not a key. 87: null or empty path, or out
-// null. 8: no memory. 3: not found. -1: a damaged record. From the moment of allocation *out holds the new handle:
-// after a failure it is an incomplete one, to be released with RCloseKey. After 6 and 87, and after an 8 that is about
-// the handle itself, *out is null.
+// null. 8: no memory. 3: not found, or the lists on the way could not be read. -1: a damaged record. From the moment of
+// allocation *out holds the new handle: after a failure it is an incomplete one, to be released with RCloseKey. After 6
+// and 87, and after an 8 that is about the handle itself, *out is null.
 int32_t ROpenKeyEx(RegistryKey* key, const char* path, RegistryKey** out, uint32_t* out_index);
 
 // ---- enumerating and querying -----------------------------------------------------------------------------------
