@@ -105,8 +105,12 @@ void meet_failures(QWidget* parent, const QString& key_path, const std::function
 }
 
 void ask_for_name(const QModelIndex& index) {
-    [[maybe_unused]] const QVariant name = index.data(Qt::EditRole);
-    [[maybe_unused]] const Qt::ItemFlags flags = index.flags();
+    const QVariant name = index.data(Qt::EditRole);
+    const Qt::ItemFlags flags = index.flags();
+    if (!name.isValid() && flags.testFlag(Qt::ItemIsEditable)) {
+        // A value that cannot be read has no name, and no editor comes for it. What its icon is asked of says why.
+        [[maybe_unused]] const QVariant icon = index.data(Qt::DecorationRole);
+    }
 }
 
 QString key_path_of(const QModelIndex& index) {

@@ -277,7 +277,15 @@ private slots:
         stage.values->setCurrentIndex(damaged.siblingAtColumn(1));
         const auto copy = [&] { QTest::keySequence(stage.values, QKeySequence::Copy); };
         const auto open = [&] { stage.values->value_double_clicked(damaged); };
-        for (const std::function<void()>& gesture : {std::function<void()>(copy), std::function<void()>(open)}) {
+        const auto press = [&] {
+            stage.values->setCurrentIndex(damaged);
+            QTest::keyClick(stage.values, Qt::Key_F2);
+        };
+        const auto pick = [&] {
+            stage.return_to(*stage.values);
+            shared_actions().rename_action->trigger();
+        };
+        for (const auto& gesture : std::vector<std::function<void()>>{copy, open, press, pick}) {
             hand.text.clear();
             hand.then_press(QMessageBox::Ok);
             gesture();
