@@ -1,6 +1,6 @@
 # SPDX-FileCopyrightText: 2026 The tallowfen developers
 # SPDX-License-Identifier: MIT
-"""A damaged key met while browsing: told once, by name, and the rest of the hive goes on."""
+"""What is damaged, met while browsing: told once, by name, and the rest of the hive goes on."""
 import os
 
 from desktop import State, has, until
@@ -13,6 +13,7 @@ NOWHERE = (0x7FFFFFF0).to_bytes(4, "little")
 MANY = 400
 SOME = 150  # more than the program keeps handles
 FIRST_NUMBER = 1000000
+UNREADABLE = "(cannot be read)"  # what is read out for a name that is none
 
 
 def record_of(content, key):
@@ -47,10 +48,28 @@ def damaged_sample(scratch):
         put(record_of(content, b"usbhub"), b"xx")
         put(field_of(content, b"Themes", VALUE_LIST), NOWHERE)
         put(field_of(content, b"Beep", VALUE_COUNT), b"\xff\xff\xff\x7f")
-        values = cell(content, b"Tcpip", VALUE_LIST)
-        first = 4096 + int.from_bytes(content[values : values + 4], "little") + 4
-        equal(content[first : first + 2], b"vk", "the signature of the value to damage")
-        put(first + 4, (100).to_bytes(4, "little") + NOWHERE)
+        put(value_records(content, b"Tcpip")[0] + 4, (100).to_bytes(4, "little") + NOWHERE)
+    return path
+
+
+def value_records(content, key):
+    """Where the records of a key's values begin, in the order of its list."""
+    at = field_of(content, key, VALUE_COUNT)
+    count = int.from_bytes(content[at : at + 4], "little")
+    values = cell(content, key, VALUE_LIST)
+    records = [4096 + int.from_bytes(content[at : at + 4], "little") + 4 for at in range(values, values + 4 * count, 4)]
+    for at in records:
+        equal(content[at : at + 2], b"vk", "the signature of a value")
+    return records
+
+
+def sample_with(damage, scratch):
+    """What begins at the places that damage names is no record any more."""
+    path = make_sample(os.path.join(scratch, "SYSTEM"))
+    with open(path, "r+b") as file:
+        for at in damage(file.read()):
+            file.seek(at)
+            file.write(b"xx")
     return path
 
 
@@ -202,4 +221,88 @@ def losing(scratch):
         session.unchanged("a key that was lost for a while")
 
 
-run(browsing, painting, searching, losing)
+def values(scratch):
+    """Values that are no values any more: told once however often they are painted, passed by a search, and whoever
+    asks for one is answered"""
+    path = sample_with(lambda content: value_records(content, b"Value Types")[1::2], scratch)
+    with Session(path) as session:
+        program = session.program
+        key = ["ControlSet001", "Control", "Value Types"]
+        sound = [name for name in session.state[tuple(key)] if name]
+        session.open_key(key)
+        told = 'The key "{}" cannot be read: index'.format("\\".join(session.root + key))
+        session.message(TITLE, told, "OK", "damaged-values")
+        program.alone(TITLE)
+        names = session.names()
+        equal(names, ["(Default)"] + [""] * (len(names) - 1 - len(sound)) + sorted(sound), "the names")
+        equal(session.rows()[1], ["", UNREADABLE, UNREADABLE], "a value that cannot be read")
+
+        def focused(*cell):
+            until(lambda: has(program.table_cell(session.table, *cell), State.FOCUSED), f"the cell {cell}")
+
+        # The whole table comes into sight, with the wheel and with the keyboard.
+        program.click(session.value_cell(names[-1]))
+        last = len(names) - 1
+        for presses, cell in (["ctrl+Home"], (0, 0)), (["ctrl+End"], (last, 2)), (["ctrl+Home", "Down"], (1, 0)):
+            program.keys(*presses)
+            focused(*cell)
+            equal(program.open_titles(), [TITLE], f"windows after {presses}")
+        session.picture("damaged-value-table", session.main)
+
+        for presses in (["F2"], ["F2"], ["Return"], ["Right", "ctrl+c"]):
+            program.keys(*presses)
+            session.message(TITLE, told, "key Return")
+        program.keys("Left")
+        focused(1, 0)
+        program.pick("Edit", "Rename")
+        session.message(TITLE, told, "OK")
+        program.keys("Delete")
+        session.message("Confirm Value Removal", "Are you sure you want to delete this value?", "Yes")
+        session.message(TITLE, "The value could not be deleted.", "OK")
+        program.alone(TITLE)
+
+        program.keys("ctrl+f")
+        dialog = program.dialog("Find")
+        program.keys("ctrl+a")
+        program.type("qword")
+        program.click(program.button(dialog, "Find values"))
+        program.click(program.button(dialog, "OK"))
+        focused(names.index("QWORD"), 0)
+        program.alone(TITLE)
+        program.keys("F3")
+        session.message(TITLE, "Finished searching.", "OK")
+        session.unchanged("asking for what cannot be read")
+
+
+def asking(scratch):
+    """A key that is no key any more, among others: told once when all is opened, passed by what is typed, and each
+    gesture on it is answered"""
+    with Session(sample_with(lambda content: [record_of(content, b"Dhcp")], scratch)) as session:
+        program = session.program
+        told = 'The key "{}\\#2" cannot be read: ROpenSubKey failed'.format("\\".join(session.root + SERVICES))
+        session.open_key(SERVICES)
+        program.keys("asterisk")
+        session.message(TITLE, told, "OK", "damaged-key-opened")
+        program.alone(TITLE)
+        session.cell(SERVICES + ["Tcpip", "Parameters", "Interfaces"])  # all the same
+        program.type("d")
+        session.selected(SERVICES + ["disk"])
+
+        session.click_key(SERVICES + [UNREADABLE])
+        equal(session.rows(), [], "values of a key that cannot be read")
+        for press in ("F2", "F2"):
+            program.keys(press)
+            session.message(TITLE, told, "key Return")
+        program.pick("Edit", "Rename")
+        session.message(TITLE, told, "OK")
+        program.keys("Delete")
+        session.message("Confirm Key Removal", "Are you sure you want to delete this key and its subkeys?", "Yes")
+        session.message(TITLE, "The key could not be deleted.", "OK")
+        program.alone(TITLE)
+        program.keys("asterisk", "Up")
+        session.selected(SERVICES + ["cdrom"])
+        equal(program.open_titles(), [TITLE], "windows after opening it")
+        session.unchanged("asking for what cannot be read")
+
+
+run(browsing, painting, searching, losing, values, asking)
