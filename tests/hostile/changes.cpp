@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cstring>
+#include <map>
 
 namespace hostile {
 
@@ -25,6 +26,8 @@ constexpr uint32_t data_type = 3;
 constexpr uint8_t data_seed = 77;
 const std::string new_name = "Made here";
 const std::string new_key_name = "New name";
+const std::string name_before_all = "!first";
+constexpr size_t many_subkeys = 4;  // an index of so many gets new names at its beginning and in its middle, too
 constexpr uint32_t base_head_bytes = 512;  // what a change may write of the base block
 constexpr uint32_t bin_header_bytes = 32;
 constexpr uint64_t most_writes = 400;
@@ -246,6 +249,10 @@ std::string judge(const Case& hive, const Snapshot& before, const Change& change
         exempt.insert(exempt.end(), change.named.begin(), change.named.end());
     if (shares)
         exempt.insert(exempt.end(), hive.shared.begin(), hive.shared.end());
+    for (const Flow& flow : hive.shows_in) {
+        if (status == R_SUCCESS && any_covers({flow.from}, change.named.front()))
+            exempt.insert(exempt.end(), flow.to.begin(), flow.to.end());
+    }
     text += differences(others(before, exempt), others(after, exempt), !hive.cut_short);
     const bool settled = !shares && !any_covers(hive.unsettled, change.named.front());
     if (status == R_SUCCESS && settled)
@@ -301,18 +308,34 @@ void add_values_of(const FoundKey& key, std::vector<Change>& all) {
     }
 }
 
-// The calls on the key's parent that are about the key itself.
-void add_key_itself(const FoundKey& key, const FoundKey& parent, std::vector<Change>& all) {
-    const uint32_t position = key.way.back();
-    all.push_back({Kind::rename_key,
-                   parent.way,
-                   parent.place,
-                   new_key_name,
-                   position,
-                   0,
-                   {key.place, below(parent.place, new_key_name)}});
+// A key's own name.
+std::string name_in(const FoundKey& parent, const std::string& place) {
+    return place.substr(parent.place.empty() ? 0 : parent.place.size() + 1);
+}
+
+// Names for new subkeys: one that goes behind all that the catalogue has and, where they are many, one before them all
+// and one behind the second of them.
+std::vector<std::string> names_among(const std::vector<std::string>& subkeys, const std::string& last) {
+    std::vector<std::string> names = {last};
+    if (subkeys.size() < many_subkeys)
+        return names;
+    names.push_back(name_before_all);
     std::string narrow;
-    const std::string name = key.place.substr(parent.place.empty() ? 0 : parent.place.size() + 1);
+    if (as_8bit(subkeys[1], narrow))
+        names.push_back(narrow + "a");
+    return names;
+}
+
+// The calls on the key's parent that are about the key itself.
+void add_key_itself(const FoundKey& key, const FoundKey& parent, const std::vector<std::string>& siblings,
+                    std::vector<Change>& all) {
+    const uint32_t position = key.way.back();
+    for (const std::string& name : names_among(siblings, new_key_name)) {
+        const std::string renamed = below(parent.place, testkit::utf8(testkit::widen(name)));
+        all.push_back({Kind::rename_key, parent.way, parent.place, name, position, 0, {key.place, renamed}});
+    }
+    std::string narrow;
+    const std::string name = name_in(parent, key.place);
     if (as_8bit(name, narrow) && !narrow.empty())
         all.push_back({Kind::delete_key,
                        parent.way,
@@ -323,14 +346,26 @@ void add_key_itself(const FoundKey& key, const FoundKey& parent, std::vector<Cha
                        {below(parent.place, testkit::utf8(testkit::widen(narrow)))}});
 }
 
+std::vector<uint32_t> way_to_parent(const FoundKey& key) { return {key.way.begin(), key.way.end() - 1}; }
+
 }  // namespace
 
 std::vector<Change> changes_to(const Snapshot& snapshot) {
     std::vector<Change> all;
-    std::vector<const FoundKey*> parents;  // of the key at hand, from the root down
+    std::map<std::vector<uint32_t>, std::vector<std::string>> subkeys;  // their names, by the way to the key
+    std::map<std::vector<uint32_t>, const FoundKey*> keys;
     for (const FoundKey& key : snapshot.keys) {
-        parents.resize(key.way.size());
-        all.push_back({Kind::create_key, key.way, key.place, new_name, 0, 0, {below(key.place, new_name)}});
+        keys[key.way] = &key;
+        if (!key.way.empty())
+            subkeys[way_to_parent(key)].push_back(name_in(*keys.at(way_to_parent(key)), key.place));
+    }
+    for (const FoundKey& key : snapshot.keys) {
+        if (covers(left_alone, key.place))
+            continue;
+        for (const std::string& name : names_among(subkeys[key.way], new_name)) {
+            const std::string made = below(key.place, testkit::utf8(testkit::widen(name)));
+            all.push_back({Kind::create_key, key.way, key.place, name, 0, 0, {made}});
+        }
         add_values_of(key, all);
         for (const uint32_t position : key.damaged)
             all.push_back({Kind::rename_damaged_key,
@@ -340,9 +375,8 @@ std::vector<Change> changes_to(const Snapshot& snapshot) {
                            position,
                            0,
                            {below(key.place, new_key_name)}});
-        if (!parents.empty())
-            add_key_itself(key, *parents.back(), all);
-        parents.push_back(&key);
+        if (!key.way.empty())
+            add_key_itself(key, *keys.at(way_to_parent(key)), subkeys.at(way_to_parent(key)), all);
     }
     return all;
 }

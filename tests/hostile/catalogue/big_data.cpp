@@ -20,6 +20,7 @@ HiveLayout with_segments() {
     key.set("Big", 3, pattern(data_bytes)).storage = Storage::big;
     key.set("Sound", 3, pattern(20000, 3)).storage = Storage::big;
     key.add("Inner").set("v", 4, pattern(4));
+    add_left_alone(layout);
     return layout;
 }
 
@@ -81,6 +82,16 @@ void add_big_data(List& list) {
     list.add_on(
         with_segments, "big_data_that_shares_a_segment_with_another", Readable::partly, {"Alpha|Big"},
         [](Damage& d) { d.hive.put32(d.at("Alpha").values[1].segment_list, 0, d.at("Alpha").values[2].segments[0]); });
+    // The segments and their list stay where they are when the data of one is replaced.
+    list.add_on(with_segments, "big_data_that_shares_its_segment_list_with_another", Readable::partly, {"Alpha|Sound"},
+                [](Damage& d) { d.hive.put32(d.at("Alpha").values[2].data, 4, d.at("Alpha").values[1].segment_list); });
+    list.add_on(
+        with_segments, "big_data_of_two_values_in_one_record", Readable::partly, {"Alpha|Sound"},
+        [](Damage& d) {
+            d.hive.put32(d.at("Alpha").values[2].record, 4, data_bytes);
+            d.hive.put32(d.at("Alpha").values[2].record, 8, d.at("Alpha").values[1].data);
+        },
+        {"Alpha|Big", "Alpha|Sound"});
 }
 
 }  // namespace hostile

@@ -29,6 +29,14 @@ void fill_alpha(KeyLayout& alpha) {
 
 }  // namespace
 
+const char* const left_alone = "~";
+
+void add_left_alone(HiveLayout& layout) {
+    KeyLayout& key = layout.root.add(left_alone);
+    key.set("still", 3, pattern(40, 5));
+    key.add("calm").set("v", 4, {5, 6, 7, 8});
+}
+
 HiveLayout stage() {
     HiveLayout layout;
     layout.security_records = 3;
@@ -46,6 +54,7 @@ HiveLayout stage() {
     gamma.add("moon").security = 2;
     gamma.add("_under");
     layout.root.add("Zeta");
+    add_left_alone(layout);
     return layout;
 }
 
@@ -67,6 +76,13 @@ uint32_t Damage::free_space() const {
     if (best == none)
         throw std::out_of_range("the hive has no free cell");
     return best;
+}
+
+void Damage::listed_twice(const std::string& place, const std::string& other) {
+    for (const char* inside : {"\\", "|"}) {
+        result.shows_in.push_back({place + inside, {other}});
+        result.shows_in.push_back({other + inside, {place}});
+    }
 }
 
 uint32_t Damage::add_cell(uint32_t record_bytes) {

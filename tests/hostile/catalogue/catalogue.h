@@ -27,6 +27,12 @@ struct Range {
     uint64_t end;
 };
 
+// What a change at or below one place may show at or below others, and not the other way round.
+struct Flow {
+    std::string from;
+    std::vector<std::string> to;
+};
+
 struct Case {
     Bytes bytes;
     Bytes intact;  // the same without the damage
@@ -34,6 +40,7 @@ struct Case {
     std::vector<std::string> affected;
     // Places that lead to the same cells: a change of one of them may show in all of them.
     std::vector<std::string> shared;
+    std::vector<Flow> shows_in;
     // Places that lead to where the file has nothing yet: what a change puts there may show in them.
     std::vector<std::string> unsettled;
     // The file ends too early: what is behind its end may be read once a change has made it longer.
@@ -48,6 +55,10 @@ struct Entry {
     bool large;  // takes long to walk: few changes are tried, and the models leave it out
     std::function<Case()> make;
 };
+
+// A key below the root of every layout, behind all others: no damage is to it, and no change is tried in it.
+extern const char* const left_alone;
+void add_left_alone(HiveLayout& layout);
 
 // The hive that most entries damage, of some 8 KB:
 //   Alpha: "", Text, Number, Raw, Same; class "Klass"; subkeys Inner (Deep, Deeper), Other (security of its
@@ -71,6 +82,9 @@ struct Damage {
     void cut_cell(uint32_t cell, uint32_t new_size);
     // A free cell, and one offset in its middle.
     uint32_t free_space() const;
+    // Says that a key is listed in two places: what is done inside it in one shows in the other, and whether it is
+    // there, and under which name, does not.
+    void listed_twice(const std::string& place, const std::string& other);
 };
 
 // Collects the entries of one heading.

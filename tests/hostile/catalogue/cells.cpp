@@ -183,6 +183,10 @@ void add_shared_cells(List& list) {
     list.add("one_data_cell_for_two_values", Readable::partly, {"Alpha|Same"},
              [](Damage& d) { d.hive.put32(d.at("Alpha").values[4].record, 8, d.at("Alpha").values[3].data); },
              {"Alpha|Raw", "Alpha|Same"});
+    // The list that the record is not made for finds none there, once it has been deleted in the other.
+    list.add("one_value_record_in_the_lists_of_two_keys", Readable::partly, {"Gamma|"},
+             [](Damage& d) { d.hive.put32(d.at("Gamma").value_list, 0, d.at("Alpha").values[1].record); },
+             {"Alpha|Text", "Gamma|Text", "Alpha|?", "Gamma|?"});
     list.add("one_value_list_for_two_keys", Readable::partly, {"Gamma|"},
              [](Damage& d) {
                  d.hive.put32(d.at("Gamma").record, 36, 5);

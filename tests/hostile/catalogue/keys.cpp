@@ -67,6 +67,7 @@ std::function<HiveLayout()> named(const std::u16string& name, bool wide) {
         odd.set("inside", 3, pattern(30));
         odd.add("below");
         alpha.add("zz");
+        add_left_alone(layout);
         return layout;
     };
 }

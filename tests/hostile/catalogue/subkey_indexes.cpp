@@ -78,6 +78,7 @@ std::function<HiveLayout()> ordered(const std::vector<std::string>& names, Leaf 
         for (const std::string& name : names)
             alpha.add(name).set("v", 1, testkit::text_data(name));
         layout.root.add("Zeta");
+        add_left_alone(layout);
         return layout;
     };
 }
@@ -162,7 +163,7 @@ void add_roots(List& list) {
         d.hive.put32(d.at("Beta").record, 20, 0);
     });
     beta("points_to_one_leaf_twice", Readable::partly,
-         [](Damage& d) { d.hive.put32(d.at("Beta").index, 8, d.at("Beta").leaves[0]); }, {"Beta\\"});
+         [](Damage& d) { d.hive.put32(d.at("Beta").index, 8, d.at("Beta").leaves[0]); }, {"Beta\\b1", "Beta\\b2"});
     beta("points_to_a_plain_leaf_and_hash_leaves", Readable::whole, [](Damage& d) {
         const uint32_t leaf = d.at("Beta").leaves[1];
         d.hive.put32(leaf, 8, d.hive.get32(leaf, 12));
@@ -180,12 +181,59 @@ void add_roots(List& list) {
          {"Alpha\\", "Beta\\"});
 }
 
+// What a new or renamed key in the place of another may be called.
+List::Places with_new_names(const std::string& key, List::Places places) {
+    for (const char* name : {"Made here", "New name", "!first", "b2a", "?"})
+        places.push_back(key + "\\" + name);
+    return places;
+}
+
+// Beta's root leads to Alpha's leaf. Alpha keeps it whatever is done in Beta; a change in Alpha may take it from Beta,
+// which then lists no more than what stands ahead of it.
+void add_roots_over_a_leaf_of_another_key(List& list) {
+    for (const uint32_t slot : {0U, 1U}) {
+        for (const bool counted : {true, false}) {
+            const std::string name = std::string("ri_whose_") + (slot == 0 ? "first" : "second") +
+                                     "_leaf_is_another_keys" + (counted ? "" : "_and_its_count_its_own");
+            list.add(name, Readable::partly, {"Beta\\"}, [=](Damage& d) {
+                d.hive.put32(d.at("Beta").index, 4 + 4 * slot, d.at("Alpha").index);
+                if (counted)
+                    d.hive.put32(d.at("Beta").record, 20, 6);
+                List::Places behind{"Beta\\Inner", "Beta\\Other", "Beta\\Third", "Beta\\b5"};
+                if (slot == 0)
+                    behind.insert(behind.end(), {"Beta\\b3", "Beta\\b4"});
+                d.result.shows_in.push_back({"Alpha\\", with_new_names("Beta", behind)});
+                for (const char* key : {"Inner", "Other", "Third"})
+                    d.listed_twice(std::string("Alpha\\") + key, std::string("Beta\\") + key);
+            });
+        }
+    }
+}
+
+void add_one_leaf_in_two_roots(List& list) {
+    const auto two_roots = [] {
+        HiveLayout layout = stage();
+        KeyLayout& delta = layout.root.add("Delta");
+        delta.per_leaf = 2;
+        for (const char* name : {"d1", "d2", "d3", "d4"})
+            delta.add(name);
+        return layout;
+    };
+    list.add_on(two_roots, "one_leaf_in_the_roots_of_two_keys", Readable::partly, {"Delta\\"}, [](Damage& d) {
+        d.hive.put32(d.at("Delta").index, 8, d.at("Beta").leaves[1]);
+        d.result.shows_in.push_back({"Beta\\", with_new_names("Delta", {"Delta\\b3", "Delta\\b4"})});
+        for (const char* key : {"b3", "b4"})
+            d.listed_twice(std::string("Beta\\") + key, std::string("Delta\\") + key);
+    });
+}
+
 std::function<HiveLayout()> long_leaf(int count) {
     return [count] {
         HiveLayout layout;
         KeyLayout& alpha = layout.root.add("Alpha");
         for (int i = 0; i < count; i++)
             alpha.add("k" + std::to_string(i));
+        add_left_alone(layout);
         return layout;
     };
 }
@@ -197,6 +245,8 @@ void add_subkey_indexes(List& list) {
     add_signatures(list);
     add_orders(list);
     add_roots(list);
+    add_roots_over_a_leaf_of_another_key(list);
+    add_one_leaf_in_two_roots(list);
     list.add_on(
         long_leaf(65534), "leaf_of_65534_entries", Readable::whole, {}, [](Damage&) {}, {}, true);
     list.add_on(
