@@ -312,10 +312,15 @@ TEST(KeyOrder, of_whatever_rule_every_key_is_found_and_a_new_one_is_found_again)
 
 // The ring is left as it is where the record's neighbours do not agree with it.
 TEST(Security, record_in_a_broken_ring_is_counted_down_and_stays) {
-    for (const char* name :
-         {"security_next_does_not_point_back", "security_previous_does_not_point_forward",
-          "security_next_is_far_past_the_end", "security_previous_leads_to_a_key", "security_next_leads_to_a_free_cell",
-          "security_ring_of_one", "security_ring_of_one_that_the_others_point_into"}) {
+    std::vector<std::string> names = {"security_next_does_not_point_back", "security_previous_does_not_point_forward",
+                                      "security_ring_of_one", "security_ring_of_one_that_the_others_point_into"};
+    for (const char* target :
+         {"inside_a_bin_header", "past_the_end", "far_past_the_end", "at_a_free_cell", "in_the_middle_of_a_free_cell",
+          "in_the_middle_of_a_used_cell", "misaligned", "at_its_own_record", "at_a_record_of_another_kind"}) {
+        names.push_back(std::string("security_next_") + target);
+        names.push_back(std::string("security_previous_") + target);
+    }
+    for (const std::string& name : names) {
         SCOPED_TRACE(name);
         Scene scene(case_of(name).bytes);
         const LaidHive laid = lay_out(stage());
@@ -330,6 +335,23 @@ TEST(Security, record_in_a_broken_ring_is_counted_down_and_stays) {
         EXPECT_EQ(field(1, 8), links[3]);
         EXPECT_EQ(field(2, 12), 0U);
         EXPECT_LT(static_cast<int32_t>(get32(scene.bytes(), 4096 + uint64_t{laid.security[2]})), 0);
+    }
+}
+
+// An offset of 0 or less is no neighbour: the ring is a list that ends there.
+TEST(Security, record_at_the_end_of_a_list_goes_out_of_it) {
+    for (const char* target : {"0", "minus_1", "negative"}) {
+        SCOPED_TRACE(target);
+        const LaidHive laid = lay_out(stage());
+        const auto after_deletion = [&](const std::string& field, size_t which, uint32_t at) {
+            Scene scene(case_of("security_" + field + "_" + target).bytes);
+            const uint32_t end = get32(scene.bytes(), LaidHive::position(laid.security[2], field == "next" ? 4 : 8));
+            EXPECT_EQ(scene.Delete("Gamma\\moon"), R_SUCCESS);
+            EXPECT_EQ(get32(scene.bytes(), LaidHive::position(laid.security[which], at)), end);
+            EXPECT_GT(static_cast<int32_t>(get32(scene.bytes(), 4096 + uint64_t{laid.security[2]})), 0);
+        };
+        after_deletion("next", 1, 4);
+        after_deletion("previous", 0, 8);
     }
 }
 

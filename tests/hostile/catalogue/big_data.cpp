@@ -2,6 +2,9 @@
 // SPDX-License-Identifier: MIT
 #include "catalogue.h"
 
+#include <algorithm>
+#include <cstring>
+
 namespace hostile {
 
 using testkit::pattern;
@@ -22,6 +25,46 @@ HiveLayout with_segments() {
     key.add("Inner").set("v", 4, pattern(4));
     add_left_alone(layout);
     return layout;
+}
+
+struct Field {
+    uint32_t cell;
+    uint32_t at;
+};
+
+// Where the list of the segments and a segment must not lead.
+void add_offsets(List& list, const std::string& what, const std::function<Field(const ValuePlaces&)>& field) {
+    const auto led_to = [&](const std::string& where, const std::function<uint32_t(Damage&, uint32_t)>& offset) {
+        list.add_on(with_segments, "big_data_" + what + "_" + where, Readable::partly, {"Alpha|Big"}, [=](Damage& d) {
+            const Field f = field(d.at("Alpha").values[1]);
+            d.keep(f.cell);
+            d.hive.put32(f.cell, f.at, offset(d, d.hive.get32(f.cell, f.at)));
+        });
+    };
+    led_to("0", [](Damage&, uint32_t) { return 0U; });
+    led_to("inside_a_bin_header", [](Damage&, uint32_t) { return 16U; });
+    led_to("negative", [](Damage&, uint32_t) { return 0x80000020U; });
+    led_to("past_the_end", [](Damage& d, uint32_t) {
+        d.result.unsettled = {"Alpha|Big"};
+        return testkit::get32(d.hive.bytes, 40) + 32;
+    });
+    led_to("far_past_the_end", [](Damage&, uint32_t) { return 0x7FFFFFF8U; });
+    led_to("misaligned", [](Damage&, uint32_t old) { return old + 4; });
+    // The very cell stands there once more, as far as there is room: what the bin's cells say is what counts.
+    const auto copied = [](Damage& d, uint32_t old, uint32_t copy, uint32_t room) {
+        const uint32_t size = std::min(static_cast<uint32_t>(-d.hive.cell_size(old)), room);
+        memcpy(d.hive.bytes.data() + testkit::base_block_bytes + copy,
+               d.hive.bytes.data() + testkit::base_block_bytes + old, size);
+        return copy;
+    };
+    led_to("in_the_middle_of_a_free_cell", [copied](Damage& d, uint32_t old) {
+        d.result.unsettled = {"Alpha|Big"};
+        return copied(d, old, d.free_space() + 128, 256);
+    });
+    led_to("in_the_middle_of_a_used_cell", [copied](Damage& d, uint32_t old) {
+        d.result.affected.push_back("Alpha|Sound");
+        return copied(d, old, d.at("Alpha").values[2].segments[0] + 128, 1024);
+    });
 }
 
 }  // namespace
@@ -56,6 +99,9 @@ void add_big_data(List& list) {
     });
     damaged("list_not_there", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.data, 4, none); });
     damaged("list_is_the_record", [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.data, 4, p.data); });
+    add_offsets(list, "list", [](const ValuePlaces& p) { return Field{p.data, 4}; });
+    add_offsets(list, "first_segment", [](const ValuePlaces& p) { return Field{p.segment_list, 0}; });
+    add_offsets(list, "last_segment", [](const ValuePlaces& p) { return Field{p.segment_list, 8}; });
     damaged("list_in_the_middle_of_a_segment",
             [](Damage& d, const ValuePlaces& p) { d.hive.put32(p.data, 4, p.segments[0] + 256); });
     list.add_on(with_segments, "big_data_first_segment_free", Readable::partly, {"Alpha|Big"}, [](Damage& d) {
@@ -85,13 +131,12 @@ void add_big_data(List& list) {
     // The segments and their list stay where they are when the data of one is replaced.
     list.add_on(with_segments, "big_data_that_shares_its_segment_list_with_another", Readable::partly, {"Alpha|Sound"},
                 [](Damage& d) { d.hive.put32(d.at("Alpha").values[2].data, 4, d.at("Alpha").values[1].segment_list); });
-    list.add_on(
-        with_segments, "big_data_of_two_values_in_one_record", Readable::partly, {"Alpha|Sound"},
-        [](Damage& d) {
-            d.hive.put32(d.at("Alpha").values[2].record, 4, data_bytes);
-            d.hive.put32(d.at("Alpha").values[2].record, 8, d.at("Alpha").values[1].data);
-        },
-        {"Alpha|Big", "Alpha|Sound"});
+    list.add_on(with_segments, "big_data_of_two_values_in_one_record", Readable::partly, {"Alpha|Sound"},
+                [](Damage& d) {
+                    d.hive.put32(d.at("Alpha").values[2].record, 4, data_bytes);
+                    d.hive.put32(d.at("Alpha").values[2].record, 8, d.at("Alpha").values[1].data);
+                },
+                {"Alpha|Big", "Alpha|Sound"});
 }
 
 }  // namespace hostile

@@ -36,7 +36,8 @@ void add_sizes(List& list) {
     sized("past_the_end_of_the_file", [](int32_t) { return -0x00100000; });
 }
 
-// Every field that leads to a cell, and the places that stop being readable when it does not.
+// Every field that leads to a cell, and the places that stop being readable when it does not: none where nothing is
+// read through it. Those of big data stand with the rest of it, and those that lead to nothing below.
 struct Reference {
     std::string name;
     List::Places affected;
@@ -54,6 +55,8 @@ std::vector<Reference> references() {
     const auto index = [](Damage& d) { return d.at("Alpha").index; };
     const auto roots = [](Damage& d) { return d.at("Beta").index; };
     const auto beta_leaf = [](Damage& d) { return d.at("Beta").leaves[1]; };
+    const auto inner = [](Damage& d) { return d.at("Alpha\\Inner").record; };
+    const auto moons = [](Damage& d) { return d.hive.security[2]; };
     return {
         {"class", {"Alpha="}, in(alpha, 48), alpha},
         {"value_list", {"Alpha|"}, in(alpha, 40), alpha},
@@ -64,8 +67,13 @@ std::vector<Reference> references() {
         {"leaf_of_a_root", {"Beta\\"}, in(roots, 8), roots},
         {"entry_of_a_leaf_of_a_root", {"Beta\\"}, in(beta_leaf, 4), beta_leaf},
         {"security", {"Alpha="}, in(alpha, 44), alpha},
+        {"parent", {}, in(inner, 16), inner},
+        {"security_next", {}, in(moons, 4), moons},
+        {"security_previous", {}, in(moons, 8), moons},
     };
 }
+
+const char* const over_data = "in_the_middle_of_a_used_cell";
 
 // Where a field must not lead, and whether a change to something else may show there.
 struct Target {
@@ -93,7 +101,7 @@ std::vector<Target> targets() {
              memcpy(d.hive.bytes.data() + base_block_bytes + copy, d.hive.bytes.data() + base_block_bytes + old, size);
              return copy;
          }},
-        {"in_the_middle_of_a_used_cell", false,
+        {over_data, false,
          [](Damage& d, const Reference& reference) {
              const uint32_t copy = d.at("Alpha").values[4].data + 8;
              const uint32_t old = testkit::get32(d.hive.bytes, reference.field(d));
@@ -108,7 +116,7 @@ std::vector<Target> targets() {
         {"at_its_own_record", false, [](Damage& d, const Reference& reference) { return reference.holder(d); }},
         {"at_a_record_of_another_kind", true,
          [](Damage& d, const Reference& reference) {
-             return reference.name == "security" ? d.at("Zeta").record : d.hive.security[1];
+             return reference.name.compare(0, 8, "security") == 0 ? d.at("Zeta").record : d.hive.security[1];
          }},
     };
 }
@@ -136,13 +144,14 @@ std::vector<Reference> references_of_a_leaf() {
 void add_references(List& list, const std::vector<Reference>& all) {
     for (const Reference& reference : all) {
         for (const Target& target : targets()) {
-            list.add(reference.name + "_" + target.name, Readable::partly, reference.affected,
-                     [reference, target](Damage& d) {
-                         if (target.unsettled)
-                             d.result.unsettled = reference.affected;
-                         const uint32_t offset = target.offset(d, reference);
-                         testkit::set32(d.hive.bytes, reference.field(d), offset);
-                     });
+            const bool unseen = reference.affected.empty() && target.name != over_data;
+            const Readable readable = unseen ? Readable::whole : Readable::partly;
+            list.add(reference.name + "_" + target.name, readable, reference.affected, [reference, target](Damage& d) {
+                if (target.unsettled)
+                    d.result.unsettled = reference.affected;
+                const uint32_t offset = target.offset(d, reference);
+                testkit::set32(d.hive.bytes, reference.field(d), offset);
+            });
         }
     }
 }

@@ -155,10 +155,7 @@ void add_parents(List& list) {
                  [where](Damage& d) { d.hive.put32(d.at("Alpha\\Inner").record, parent_field, where(d)); });
     };
     parent("wrong", [](Damage& d) { return d.at("Gamma").record; });
-    parent("itself", [](Damage& d) { return d.at("Alpha\\Inner").record; });
     parent("its_own_subkey", [](Damage& d) { return d.at("Alpha\\Inner\\Deeper").record; });
-    parent("nowhere", [](Damage&) { return none; });
-    parent("far_past_the_end", [](Damage&) { return 0x7FFFFFF8U; });
 
     const auto ring = [&](const std::string& name, const std::string& key, const std::string& top,
                           uint32_t entry_position) {

@@ -49,12 +49,6 @@ void add_security(List& list) {
               [](Damage& d, uint32_t) { d.hive.put32(d.hive.security[0], previous_field, d.hive.security[1]); });
     in_record("previous_does_not_point_forward",
               [](Damage& d, uint32_t) { d.hive.put32(d.hive.security[1], next_field, d.hive.security[0]); });
-    in_record("next_leads_nowhere", [](Damage& d, uint32_t own) { d.hive.put32(own, next_field, none); });
-    in_record("next_is_far_past_the_end", [](Damage& d, uint32_t own) { d.hive.put32(own, next_field, 0x7FFFFFF8); });
-    in_record("previous_leads_to_a_key",
-              [](Damage& d, uint32_t own) { d.hive.put32(own, previous_field, d.at("Zeta").record); });
-    in_record("next_leads_to_a_free_cell",
-              [](Damage& d, uint32_t own) { d.hive.put32(own, next_field, d.free_space()); });
     in_record("ring_of_one", [](Damage& d, uint32_t own) {
         d.hive.put32(own, next_field, own);
         d.hive.put32(own, previous_field, own);
