@@ -230,6 +230,20 @@ INSTANTIATE_TEST_SUITE_P(
                     ValueStatus{"big_data_total_below_the_size", "Big", R_REGISTRY_CORRUPT}),
     [](const auto& row) { return row.param.name; });
 
+TEST(BigData, whose_list_or_segment_is_no_cell_of_its_own_cannot_be_read) {
+    for (const char* target : {"0", "inside_a_bin_header", "negative", "past_the_end", "far_past_the_end", "misaligned",
+                               "in_the_middle_of_a_free_cell", "in_the_middle_of_a_used_cell"}) {
+        SCOPED_TRACE(target);
+        const auto status = [&](const char* field) {
+            Scene scene(case_of(std::string("big_data_") + field + "_" + target).bytes);
+            return status_of(scene, "Alpha", "Big");
+        };
+        EXPECT_EQ(status("list"), R_REGISTRY_IO_FAILED);
+        EXPECT_EQ(status("first_segment"), R_REGISTRY_CORRUPT);
+        EXPECT_EQ(status("last_segment"), R_REGISTRY_CORRUPT);
+    }
+}
+
 TEST(ValueNames, in_utf16_are_not_taken_for_the_8_bit_name_that_their_bytes_spell) {
     Scene scene(case_of("value_name_in_utf16_whose_bytes_are_those_of_another").bytes);
     Handle key = scene.OpenKey("Alpha");

@@ -17,7 +17,7 @@ constexpr uint32_t data_bytes = 40000;  // three segments, the last one in part
 
 HiveLayout with_segments() {
     HiveLayout layout;
-    layout.free_bytes = 600;
+    layout.free_bytes = 9000;  // more than the last segment has to hold
     testkit::KeyLayout& key = layout.root.add("Alpha");
     key.set("Before", 1, testkit::text_data("b"));
     key.set("Big", 3, pattern(data_bytes)).storage = Storage::big;
@@ -51,19 +51,22 @@ void add_offsets(List& list, const std::string& what, const std::function<Field(
     led_to("far_past_the_end", [](Damage&, uint32_t) { return 0x7FFFFFF8U; });
     led_to("misaligned", [](Damage&, uint32_t old) { return old + 4; });
     // The very cell stands there once more, as far as there is room: what the bin's cells say is what counts.
-    const auto copied = [](Damage& d, uint32_t old, uint32_t copy, uint32_t room) {
+    const auto copied = [](Damage& d, uint32_t old, uint32_t into) {
+        constexpr uint32_t skipped = 128;
+        const auto room = static_cast<uint32_t>(std::abs(d.hive.cell_size(into))) - skipped;
         const uint32_t size = std::min(static_cast<uint32_t>(-d.hive.cell_size(old)), room);
-        memcpy(d.hive.bytes.data() + testkit::base_block_bytes + copy,
+        memcpy(d.hive.bytes.data() + testkit::base_block_bytes + into + skipped,
                d.hive.bytes.data() + testkit::base_block_bytes + old, size);
-        return copy;
+        d.hive.set_cell_size(into + skipped, -static_cast<int32_t>(size));
+        return into + skipped;
     };
     led_to("in_the_middle_of_a_free_cell", [copied](Damage& d, uint32_t old) {
         d.result.unsettled = {"Alpha|Big"};
-        return copied(d, old, d.free_space() + 128, 256);
+        return copied(d, old, d.free_space());
     });
     led_to("in_the_middle_of_a_used_cell", [copied](Damage& d, uint32_t old) {
         d.result.affected.push_back("Alpha|Sound");
-        return copied(d, old, d.at("Alpha").values[2].segments[0] + 128, 1024);
+        return copied(d, old, d.at("Alpha").values[2].segments[0]);
     });
 }
 
