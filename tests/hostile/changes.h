@@ -30,6 +30,11 @@ struct Change {
 constexpr uint32_t judged_depth = 6;
 testkit::WalkLimits judged_limits(size_t file_size);
 
+// The time that this process has spent, and how much more a hive of some size may take with any optimisation or
+// sanitizer: a microsecond a byte, a few times what it does.
+double cpu_seconds();
+double most_seconds(uint64_t file_size);
+
 // All changes to what a snapshot shows.
 std::vector<Change> changes_to(const testkit::Snapshot& snapshot);
 

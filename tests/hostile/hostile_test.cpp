@@ -12,7 +12,6 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <ctime>
 #include <set>
 
 namespace hostile {
@@ -27,13 +26,6 @@ using testkit::Snapshot;
 // What reading a file may take beside what its size justifies.
 constexpr uint64_t spare_bytes = 1U << 20U;
 constexpr uint64_t passes = 640;  // three walks; a record is 80 bytes, a window that may be loaded for it 16 KiB
-constexpr double most_seconds = 60;
-
-double cpu_seconds() {
-    timespec now = {};
-    clock_gettime(CLOCK_PROCESS_CPUTIME_ID, &now);
-    return static_cast<double>(now.tv_sec) + static_cast<double>(now.tv_nsec) / 1e9;
-}
 
 Snapshot snapshot_of(const Bytes& bytes, const testkit::WalkLimits& limits) {
     MemoryFile file(bytes);
@@ -117,7 +109,7 @@ TEST_P(Reading, survives) {
     EXPECT_LE(peak, 2 * size + spare_bytes);
     EXPECT_EQ(file.counts().writes, 0U);
     EXPECT_TRUE(file.bytes == hive.bytes);
-    EXPECT_LE(cpu_seconds() - began, most_seconds);
+    EXPECT_LE(cpu_seconds() - began, most_seconds(size));
     if (entry().readable == Readable::whole) {
         EXPECT_EQ(found.unreadable, 0U);
         EXPECT_TRUE(found.complete);
