@@ -282,6 +282,37 @@ private slots:
         QVERIFY(!read_tree(again).empty());
     }
 
+    void every_cut_data() {
+        QTest::addColumn<int>("missing");
+        for (int missing = 0; missing < 1024; missing += 93)
+            QTest::newRow(qPrintable(QStringLiteral("%1 bytes cut off").arg(missing))) << missing;
+    }
+
+    // Amid the last cell, which holds the data of a value.
+    void every_cut() {
+        QFETCH(int, missing);
+        Case hive;
+        hive.bytes = hostile::hive_to_cut();
+        hive.bytes.resize(hive.bytes.size() - static_cast<size_t>(missing));
+        Mounted mounted(hive.bytes);
+        const std::vector<QPersistentModelIndex> keys = read_tree(mounted);
+        {
+            const ValuesModel values(key_of_row(mounted, 0));
+            const QModelIndexList raw = values.match(values.index(0, 0), Qt::DisplayRole, QStringLiteral("Raw"));
+            QCOMPARE(raw.size(), 1);
+            QCOMPARE(raw.first().siblingAtColumn(2).data().toByteArray().isEmpty(), missing > 0);
+        }
+        QVERIFY(search_in_vain(mounted));
+        QVERIFY(mounted.file.bytes() == hive.bytes);
+        QVERIFY(shows_key_below_mount(mounted, QString::fromLatin1(hostile::left_alone)));
+        change_all_but(mounted, keys, QString::fromLatin1(hostile::left_alone));
+        QVERIFY(mounted.file.bytes() != hive.bytes);
+        QCOMPARE(mounted.unnamed, 0);
+        compare_untouched(hive, mounted, hostile::left_alone);
+        Mounted again(mounted.file.bytes());
+        QVERIFY(!read_tree(again).empty());
+    }
+
     // However many values share the data of one, and however much more memory it takes than it is stored in.
     void data_that_many_values_share_is_held_within_bounds() {
         constexpr int count = 40;

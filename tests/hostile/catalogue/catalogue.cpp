@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "catalogue.h"
 
+#include <algorithm>
 #include <stdexcept>
 
 namespace hostile {
@@ -56,6 +57,26 @@ HiveLayout stage() {
     layout.root.add("Zeta");
     add_left_alone(layout);
     return layout;
+}
+
+Bytes hive_to_cut() {
+    HiveLayout layout = stage();
+    layout.free_bytes = 0;
+    LaidHive hive = lay_out(layout);
+    const uint32_t end = testkit::get32(hive.bytes, 40);
+    uint32_t last = end - layout.bin_size + 32;
+    while (hive.cell_size(last) < 0)
+        last += static_cast<uint32_t>(-hive.cell_size(last));
+    if (last + static_cast<uint32_t>(hive.cell_size(last)) != end)
+        throw std::out_of_range("the last bin has no free cell at its end");
+    hive.set_cell_size(last, -hive.cell_size(last));
+    const uint32_t data_size = end - last - 4;
+    const Bytes data = pattern(data_size, 3);
+    std::copy(data.begin(), data.end(), hive.bytes.begin() + static_cast<std::ptrdiff_t>(LaidHive::position(last)));
+    const uint32_t record = hive.at("Alpha").values[3].record;
+    hive.put32(record, 4, data_size);
+    hive.put32(record, 8, last);
+    return hive.bytes;
 }
 
 void Damage::keep(uint32_t cell) {

@@ -66,6 +66,10 @@ void add_left_alone(HiveLayout& layout);
 //   multi-string), Eight (8 bytes in a cell); subkeys leaf, moon (security of its own), _under Zeta: nothing
 HiveLayout stage();
 
+// The same without free space, and with the data of Alpha's Raw in the last cell: a hive opens where that one alone is
+// cut. It is more than a kilobyte long.
+Bytes hive_to_cut();
+
 // What an entry's damage works on.
 struct Damage {
     LaidHive hive;
