@@ -445,7 +445,8 @@ std::string try_change(const Case& hive, const Snapshot& before, const Change& c
     }
     if (RCloseKey(root) != R_SUCCESS)
         return text + "the hive does not close\n";
-    text += cost(file, memory, cpu_seconds() - began, hive.bytes.size() + change.size);
+    if (failure.nth == 0)
+        text += cost(file, memory, cpu_seconds() - began, hive.bytes.size() + change.size);
     return text + judge(hive, before, change, status, file, failure.nth > 0);
 }
 
