@@ -55,6 +55,7 @@ private slots:
     void one_letter_again_and_again_goes_from_match_to_match();
     void an_asterisk_opens_all_below();
     void an_asterisk_tells_what_it_cannot_open();
+    void an_asterisk_tells_a_branch_that_cannot_be_counted_and_opens_the_others();
     void an_asterisk_on_a_hive_without_end_ends();
 };
 
@@ -444,6 +445,43 @@ void KeysViewTest::an_asterisk_tells_what_it_cannot_open() {
              qPrintable(hand.text));
     QVERIFY(stage.keys->isExpanded(stage.key(root)));
     QVERIFY(stage.keys->isExpanded(stage.model->index(sound_keys + 1, 0, stage.key(root))));
+}
+
+// A model that cannot count the keys below one, for as long as a gesture takes.
+class UncountableModel : public RegModel {
+public:
+    int rowCount(const QModelIndex& parent = QModelIndex()) const override {
+        if (fails && parent == uncountable) {
+            throw std::runtime_error("not now");
+        }
+        return RegModel::rowCount(parent);
+    }
+
+    QModelIndex uncountable;
+    bool fails = false;
+};
+
+void KeysViewTest::an_asterisk_tells_a_branch_that_cannot_be_counted_and_opens_the_others() {
+    testkit::HiveLayout hive;
+    hive.root.add("first").add("below");
+    hive.root.add("second").add("below");
+    const Scene scene(hive);
+    Stage stage(scene, std::make_unique<UncountableModel>());
+    auto& model = static_cast<UncountableModel&>(*stage.model);
+    const QString root = QStringLiteral("MACHINE\\SYSTEM");
+    model.uncountable = stage.key(root + QStringLiteral("\\first"));
+    stage.select_key(root);
+    stage.return_to(*stage.keys);
+    DialogHand hand;
+    hand.then_press(QMessageBox::Ok);
+    model.fails = true;
+    QTest::keyClick(stage.keys, Qt::Key_Asterisk);
+    model.fails = false;
+    QTRY_VERIFY(hand.is_done());
+    QCOMPARE(hand.text, QStringLiteral("The key \"%1\\first\" cannot be read: not now").arg(root));
+    QVERIFY(!stage.keys->isExpanded(model.uncountable));
+    QVERIFY(stage.keys->isExpanded(stage.key(root + QStringLiteral("\\second"))));
+    QVERIFY(hand.nothing_comes());
 }
 
 void KeysViewTest::an_asterisk_on_a_hive_without_end_ends() {

@@ -73,6 +73,18 @@ void put_back(const Scene& scene, const QByteArray& bytes) {
     QCOMPARE(file.write(bytes), bytes.size());
 }
 
+// Counts the paints that a widget is asked for.
+class PaintCount : public QObject {
+public:
+    explicit PaintCount(QWidget* widget) { widget->installEventFilter(this); }
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        paints += event->type() == QEvent::Paint ? 1 : 0;
+        return QObject::eventFilter(watched, event);
+    }
+
+    int paints = 0;
+};
+
 }  // namespace
 
 class LostKeyTest : public QObject {
@@ -171,6 +183,26 @@ private slots:
         QTRY_COMPARE(stage.values->model()->rowCount(), 0);
         stage.window.repaint();
         QVERIFY(hand.nothing_comes());
+    }
+
+    void what_was_not_painted_for_a_failure_that_has_passed_is_painted_then() {
+        Scene scene(large());
+        const QByteArray sound = scene.bytes();
+        Stage stage(scene);
+        stage.select_key(alpha);
+        QCoreApplication::processEvents();
+        QWidget* header = stage.values->horizontalHeader()->viewport();
+        for (QWidget* part : {header, stage.values->viewport()}) {
+            lose_alpha(stage, scene);
+            // No box: what one covers is painted again for it.
+            FailureReport::instance().told_elsewhere(alpha, QStringLiteral("ROpenSubKey failed"));
+            part->repaint();
+            put_back(scene, sound);
+            forget_everything(stage);
+            PaintCount count(part);
+            QTRY_VERIFY(count.paints > 0);
+            QCOMPARE(stage.values->model()->rowCount(), 3);
+        }
     }
 
     void a_gesture_in_the_table_is_about_the_key_that_it_shows_data() {
