@@ -3,7 +3,7 @@
 //
 // One read of the hive's file that fails while the tree is browsed: every key is shown whole afterwards, or says that
 // it cannot be read, also to a search.
-#include "read_faults.h"
+#include "file_faults.h"
 #include "searched.h"
 
 #include "reg_key.h"

@@ -5,8 +5,8 @@
 // whether nothing was changed, half of it was, or the key cannot be read any more, models and view agree with the key
 // afterwards.
 #include "alloc_faults.h"
+#include "file_faults.h"
 #include "hive_on_disk.h"
-#include "read_faults.h"
 
 #include "reg_hive.h"
 #include "reg_key.h"

@@ -17,7 +17,9 @@
 
 #include <csignal>
 #include <functional>
+#include <set>
 #include <stdexcept>
+#include <string>
 
 namespace {
 
@@ -77,14 +79,113 @@ private:
     void (*handler_)(int);
 };
 
-// Makes values "0", "1", ... and keys beside them until it is killed; a byte goes into the pipe after each value.
+// What change_until_killed does, one change after the other, and what there is afterwards. Every second key and value
+// that it made goes again.
+constexpr int steps_of_a_round = 7;
+
+QString text_of(const char* what, int number) { return QString::fromLatin1(what) + QString::number(number); }
+
+bool change_once(const Opened& open, int step) {
+    RegKey* const alpha = open.alpha();
+    const int round = step / steps_of_a_round;
+    const bool goes = round % 2 == 1;
+    const auto row_of = [&](const QString& name) {
+        int row = 0;
+        while (open.parent->child(row)->name() != name)
+            row++;
+        return row;
+    };
+    const QString key = text_of("key ", round);
+    switch (step % steps_of_a_round) {
+    case 0:
+        return alpha->set_dword_value(text_of("value ", round), static_cast<uint>(round), dword_order);
+    case 1:
+        return alpha->rename_value(alpha->value_count() - 1, text_of("renamed ", round));
+    case 2:
+        return open.parent->new_key() >= 0;
+    case 3:
+        return open.parent->rename_key(row_of(QStringLiteral("New Key #1")), key) >= 0;
+    case 4:
+        return static_cast<RegKey*>(open.parent->child(row_of(key)))
+            ->set_binary_value(QStringLiteral("v"), QByteArray(50, 'n'), type_binary);
+    case 5:
+        return !goes || alpha->delete_value(alpha->value_count() - 1);
+    default:
+        return !goes || open.parent->delete_key(row_of(key));
+    }
+}
+
+// "NAME" of a key, "KEY|NAME" of a value, of what change_until_killed makes.
+std::set<std::string> made_by(int steps) {
+    std::set<std::string> made;
+    for (int step = 0; step < steps; step++) {
+        const std::string number = std::to_string(step / steps_of_a_round);
+        const bool goes = step / steps_of_a_round % 2 == 1;
+        switch (step % steps_of_a_round) {
+        case 0:
+            made.insert("alpha|value " + number);
+            break;
+        case 1:
+            made.erase("alpha|value " + number);
+            made.insert("alpha|renamed " + number);
+            break;
+        case 2:
+            made.insert("New Key #1");
+            break;
+        case 3:
+            made.erase("New Key #1");
+            made.insert("key " + number);
+            break;
+        case 4:
+            made.insert("key " + number + "|v");
+            break;
+        case 5:
+            if (goes)
+                made.erase("alpha|renamed " + number);
+            break;
+        default:
+            if (goes) {
+                made.erase("key " + number);
+                made.erase("key " + number + "|v");
+            }
+        }
+    }
+    return made;
+}
+
+// What is there beside some_keys(), in the same form; what does not read as it was stored has "?" behind it.
+std::set<std::string> made_in(const testkit::Hive& hive) {
+    std::set<std::string> made;
+    for (const testkit::Key& key : hive.find("Parent")->children) {
+        const std::string name = testkit::utf8(key.name);
+        if (name != "alpha" && name != "beta" && name != "gamma")
+            made.insert(name);
+        for (const testkit::Value& value : key.values) {
+            const std::string value_name = testkit::utf8(value.name);
+            const size_t blank = value_name.find(' ');
+            if (blank == std::string::npos && name.find(' ') == std::string::npos)
+                continue;  // was there before
+            testkit::Bytes stored(50, 'n');
+            if (name == "alpha") {
+                stored.assign(4, 0);
+                testkit::set32(stored, 0, static_cast<uint32_t>(std::stoul(value_name.substr(blank + 1))));
+            }
+            made.insert(name + "|" + value_name + (value.data == stored ? "" : "?"));
+        }
+    }
+    return made;
+}
+
+// The rules that a change which was stopped may leave broken.
+bool may_be_left(const std::string& rule) {
+    return rule == "count" || rule == "parent" || rule == "references" || rule == "ring";
+}
+
+// A byte goes into the pipe after each change.
 [[noreturn]] void change_until_killed(const QString& path, int pipe) {
     const Opened open(path);
-    for (uint i = 0;; i++) {
-        const bool stored = open.alpha()->set_dword_value(QString::number(i), i, dword_order);
-        if (!stored || write(pipe, "", 1) != 1)
-            _exit(1);
-        if (i % 7 == 0 && open.parent->new_key() < 0)
+    for (int step = 0;; step++) {
+        if (!change_once(open, step) || write(pipe, "", 1) != 1)
             _exit(1);
     }
 }
@@ -110,6 +211,13 @@ QStringList browse(RegKey* key) {
         attempt([&] { troubles += browse(static_cast<RegKey*>(key->child(i))); });
     }
     return troubles;
+}
+
+QStringList names_below(RegKey* key) {
+    QStringList names;
+    for (int i = 0; i < key->child_count(); i++)
+        names.append(key->child(i)->name());
+    return names;
 }
 
 }  // namespace
@@ -159,7 +267,7 @@ private slots:
     }
 
     void killed_at_any_time_it_has_lost_nothing_finished() {
-        for (const int wanted : {1, 2, 10, 100, 700}) {
+        for (const int wanted : {1, 2, 3, 4, 5, 6, 7, 13, 14, 100, 701, 1500}) {
             const HiveOnDisk file(some_keys());
             int ends[2];
             QCOMPARE(pipe(ends), 0);
@@ -179,13 +287,19 @@ private slots:
                 finished++;
             close(ends[0]);
 
-            for (int i = 0; i < finished; i++) {
-                const auto number = static_cast<uint32_t>(i);
-                const QByteArray stored = file.stored("Parent\\alpha", std::to_string(i));
-                QCOMPARE(stored, QByteArray(reinterpret_cast<const char*>(&number), sizeof number));
-            }
+            // The change that was stopped has left the one, the other, or for a time both.
+            const std::set<std::string> before = made_by(finished);
+            const std::set<std::string> after = made_by(finished + 1);
+            const std::set<std::string> found = made_in(file.read());
+            for (const std::string& made : before)
+                QVERIFY2(found.count(made) != 0 || after.count(made) == 0, made.c_str());
+            for (const std::string& made : found)
+                QVERIFY2(before.count(made) != 0 || after.count(made) != 0, made.c_str());
+            for (const testkit::Fault& fault : testkit::check_hive(file.bytes()).faults)
+                QVERIFY2(may_be_left(fault.rule), (fault.rule + ": " + fault.text).c_str());
             QCOMPARE(file.stored("Parent\\beta", "bytes").size(), 900);
             Opened again(file.path());
+            QVERIFY(browse(again.hive.root_key()).isEmpty());
             QVERIFY(again.alpha()->set_dword_value(QStringLiteral("after"), 1, dword_order));
         }
     }
@@ -209,6 +323,37 @@ private slots:
         Opened open(file.path());
         QVERIFY(open.alpha()->set_binary_value(QStringLiteral("new"), QByteArray(50000, 'n'), type_binary));
         QCOMPARE(file.stored("Parent\\alpha", "new"), QByteArray(50000, 'n'));
+    }
+
+    void a_full_disk_refuses_new_keys_and_names_and_harms_nothing() {
+        testkit::HiveLayout layout = some_keys();
+        layout.no_free_space = true;
+        const testkit::Bytes start = testkit::lay_out(layout).bytes;
+        const std::vector<std::function<bool(const Opened&)>> changes = {
+            [](const Opened& open) { return open.parent->new_key() >= 0; },
+            [](const Opened& open) { return open.parent->rename_key(1, QStringLiteral("zeta")) >= 0; },
+            [](const Opened& open) { return open.alpha()->rename_value(1, QStringLiteral("title")); },
+        };
+        for (const auto& change : changes) {
+            const HiveOnDisk tried(start);
+            const Opened open(tried.path());
+            for (const qint64 room : {qint64(0), qint64(1), qint64(100), qint64(512), qint64(4095)}) {
+                {
+                    const SizeLimit limit(static_cast<qint64>(start.size()) + room);
+                    QVERIFY(!change(open));
+                }
+                QCOMPARE(testkit::diff(start, tried.bytes()), std::vector<std::string>());
+                QVERIFY2(tried.faults().empty(), tried.faults().c_str());
+                QVERIFY(browse(open.hive.root_key()).isEmpty());
+                QCOMPARE(names_below(open.parent),
+                         QStringList({QStringLiteral("alpha"), QStringLiteral("beta"), QStringLiteral("gamma")}));
+                QCOMPARE(open.alpha()->value_count(), 3);
+            }
+            // A bin, and what the zeros ahead of it may reach beyond it where they were cut off before.
+            const SizeLimit limit(static_cast<qint64>(start.size()) + 4096 + 511);
+            QVERIFY(change(open));
+            QVERIFY2(tried.faults().empty(), tried.faults().c_str());
+        }
     }
 
     void a_file_that_shrinks_while_it_is_open_is_told_and_not_made_up_with_zeros() {

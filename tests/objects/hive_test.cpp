@@ -1,5 +1,6 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
+#include "file_faults.h"
 #include "hive_on_disk.h"
 
 #include "reg_hive.h"
@@ -114,6 +115,39 @@ private slots:
         for (const QString& path : other_paths(hive.path()))
             QCOMPARE(failure(path), QString());
         QCOMPARE(failure(hive.path()), QString());
+    }
+
+    // As on file systems that know no locks: there a file is known by its device and number alone.
+    void a_hive_that_is_open_here_is_not_opened_again_where_files_cannot_be_locked() {
+        for (const int error : {ENOLCK, EOPNOTSUPP, EINVAL, ENOSYS}) {
+            const testkit::LockFaults no_locks(error);
+            const HiveOnDisk hive(many_keys(1));
+            const HiveOnDisk another(many_keys(1));
+            DummyRegKey top(QStringLiteral("TOP"));
+            {
+                const RegHive open(QStringLiteral("HIVE"), hive.path(), &top);
+                QCOMPARE(failure(hive.path()), QStringLiteral("Cannot open file"));
+                for (const QString& path : other_paths(hive.path()))
+                    QCOMPARE(failure(path), QStringLiteral("Cannot open file"));
+                QCOMPARE(open_descriptors(hive.path()), 1);
+                QCOMPARE(failure(another.path()), QString());
+            }
+            for (const QString& path : other_paths(hive.path()))
+                QCOMPARE(failure(path), QString());
+            QVERIFY(no_locks.tried() > 3);
+        }
+    }
+
+    void a_hive_that_could_not_be_loaded_can_be_opened_later_where_files_cannot_be_locked() {
+        const testkit::LockFaults no_locks(ENOLCK);
+        const HiveOnDisk file(testkit::Bytes(5000, 'x'));
+        QCOMPARE(failure(file.path()), QStringLiteral("Cannot load hive"));
+        const testkit::Bytes hive = testkit::lay_out(many_keys(1)).bytes;
+        QFile opened(file.path());
+        QVERIFY(opened.open(QIODevice::ReadWrite | QIODevice::Unbuffered));
+        const auto size = static_cast<qint64>(hive.size());
+        QCOMPARE(opened.write(reinterpret_cast<const char*>(hive.data()), size), size);
+        QCOMPARE(failure(file.path()), QString());
     }
 
     void a_hive_that_another_program_has_locked_is_not_opened() {

@@ -4,8 +4,8 @@
 // Reads of the hive's file that fail while a key is made, renamed or deleted: afterwards no object of the tree stands
 // for another key than before, and a single failure leaves tree and file agreeing. And while a value is made or
 // renamed: no other value takes harm.
+#include "file_faults.h"
 #include "hive_on_disk.h"
-#include "read_faults.h"
 
 #include "reg_hive.h"
 #include "reg_key.h"

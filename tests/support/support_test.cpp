@@ -3,11 +3,15 @@
 
 // The kit itself: a checker that finds nothing is worth nothing, so each of its rules is broken once.
 #include "alloc_faults.h"
+#include "file_faults.h"
 #include "scene.h"
 
 #include <algorithm>
 #include <cstdlib>
+#include <fcntl.h>
 #include <gtest/gtest.h>
+#include <sys/file.h>
+#include <unistd.h>
 
 using namespace testkit;
 
@@ -239,6 +243,84 @@ TEST(Support, allocations_are_measured) {
     EXPECT_GE(faults.peak(), 5000U);
     EXPECT_LT(faults.peak(), 6000U);
     free(second);
+}
+
+// A file without a name, which goes when the test does.
+class File {
+public:
+    File() {
+        char name[] = "/tmp/tallowfen-support-XXXXXX";
+        descriptor = mkstemp(name);
+        unlink(name);
+    }
+    ~File() { close(descriptor); }
+    File(const File&) = delete;
+    File& operator=(const File&) = delete;
+
+    off_t size() const { return lseek(descriptor, 0, SEEK_END); }
+
+    int descriptor;
+};
+
+TEST(Support, a_write_to_a_file_fails_when_told) {
+    const File file;
+    int ends[2];
+    ASSERT_EQ(pipe(ends), 0);
+    {
+        const WriteFaults faults(2, false, EIO);
+        EXPECT_EQ(write(file.descriptor, "12", 2), 2);
+        EXPECT_EQ(write(ends[1], "34", 2), 2);
+        EXPECT_FALSE(faults.failed());
+        errno = 0;
+        EXPECT_EQ(write(file.descriptor, "56", 2), -1);
+        EXPECT_EQ(errno, EIO);
+        EXPECT_TRUE(faults.failed());
+        EXPECT_EQ(write(file.descriptor, "789", 3), 3);
+        EXPECT_EQ(faults.writes(), 3);
+    }
+    EXPECT_EQ(file.size(), 5);
+    {
+        const WriteFaults faults(2, true);
+        EXPECT_EQ(write(file.descriptor, "1", 1), 1);
+        for (int i = 0; i < 3; ++i)
+            EXPECT_EQ(write(file.descriptor, "2", 1), -1);
+        EXPECT_EQ(errno, ENOSPC);
+    }
+    EXPECT_EQ(file.size(), 6);
+    EXPECT_EQ(write(file.descriptor, "2", 1), 1);
+    close(ends[0]);
+    close(ends[1]);
+}
+
+TEST(Support, a_file_takes_half_of_a_write_when_told) {
+    const File file;
+    for (const bool lasting : {false, true}) {
+        const WriteFaults faults(1, lasting, ENOSPC, true);
+        EXPECT_EQ(write(file.descriptor, "12345", 5), 2);
+        EXPECT_EQ(write(file.descriptor, "345", 3), -1);
+        EXPECT_EQ(write(file.descriptor, "345", 3), lasting ? -1 : 3);
+    }
+    EXPECT_EQ(file.size(), 7);
+    const WriteFaults faults(1, false, ENOSPC, true);
+    EXPECT_EQ(write(file.descriptor, "1", 1), -1);  // has no half
+}
+
+TEST(Support, reads_and_locks_fail_when_told) {
+    const File file;
+    EXPECT_EQ(flock(file.descriptor, LOCK_EX | LOCK_NB), 0);
+    {
+        LockFaults faults(ENOLCK);
+        EXPECT_EQ(flock(file.descriptor, LOCK_EX | LOCK_NB), -1);
+        EXPECT_EQ(errno, ENOLCK);
+        EXPECT_EQ(faults.tried(), 1);
+    }
+    EXPECT_EQ(flock(file.descriptor, LOCK_EX | LOCK_NB), 0);
+    char byte = 0;
+    const ReadFaults faults(2);
+    EXPECT_EQ(read(file.descriptor, &byte, 1), 0);
+    EXPECT_EQ(read(file.descriptor, &byte, 1), -1);
+    EXPECT_EQ(errno, EIO);
+    EXPECT_EQ(read(file.descriptor, &byte, 1), 0);
 }
 
 }  // namespace
