@@ -331,13 +331,22 @@ bool RegKey::delete_key(int index) {
     // Where a damaged hive lists the key, or keys below it, in other places too, handles from there would go on leading
     // to cells that become other keys'.
     hive_->clear_handle_cache();
-    if (!is_deleted)
+    // One that failed may have gone as far as the list.
+    if (!is_deleted && !lists_one_less())
         return false;
     hive_->note_freed(offset);
     const auto slot = children_.begin() + index;
     const std::unique_ptr<AbstractRegKey> gone(*slot);
     children_.erase(slot);
     return true;
+}
+
+bool RegKey::lists_one_less() const {
+    try {
+        return subkey_count(hive_->key_handle(this)) + 1 == children_.size();
+    } catch (const std::runtime_error&) {
+        return false;
+    }
 }
 
 bool RegKey::can_delete_tree(int index) {

@@ -87,7 +87,8 @@ public:
 
     // Makes a subkey "New Key #%i" with the lowest free number; returns its position, negative on failure.
     int new_key();
-    // Deletes the index-th subkey, which must have none itself. false: refused, or a read or write failed.
+    // Deletes the index-th subkey, which must have none itself. false: refused, or a read or write failed, and the key
+    // is still there.
     bool delete_key(int index);
     // Whether the index-th subkey can be deleted with all below it. Changes nothing.
     bool can_delete_tree(int index);
@@ -132,6 +133,8 @@ private:
     bool agrees_below(int index);
     // Whether there is a slot for each subkey that the engine counts, so that its positions are those of the slots.
     bool slots_agree(RegistryKey* handle) const;
+    // Whether the engine, asked anew, counts one subkey less than there are slots; not where it cannot be asked.
+    bool lists_one_less() const;
     int find_child_position(RegistryKey* handle, const QByteArray& name);
     bool store_value(const QString& name, uint type, const QByteArray& data, int index);
 

@@ -145,9 +145,19 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
         return false;
     if (is_synthetic(index.row()))
         return make_default(index, value);
-    if (!change_source([&] { return sourceModel()->setData(mapToSource(index), value, role); }))
+    const bool is_rename = index.column() == ValuesModel::NameColumn;
+    const int rows = rowCount();
+    const QVariant name = is_rename ? data(index, Qt::DisplayRole) : QVariant();
+    if (!change_source([&] { return sourceModel()->setData(mapToSource(index), value, role); })) {
+        // A rename that failed may have moved the value to the end of its list, beside the one of the new name or
+        // alone.
+        if (is_rename && (rowCount() != rows || data(index, Qt::DisplayRole) != name)) {
+            ask_for_default();
+            sort(ValuesModel::NameColumn, Qt::AscendingOrder);
+        }
         return false;
-    if (index.column() == ValuesModel::NameColumn) {
+    }
+    if (is_rename) {
         move_to_end(index.row());
         ask_for_default();
     }
@@ -252,8 +262,8 @@ bool ValuesProxyModel::removeRows(int row, int count, const QModelIndex& parent)
     if (values == nullptr || !values->can_remove(source))
         return false;
     const bool removed = remove_from_source(row, source);
-    if (removed)
-        sort(ValuesModel::NameColumn, Qt::AscendingOrder);
+    // One that failed may have moved the value to the end of its list.
+    sort(ValuesModel::NameColumn, Qt::AscendingOrder);
     return removed;
 }
 

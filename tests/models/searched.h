@@ -13,7 +13,7 @@
 inline QString path_of(const QModelIndex& index) {
     QStringList names;
     for (QModelIndex up = index; up.isValid(); up = up.parent())
-        names.prepend(up.data().toString());
+        names.prepend(up.data(Qt::AccessibleTextRole).toString());
     return names.join(QLatin1Char('/'));
 }
 
@@ -24,7 +24,8 @@ inline QModelIndex key_below(const RegModel& model, const QModelIndex& start, co
     for (const QString& name : names) {
         QModelIndex found;
         for (int row = 0; row < model.rowCount(here); row++) {
-            if (model.index(row, 0, here).data().toString() == name)
+            // Also beside a key that cannot be read.
+            if (model.index(row, 0, here).data(Qt::AccessibleTextRole).toString() == name)
                 found = model.index(row, 0, here);
         }
         here = found;

@@ -6,17 +6,10 @@
 // afterwards.
 #include "alloc_faults.h"
 #include "file_faults.h"
-#include "hive_on_disk.h"
+#include "shown_values.h"
 
-#include "reg_hive.h"
-#include "reg_key.h"
-#include "values_model.h"
-#include "values_proxy_model.h"
-
-#include <QHeaderView>
 #include <QRegularExpression>
 #include <QSet>
-#include <QTableView>
 #include <QTest>
 
 #include <functional>
@@ -44,78 +37,6 @@ testkit::HiveLayout layout() {
 }
 
 enum Key { Bare, Full, Wide, WithDefault };
-
-// How often a model has begun to tell of new or lost rows, and not ended.
-struct Told {
-    int begun = 0;
-    int open = 0;
-
-    explicit Told(const QAbstractItemModel& model) {
-        const auto begin = [this] {
-            begun++;
-            open++;
-        };
-        const auto end = [this] { open--; };
-        QObject::connect(&model, &QAbstractItemModel::rowsAboutToBeInserted, &model, begin);
-        QObject::connect(&model, &QAbstractItemModel::rowsInserted, &model, end);
-        QObject::connect(&model, &QAbstractItemModel::rowsAboutToBeRemoved, &model, begin);
-        QObject::connect(&model, &QAbstractItemModel::rowsRemoved, &model, end);
-    }
-};
-
-struct Shown {
-    HiveOnDisk file{layout()};
-    DummyRegKey top{QStringLiteral("TOP")};
-    RegHive hive{QStringLiteral("HIVE"), file.path(), &top};
-    RegKey* key;
-    ValuesModel source;
-    ValuesProxyModel proxy;
-    Told of_the_source{source};  // ahead of the views, which may throw when they are told
-    Told of_the_table{proxy};
-    QTableView source_view;
-    QTableView view;
-
-    explicit Shown(int number) : key(static_cast<RegKey*>(hive.root_key()->child(number))), source(key) {
-        proxy.setSourceModel(&source);
-        proxy.sort(0, Qt::AscendingOrder);
-        source_view.setModel(&source);
-        view.setModel(&proxy);
-    }
-    ~Shown() { view.setModel(nullptr); }
-
-    QStringList names() const {
-        QStringList all;
-        for (int row = 0; row < proxy.rowCount(); row++)
-            all.append(proxy.index(row, 0).data().toString());
-        return all;
-    }
-
-    // What does not agree. A row that was to be inserted is announced by the source whether it comes or not, which is
-    // for the table's model to put right.
-    QString wrong(bool is_insertion) {
-        QStringList names;
-        for (int row = 0; row < key->value_count(); row++)
-            names.append(key->value_name(row).value_or(QStringLiteral("?")));
-        if (!is_insertion && source_view.verticalHeader()->count() != names.size())
-            return QStringLiteral("rows of the source");
-        for (int row = 0; row < names.size(); row++) {
-            if (source.index(row, 0).data().toString() !=
-                (names[row].isEmpty() ? QStringLiteral("(Default)") : names[row]))
-                return QStringLiteral("a name of the source");
-        }
-        const int rows = static_cast<int>(names.size()) + (names.contains(QString()) ? 0 : 1);
-        if (proxy.rowCount() != rows || view.verticalHeader()->count() != rows)
-            return QStringLiteral("rows of the table");
-        QSet<int> shown;
-        for (int row = 0; row < rows; row++)
-            shown.insert(proxy.mapToSource(proxy.index(row, 0)).row());
-        if (shown.size() != rows)
-            return QStringLiteral("a row shown twice");
-        if (view.currentIndex().row() < 0 || view.currentIndex().row() >= rows)
-            return QStringLiteral("the current row");
-        return QString();
-    }
-};
 
 // As if so many other keys were read that the key has to be opened again for everything.
 class ForgottenModel : public ValuesModel {
@@ -166,7 +87,8 @@ void drop_handles(Shown& shown, Drops when) {
 // Makes an attempt on a hive of its own, letting the nth request for memory or read fail, alone or with all that
 // follow it. Whether one failed.
 bool fails_at(int nth, bool lasting, const Attempt& attempt, Outcomes& outcomes) {
-    Shown shown(attempt.key);
+    HiveOnDisk file(layout());
+    Shown shown(file, attempt.key);
     shown.view.setCurrentIndex(shown.proxy.index(attempt.current, 0));
     const int rows = shown.source.rowCount();
     const QStringList names = shown.names();
@@ -267,7 +189,8 @@ private slots:
         int told_whole = 0;
         bool failed = true;
         for (uint64_t nth = 1; failed; nth++) {
-            Shown shown(Bare);
+            HiveOnDisk file(layout());
+            Shown shown(file, Bare);
             ForgottenModel model(shown.key, shown.hive);
             const Told told(model);
             bool thrown = false;
@@ -306,7 +229,8 @@ private slots:
         int misled = 0;
         bool failed = true;
         for (int nth = 1; failed; nth++) {
-            Shown shown(WithDefault);
+            HiveOnDisk file(layout());
+            Shown shown(file, WithDefault);
             const testkit::Bytes before = shown.file.bytes();
             ValuesProxyModel proxy;
             {
@@ -343,7 +267,8 @@ private slots:
         int empty = 0;
         bool failed = true;
         for (int nth = 1; failed; nth++) {
-            Shown shown(Wide);
+            HiveOnDisk file(layout());
+            Shown shown(file, Wide);
             const int rows = shown.source.rowCount();
             {
                 const testkit::ReadFaults faults(nth);
@@ -369,7 +294,8 @@ private slots:
         for (int column = 0; column < 3; column++) {
             bool failed = true;
             for (int nth = 1; failed; nth++) {
-                const Shown shown(Wide);
+                HiveOnDisk file(layout());
+                const Shown shown(file, Wide);
                 const QModelIndex cell = shown.proxy.index(2, column);
                 const testkit::ReadFaults faults(nth, true);
                 const QVariant text = cell.data(Qt::AccessibleTextRole);

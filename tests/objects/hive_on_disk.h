@@ -17,10 +17,14 @@
 class HiveOnDisk {
 public:
     explicit HiveOnDisk(const testkit::HiveLayout& layout) : HiveOnDisk(testkit::lay_out(layout).bytes) {}
-    explicit HiveOnDisk(const testkit::Bytes& bytes) {
+    explicit HiveOnDisk(const testkit::Bytes& bytes) { put(bytes); }
+
+    // Makes these the file's bytes, while no hive has it open.
+    void put(const testkit::Bytes& bytes) {
         QFile file(path());
         const auto size = static_cast<qint64>(bytes.size());
-        if (!file.open(QIODevice::WriteOnly) || file.write(reinterpret_cast<const char*>(bytes.data()), size) != size)
+        if (!file.open(QIODevice::ReadWrite) || file.write(reinterpret_cast<const char*>(bytes.data()), size) != size ||
+            !file.resize(size))
             qFatal("the hive cannot be written");
     }
 
