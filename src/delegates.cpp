@@ -23,6 +23,12 @@ void report_key_failure(const QModelIndex& index, const std::exception& failure)
     FailureReport::instance().report_row(key_path_of(index), failure);
 }
 
+// In place of a text that cannot be had.
+void say_unreadable(QStyleOptionViewItem& option) {
+    option.features |= QStyleOptionViewItem::HasDisplay;
+    option.text = QCoreApplication::translate("KeyDelegate", "(cannot be read)");
+}
+
 }  // namespace
 
 NameDelegate::NameDelegate(QWidget* main_window) : main_window_(main_window) {
@@ -130,6 +136,7 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
             option->direction = Qt::LeftToRight;
         }
     } catch (const std::exception& failure) {
+        say_unreadable(*option);
         report_value_failure(failure);
     }
 }
@@ -161,8 +168,7 @@ void KeyDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelInde
     try {
         QStyledItemDelegate::initStyleOption(option, index);
     } catch (const std::exception& failure) {
-        option->features |= QStyleOptionViewItem::HasDisplay;
-        option->text = tr("(cannot be read)");
+        say_unreadable(*option);
         report_key_failure(index, failure);
     }
 }

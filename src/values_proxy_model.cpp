@@ -99,10 +99,14 @@ QModelIndex ValuesProxyModel::mapFromSource(const QModelIndex& source_index) con
 QVariant ValuesProxyModel::spoken_data(const QModelIndex& index) const {
     try {
         const QVariant datum = data(index, Qt::DisplayRole);
-        return datum.isValid() ? value_text(datum) : QVariant();
+        if (datum.isValid())
+            return value_text(datum);
+        if (index.column() != ValuesModel::NameColumn)
+            return QVariant();
     } catch (const std::exception&) {
-        return QCoreApplication::translate("KeyDelegate", "(cannot be read)");
+        // said below
     }
+    return QCoreApplication::translate("KeyDelegate", "(cannot be read)");
 }
 
 QVariant ValuesProxyModel::data(const QModelIndex& index, int role) const {

@@ -234,8 +234,8 @@ def values(scratch):
         session.message(TITLE, told, "OK", "damaged-values")
         program.alone(TITLE)
         names = session.names()
-        equal(names, ["(Default)"] + [""] * (len(names) - 1 - len(sound)) + sorted(sound), "the names")
-        equal(session.rows()[1], ["", UNREADABLE, UNREADABLE], "a value that cannot be read")
+        equal(names, ["(Default)"] + [UNREADABLE] * (len(names) - 1 - len(sound)) + sorted(sound), "the names")
+        equal(session.rows()[1], [UNREADABLE] * 3, "a value that cannot be read")
 
         def focused(*cell):
             until(lambda: has(program.table_cell(session.table, *cell), State.FOCUSED), f"the cell {cell}")

@@ -306,9 +306,9 @@ private slots:
                 failed = faults.failed();
             }
         }
-        const QSet<QString> expected = {QStringLiteral("0: value 1"), QStringLiteral("1: REG_BINARY"),
-                                        QStringLiteral("1: (cannot be read)"), QStringLiteral("2: 01 08 0f 16 1d 2"),
-                                        QStringLiteral("2: (cannot be read)")};
+        const QSet<QString> expected = {QStringLiteral("0: value 1"),          QStringLiteral("0: (cannot be read)"),
+                                        QStringLiteral("1: REG_BINARY"),       QStringLiteral("1: (cannot be read)"),
+                                        QStringLiteral("2: 01 08 0f 16 1d 2"), QStringLiteral("2: (cannot be read)")};
         QCOMPARE(spoken, expected);
     }
 

@@ -273,6 +273,17 @@ void DelegatesTest::a_damaged_cell_is_told_once_and_not_through_the_paint() {
     QCOMPARE(hand.title, QStringLiteral("Registry Editor"));
     QCOMPARE(hand.text, QStringLiteral("The key \"TOP\\HIVE\\damaged\" cannot be read: index"));
 
+    // A cell says so itself.
+    class Painted : public ValueDelegate {
+    public:
+        using ValueDelegate::initStyleOption;
+        using ValueDelegate::ValueDelegate;
+    };
+    QStyleOptionViewItem shown;
+    Painted(&table).initStyleOption(&shown, model.index(0, 1));
+    QCOMPARE(shown.text, QStringLiteral("(cannot be read)"));
+    QVERIFY(shown.features & QStyleOptionViewItem::HasDisplay);
+
     // Nine cells, painted twice: no further box.
     table.viewport()->repaint();
     QVERIFY(hand.nothing_comes());
