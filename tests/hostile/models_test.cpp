@@ -313,6 +313,39 @@ private slots:
         QVERIFY(!read_tree(again).empty());
     }
 
+    void deepest_chain_data() {
+        QTest::addColumn<QByteArray>("name");
+        QTest::addColumn<bool>("goes");
+        QTest::newRow("512 keys: shown and deleted whole") << QByteArray("keys_512_deep") << true;
+        QTest::newRow("513 keys: shown down to the limit, none deleted") << QByteArray("keys_513_deep") << false;
+    }
+
+    // One key below another.
+    void deepest_chain() {
+        QFETCH(QByteArray, name);
+        QFETCH(bool, goes);
+        const testkit::Bytes bytes = hostile::case_of(name.toStdString()).bytes;
+        Mounted mounted(bytes);
+        const QModelIndex top = mounted.model.index(0, 0, mounted.model.index(0, 0, mounted.model.index(0, 0)));
+        QModelIndex deepest = top;
+        int levels = 1;
+        for (; mounted.model.rowCount(deepest) > 0; levels++)
+            deepest = mounted.model.index(0, 0, deepest);
+        QCOMPARE(levels, 512);
+        QCOMPARE(deepest.data().toString(), QStringLiteral("k"));
+        read_values(mounted, deepest);
+        mounted.meet(deepest, [&] { mounted.model.new_key(deepest); });
+        QCOMPARE(mounted.model.rowCount(deepest), 0);
+        QVERIFY(mounted.file.bytes() == bytes);
+
+        QCOMPARE(mounted.model.removeRows(0, 1, top), goes);
+        QCOMPARE(mounted.model.rowCount(top), goes ? 0 : 1);
+        QCOMPARE(mounted.file.bytes() == bytes, !goes);
+        QCOMPARE(mounted.file.read().root.children.at(0).children.empty(), goes);
+        const auto faults = testkit::new_faults(testkit::check_hive(bytes), testkit::check_hive(mounted.file.bytes()));
+        QCOMPARE(testkit::text_of(faults), std::string());
+    }
+
     // However many values share the data of one, and however much more memory it takes than it is stored in.
     void data_that_many_values_share_is_held_within_bounds() {
         constexpr int count = 40;

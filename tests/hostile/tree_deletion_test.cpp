@@ -93,6 +93,39 @@ std::string name_of(const testing::TestParamInfo<size_t>& row) {
 
 INSTANTIATE_TEST_SUITE_P(Catalogue, Trees, testing::Range(size_t{0}, catalogue().size()), name_of);
 
+// One key below another, down to the deepest that there may be, and one more.
+TEST(DeepTree, of_512_levels_may_be_deleted_and_is) {
+    Scene scene(case_of("keys_512_deep").bytes);
+    ASSERT_TRUE(scene.is_open());
+    {
+        Handle top = scene.OpenKey("k");
+        ASSERT_TRUE(top);
+        EXPECT_EQ(RCheckDeleteTree(top.get(), 0), R_SUCCESS);
+        EXPECT_TRUE(scene.Untouched());
+        EXPECT_EQ(delete_tree(top.get(), 0), R_SUCCESS);
+    }
+    EXPECT_EQ(scene.Check(), "");
+    EXPECT_EQ(scene.Read().root.children.at(0).children.size(), 0U);
+}
+
+TEST(DeepTree, that_goes_deeper_is_not_deleted_from_wherever_it_is_asked) {
+    for (const char* name : {"keys_513_deep", "keys_10000_deep"}) {
+        SCOPED_TRACE(name);
+        Scene scene(case_of(name).bytes);
+        ASSERT_TRUE(scene.is_open());
+        std::vector<uint32_t> way;
+        for (uint32_t level = 1; level < 512; level++) {
+            way.push_back(0);
+            if (level > 2 && level < 509 && level % 100 != 0)
+                continue;
+            Handle parent = follow(scene, way);
+            ASSERT_TRUE(parent) << level;
+            EXPECT_EQ(RCheckDeleteTree(parent.get(), 0), R_FAILED) << level;
+        }
+        EXPECT_TRUE(scene.Untouched());
+    }
+}
+
 }  // namespace
 
 }  // namespace hostile
