@@ -327,15 +327,15 @@ private slots:
         const testkit::Bytes bytes = hostile::case_of(name.toStdString()).bytes;
         Mounted mounted(bytes);
         const QModelIndex top = mounted.model.index(0, 0, mounted.model.index(0, 0, mounted.model.index(0, 0)));
-        QModelIndex deepest = top;
+        QModelIndex bottom = top;
         int levels = 1;
-        for (; mounted.model.rowCount(deepest) > 0; levels++)
-            deepest = mounted.model.index(0, 0, deepest);
+        for (; mounted.model.rowCount(bottom) > 0; levels++)
+            bottom = mounted.model.index(0, 0, bottom);
         QCOMPARE(levels, 512);
-        QCOMPARE(deepest.data().toString(), QStringLiteral("k"));
-        read_values(mounted, deepest);
-        mounted.meet(deepest, [&] { mounted.model.new_key(deepest); });
-        QCOMPARE(mounted.model.rowCount(deepest), 0);
+        QCOMPARE(bottom.data().toString(), QStringLiteral("k"));
+        read_values(mounted, bottom);
+        mounted.meet(bottom, [&] { mounted.model.new_key(bottom); });
+        QCOMPARE(mounted.model.rowCount(bottom), 0);
         QVERIFY(mounted.file.bytes() == bytes);
 
         QCOMPARE(mounted.model.removeRows(0, 1, top), goes);
