@@ -346,11 +346,11 @@ private slots:
         QTest::addColumn<bool>("is_full");
         QTest::addColumn<Fails>("way");
         for (const Fails way : all_ways) {
+            const bool is_whole_write = way == Fails::one_write || way == Fails::writes_from_there_on;
             for (int i = 0; i < static_cast<int>(std::size(changes)); i++) {
                 const bool needs_cells = changes[i].new_name != nullptr;
-                const bool is_of_memory = way == Fails::one_request || way == Fails::requests_from_there_on;
                 for (const bool is_full : {false, true}) {
-                    if (is_full && (!needs_cells || is_of_memory))
+                    if (is_full && (!needs_cells || !is_whole_write))
                         continue;
                     QTest::addRow("%s, %s fails%s", changes[i].name, qPrintable(text_of(way)),
                                   is_full ? ", no cell free" : "")

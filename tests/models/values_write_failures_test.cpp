@@ -260,14 +260,14 @@ private slots:
         QTest::addColumn<bool>("is_full");
         QTest::addColumn<Fails>("way");
         for (const Fails way : all_ways) {
-            const bool is_of_memory = way == Fails::one_request || way == Fails::requests_from_there_on;
+            const bool is_whole_write = way == Fails::one_write || way == Fails::writes_from_there_on;
             for (int i = 0; i < static_cast<int>(changes().size()); i++) {
                 const bool is_of_data = changes()[static_cast<size_t>(i)].key == Types;
                 // The other ways differ where a list of values grows or moves.
-                if (is_of_data && way != Fails::one_write && way != Fails::writes_from_there_on)
+                if (is_of_data && !is_whole_write)
                     continue;
                 for (const bool is_full : {false, true}) {
-                    if (is_full && (is_of_memory || is_of_data))
+                    if (is_full && (is_of_data || !is_whole_write))
                         continue;
                     QTest::addRow("%s, %s fails%s", qPrintable(changes()[static_cast<size_t>(i)].name),
                                   qPrintable(text_of(way)), is_full ? ", no cell free" : "")
