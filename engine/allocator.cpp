@@ -84,14 +84,13 @@ void set_checksum(BaseBlock& base) {
     base.checksum = sum;
 }
 
-// Makes the file reach to end, by zeros behind what it has now. Not where it ends inside the bins, having been cut
-// short: the zeros would stand for what was lost there.
-bool lengthen_file(Store& store, int64_t end) {
+// The file's length, at which the device then stands. Less than 0 on failure.
+int64_t seek_end_of_file(Store& store) { return store.io.seek(store.io.device, 0, seek_end); }
+
+// Makes the file reach to end, by zeros behind the length at which the device stands.
+bool lengthen_file(Store& store, int64_t length, int64_t end) {
     constexpr uint32_t block_size = 512;
     const uint8_t zeros[block_size] = {};
-    const int32_t length = store.io.seek(store.io.device, 0, seek_end);
-    if (length < int64_t{base_block_size} + store.bins_size)
-        return false;
     store.window.valid = false;
     for (int64_t reached = length; reached < end; reached += block_size) {
         if (store.io.write(store.io.device, zeros, block_size) != static_cast<int32_t>(block_size))
@@ -145,10 +144,16 @@ bool append_bin(Store& store, uint32_t size) {
         return false;
     const uint32_t bin_size = (size + bin_header_size + cell_head_size + bin_alignment - 1) & ~(bin_alignment - 1);
     const Bin bin = {static_cast<uint32_t>(store.bins_size), bin_size, bin_size - bin_header_size, false, true};
-    const int64_t end = int64_t{base_block_size} + bin.offset + bin.size;
-    // Room in the tables comes first: a bin that counts in the file but not in the table could be laid over.
-    if (end > highest_end || !reserve_bin(store, append_growth) ||
-        !reserve_cells(store, bin.offset + int64_t{bin.size}) || !lengthen_file(store, end) || !lay_bin(store, bin))
+    const int64_t start = int64_t{base_block_size} + bin.offset;
+    const int64_t end = start + bin.size;
+    // Not where the file ends inside the bins, having been cut short: zeros would stand for what was lost there, and
+    // the tables be made for what it merely claims.
+    const int64_t length = seek_end_of_file(store);
+    if (end > highest_end || length < start)
+        return false;
+    // Room in the tables comes before the bin: one that counts in the file but not in the table could be laid over.
+    if (!reserve_bin(store, append_growth) || !reserve_cells(store, bin.offset + int64_t{bin.size}) ||
+        !lengthen_file(store, length, end) || !lay_bin(store, bin))
         return false;
     const uint32_t bins_size = bin.offset + bin.size;
     if (!count_in_base_block(store, bins_size))

@@ -59,14 +59,19 @@ void add_bins(List& list) {
         testkit::set32(d.hive.bytes, base_block_bytes + 8, 8192);
     });
     // The file ends within the free cell that the last bin's header makes so large.
-    list.add("bin_of_two_gigabytes_in_a_file_of_few", Readable::whole, {}, [](Damage& d) {
-        const uint32_t bin = testkit::get32(d.hive.bytes, 40) - 4096;
-        const uint32_t size = 0x7FFF0000 - bin;
-        testkit::set32(d.hive.bytes, base_block_bytes + uint64_t{bin} + 8, size);
-        d.hive.set_cell_size(bin + 32, static_cast<int32_t>(size - 32));
-        d.hive.put_base(40, bin + size);
-        d.hive.fix_checksum();
-    });
+    for (const int in_use : {0, 1}) {
+        const std::string name =
+            in_use == 0 ? "bin_of_two_gigabytes_in_a_file_of_few" : "bin_of_two_gigabytes_in_use_in_a_file_of_few";
+        list.add(name, Readable::whole, {}, [in_use](Damage& d) {
+            const uint32_t bin = testkit::get32(d.hive.bytes, 40) - 4096;
+            const uint32_t size = 0x7FFF0000 - bin;
+            const auto cell = static_cast<int32_t>(size - 32);
+            testkit::set32(d.hive.bytes, base_block_bytes + uint64_t{bin} + 8, size);
+            d.hive.set_cell_size(bin + 32, in_use == 0 ? cell : -cell);
+            d.hive.put_base(40, bin + size);
+            d.hive.fix_checksum();
+        });
+    }
     list.add_on(large_bin, "bin_of_a_megabyte", Readable::whole, {}, [](Damage&) {});
     list.add_on(two_large_bins, "two_bins_of_a_megabyte", Readable::whole, {}, [](Damage&) {});
 }
