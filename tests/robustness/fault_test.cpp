@@ -5,6 +5,7 @@
 #include "alloc_faults.h"
 #include "failure_mode.h"
 #include "operations.h"
+#include "sanitized.h"
 #include "statuses.h"
 
 #include <gtest/gtest.h>
@@ -142,7 +143,12 @@ TEST_P(Faults, NothingElseIsHarmed) {
 }
 
 TEST_P(Faults, NothingElseIsHarmedInRealHives) {
-    for (const auto& [name, bytes] : small_real_hives()) {
+    auto hives = small_real_hives();
+    if (is_sanitized && hives.size() > 1) {  // one will do to show what the sanitizers see
+        std::printf("[ LEFT OUT ] %zu of %zu small real hives\n", hives.size() - 1, hives.size());
+        hives.resize(1);
+    }
+    for (const auto& [name, bytes] : hives) {
         SCOPED_TRACE(name);
         const std::vector<Expectation> all = expectations(bytes, operations_on(bytes));
         EXPECT_GE(all.size(), 7U);
