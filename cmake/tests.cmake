@@ -1,7 +1,8 @@
-# tallowfen_add_test(NAME name LABEL label... [TIMEOUT seconds] COMMAND ...): one CTest entry with the environment that
-# every test gets. The target tests_LABEL builds what the tests of that label start.
+# tallowfen_add_test(NAME name LABEL label... [TIMEOUT seconds] [COST seconds] COMMAND ...): one CTest entry with the
+# environment that every test gets. COST is for one that takes long: it starts ahead of the others, which run beside it.
+# The target tests_LABEL builds what the tests of that label start.
 function(tallowfen_add_test)
-    cmake_parse_arguments(T "" "NAME;TIMEOUT" "LABEL;COMMAND" ${ARGN})
+    cmake_parse_arguments(T "" "NAME;TIMEOUT;COST" "LABEL;COMMAND" ${ARGN})
     add_test(NAME ${T_NAME} COMMAND ${T_COMMAND})
     if(NOT T_TIMEOUT)
         set(T_TIMEOUT 300)
@@ -9,6 +10,9 @@ function(tallowfen_add_test)
     set_tests_properties(${T_NAME} PROPERTIES
         LABELS "${T_LABEL}" TIMEOUT ${T_TIMEOUT}
         ENVIRONMENT "TALLOWFEN_HIVES=${TALLOWFEN_HIVES};QT_QPA_PLATFORM=offscreen;TSAN_OPTIONS=ignore_noninstrumented_modules=1 halt_on_error=1;ASAN_OPTIONS=detect_leaks=1:exitcode=99")
+    if(T_COST)
+        set_tests_properties(${T_NAME} PROPERTIES COST ${T_COST})
+    endif()
     foreach(label IN LISTS T_LABEL)
         if(NOT TARGET tests_${label})
             add_custom_target(tests_${label})
