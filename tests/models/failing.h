@@ -83,3 +83,30 @@ struct WholeChange {
     testkit::Hive after;
     std::vector<std::string> wanted;
 };
+
+enum class Outcome { done, refused, thrown, absent };
+
+// How attempts at changes ended, and the same changes made again.
+struct Tally {
+    int done = 0;
+    int refused = 0;
+    int thrown = 0;
+    int half_done = 0;
+    int done_again = 0;
+    int refused_again = 0;
+
+    // Counts an attempt. Where what was said of it is not what the file has, a text that tells so.
+    QString count(const WholeChange& whole, Outcome outcome, bool has_failed, const testkit::Hive& now) {
+        const bool is_before = testkit::diff(whole.before, now).empty();
+        const bool is_after = testkit::diff(whole.after, now).empty();
+        done += outcome == Outcome::done ? 1 : 0;
+        refused += outcome == Outcome::refused ? 1 : 0;
+        thrown += outcome == Outcome::thrown ? 1 : 0;
+        half_done += !is_before && !is_after ? 1 : 0;
+        if (outcome == Outcome::done && !is_after)
+            return QStringLiteral("is said to be done");
+        if (!has_failed && outcome != Outcome::done)
+            return QStringLiteral("is not done");
+        return QString();
+    }
+};

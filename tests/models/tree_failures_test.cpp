@@ -47,8 +47,6 @@ testkit::HiveLayout layout(bool is_full) {
     return hive;
 }
 
-enum class Outcome { done, refused, thrown, absent };
-
 struct Change {
     const char* name;
     const char* key;                // that is renamed or removed, or given a subkey
@@ -226,15 +224,6 @@ WholeChange undisturbed(const Change& change, HiveOnDisk& file, bool is_full) {
     return {before, file.bytes()};
 }
 
-struct Tally {
-    int done = 0;
-    int refused = 0;
-    int thrown = 0;
-    int half_done = 0;
-    int done_again = 0;
-    int refused_again = 0;
-};
-
 // What is shown and not so.
 QString difference(const QStringList& shown, const QStringList& wanted, bool may_be_unread) {
     if (shown == wanted)
@@ -290,16 +279,11 @@ QString try_again(const Attempt& attempt, Shown& shown, Opened& fresh, Tally& ta
 // What the outcome does not say of the file; empty when all is well.
 QString wrong_outcome(const Attempt& attempt, Outcome outcome, bool has_failed, const testkit::Hive& now,
                       Tally& tally) {
+    const QString wrong = tally.count(attempt.whole, outcome, has_failed, now);
+    if (!wrong.isEmpty())
+        return wrong;
     const bool is_before = testkit::diff(attempt.whole.before, now).empty();
     const bool is_after = testkit::diff(attempt.whole.after, now).empty();
-    tally.done += outcome == Outcome::done ? 1 : 0;
-    tally.refused += outcome == Outcome::refused ? 1 : 0;
-    tally.thrown += outcome == Outcome::thrown ? 1 : 0;
-    tally.half_done += !is_before && !is_after ? 1 : 0;
-    if (outcome == Outcome::done && !is_after)
-        return QStringLiteral("is said to be done");
-    if (!has_failed && outcome != Outcome::done)
-        return QStringLiteral("is not done");
     const bool is_taken_back =
         attempt.way != Fails::writes_from_there_on && attempt.way != Fails::requests_from_there_on;
     if (is_taken_back && attempt.change.is_one_call && !is_before && !is_after)

@@ -43,8 +43,6 @@ testkit::HiveLayout layout(bool is_full) {
 
 enum Key { Bare, Empty, Full, Large, Types };
 
-enum class Outcome { done, refused, thrown, absent };
-
 struct Change {
     QString name;
     int key;
@@ -156,15 +154,6 @@ struct Attempt {
     HiveOnDisk& other_file;  // for whoever opens it then
 };
 
-struct Tally {
-    int done = 0;
-    int refused = 0;
-    int thrown = 0;
-    int half_done = 0;
-    int done_again = 0;
-    int refused_again = 0;
-};
-
 // Rows that the table has and whoever opens the file has not, or the other way round, or in another order.
 QString difference(const Shown& shown, const OpenedValues& fresh, bool is_in_order) {
     QStringList here = rows_of(shown.proxy);
@@ -191,22 +180,6 @@ QString try_again(const Attempt& attempt, Shown& shown, OpenedValues& fresh, Tal
     return other.isEmpty() ? shown.wrong(true) : QStringLiteral("after the next change ") + other;
 }
 
-// What the outcome does not say of the file; empty when all is well.
-QString wrong_outcome(const Attempt& attempt, Outcome outcome, bool has_failed, const testkit::Hive& now,
-                      Tally& tally) {
-    const bool is_before = testkit::diff(attempt.whole.before, now).empty();
-    const bool is_after = testkit::diff(attempt.whole.after, now).empty();
-    tally.done += outcome == Outcome::done ? 1 : 0;
-    tally.refused += outcome == Outcome::refused ? 1 : 0;
-    tally.thrown += outcome == Outcome::thrown ? 1 : 0;
-    tally.half_done += !is_before && !is_after ? 1 : 0;
-    if (outcome == Outcome::done && !is_after)
-        return QStringLiteral("is said to be done");
-    if (!has_failed && outcome != Outcome::done)
-        return QStringLiteral("is not done");
-    return QString();
-}
-
 // What is wrong after the change failed at its nth step; has_failed tells whether it did.
 QString try_change(const Attempt& attempt, int nth, bool& has_failed, Tally& tally) {
     attempt.file.put(attempt.whole.bytes);
@@ -222,7 +195,7 @@ QString try_change(const Attempt& attempt, int nth, bool& has_failed, Tally& tal
     }
     const testkit::Bytes bytes = shown.file.bytes();
     const testkit::Hive now = testkit::read_hive(bytes);
-    QString wrong = wrong_outcome(attempt, outcome, has_failed, now, tally);
+    QString wrong = tally.count(attempt.whole, outcome, has_failed, now);
     if (wrong.isEmpty())
         wrong = attempt.whole.harm(now, false);
     if (wrong.isEmpty())
