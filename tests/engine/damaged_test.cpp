@@ -169,7 +169,6 @@ TEST(Damaged, no_key_is_put_into_a_leaf_of_an_index_root_that_is_another_keys) {
         EXPECT_TRUE(scene.Untouched());
     }
     Scene scene(hive.bytes);
-    const Handle rooted = scene.OpenKey("Rooted");
     EXPECT_EQ(scene.Create("Rooted\\a15"), 0);  // the leaf ahead is the key's own
     EXPECT_EQ(scene.Rename("Rooted\\z2", "z3"), 0);
     EXPECT_EQ(subkey_names(scene.OpenKey("Alpha").get()), (std::vector<std::string>{"Inner", "Other"}));

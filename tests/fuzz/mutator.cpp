@@ -35,8 +35,8 @@ struct Field {
     size_t bytes;  // 2 or 4
 };
 
-// A field of a record, at random: any 2 or 4 bytes of a used cell, but not its size. Now and then any of the file, and
-// the root key's offset.
+// A field of a record, at random: any 2 or 4 bytes of a used cell, but not its size; now and then the root key's
+// offset. Where no used cell is found, any of the file behind the base block.
 Field choose_field(const uint8_t* data, size_t size, std::mt19937& random) {
     constexpr size_t root_offset = 36;
     const size_t width = random() % 2 == 0 ? 4 : 2;
