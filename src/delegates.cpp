@@ -6,7 +6,6 @@
 #include "value_text.h"
 #include "values_model.h"
 
-#include <QCoreApplication>
 #include <QItemEditorFactory>
 #include <QKeyEvent>
 #include <QMetaProperty>
@@ -26,7 +25,7 @@ void report_key_failure(const QModelIndex& index, const std::exception& failure)
 // In place of a text that cannot be had.
 void say_unreadable(QStyleOptionViewItem& option) {
     option.features |= QStyleOptionViewItem::HasDisplay;
-    option.text = QCoreApplication::translate("KeyDelegate", "(cannot be read)");
+    option.text = unreadable_text();
 }
 
 }  // namespace

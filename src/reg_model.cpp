@@ -4,8 +4,8 @@
 
 #include "reg_hive.h"
 #include "reg_key.h"
+#include "value_text.h"
 
-#include <QCoreApplication>
 #include <QIcon>
 #include <QStringList>
 
@@ -87,7 +87,7 @@ QVariant RegModel::spoken_name(const QModelIndex& index) const {
     try {
         return data(index, Qt::DisplayRole);
     } catch (const std::runtime_error&) {
-        return QCoreApplication::translate("KeyDelegate", "(cannot be read)");
+        return unreadable_text();
     }
 }
 

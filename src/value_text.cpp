@@ -66,3 +66,5 @@ QString value_text(const QVariant& value, qsizetype limit) {
     std::printf("fallback: rendering '%s' as string\n", value.typeName());
     return value.toString();
 }
+
+QString unreadable_text() { return QCoreApplication::translate("KeyDelegate", "(cannot be read)"); }

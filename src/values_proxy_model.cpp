@@ -7,7 +7,6 @@
 #include "value_text.h"
 #include "values_model.h"
 
-#include <QCoreApplication>
 #include <QIcon>
 #include <QScopedValueRollback>
 
@@ -106,7 +105,7 @@ QVariant ValuesProxyModel::spoken_data(const QModelIndex& index) const {
     } catch (const std::exception&) {
         // said below
     }
-    return QCoreApplication::translate("KeyDelegate", "(cannot be read)");
+    return unreadable_text();
 }
 
 QVariant ValuesProxyModel::data(const QModelIndex& index, int role) const {
