@@ -16,8 +16,10 @@ using namespace engine;
 
 namespace {
 
-// Makes every missing component of a path. offset and depth are those of the last one.
-bool create_path(RegistryKey& key, const char* path, CellOffset& offset, uint32_t& depth) {
+// Makes every missing component of a path. offset and depth are those of the last one, made says whether it was
+// missing.
+bool create_path(RegistryKey& key, const char* path, CellOffset& offset, uint32_t& depth, bool& made) {
+    made = false;
     offset = key.info->own;
     depth = key.depth;
     for (path = skip_separators(path); *path != '\0'; path = skip_separators(path)) {
@@ -26,8 +28,10 @@ bool create_path(RegistryKey& key, const char* path, CellOffset& offset, uint32_
         if (depth == depth_limit)
             return false;
         CellOffset next = CellOffset::none;
-        if (insert_subkey(*key.store, offset, name, true, next) == Inserted::failed)
+        const Inserted inserted = insert_subkey(*key.store, offset, name, true, next);
+        if (inserted == Inserted::failed)
             return false;
+        made = inserted == Inserted::created;
         offset = next;
         depth++;
         path += length;
@@ -125,13 +129,14 @@ int32_t RCreateKey(RegistryKey* key, const char* path, RegistryKey** out, uint32
         return R_NOT_ENOUGH_MEMORY;
     CellOffset offset;
     uint32_t depth;
-    const bool created = create_path(*key, stored.text(), offset, depth);
+    bool made;
+    const bool created = create_path(*key, stored.text(), offset, depth, made);
     reread_counts(*key);
     if (!created)
         return R_INVALID_PARAMETER;
+    if (out_disposition != nullptr)
+        *out_disposition = made ? 0 : 1;
     const int32_t status = open_handle(*key->store, offset, depth, out);
-    if (status == R_SUCCESS && out_disposition != nullptr)
-        *out_disposition = 0;
     return status == R_FAILED ? int32_t{R_CAN_NOT_COMPLETE} : status;
 }
 

@@ -6,6 +6,47 @@ namespace engine {
 
 namespace {
 
+bool is_listed(Store& store, const SubkeyIndex& index, CellOffset key) {
+    OffsetBatch batch = {};
+    uint32_t i = 0;
+    while (i < index.total && subkey_at(store, index, i, batch) != key)
+        i++;
+    return i < index.total;
+}
+
+// Whether a key lists another. Also true where memory runs out.
+bool lists(Store& store, CellOffset above, CellOffset below) {
+    KeyView upper;
+    SubkeyIndex index;
+    if (!read_key(store, above, upper))
+        return false;
+    if (!load_key_index(store, upper.record, index))
+        return true;
+    const bool listed = is_listed(store, index, below);
+    free_index(index);
+    return listed;
+}
+
+// Whether a key is in the tree: the way up by what the records say leads to the root, each on it listing the one below.
+// The records come first, since most strays end there, or go round in a ring: a list takes far longer to look through.
+// Also true where that cannot be known.
+bool is_reached(Store& store, CellOffset key) {
+    const uint32_t failed = store.failed_reads;
+    CellOffset way[depth_limit];
+    uint32_t levels = 0;
+    for (CellOffset at = key; levels == 0 || way[levels - 1] != store.root;) {
+        KeyView view;
+        if (levels == depth_limit || !read_key(store, at, view))
+            return store.failed_reads != failed;
+        way[levels++] = at;
+        at = cell_offset(view.record.parent);
+    }
+    uint32_t level = 1;
+    while (level < levels && lists(store, way[level], way[level - 1]))
+        level++;
+    return level == levels || store.failed_reads != failed;
+}
+
 uint32_t times_listed(Store& store, const SubkeyIndex& index, CellOffset key) {
     OffsetBatch batch = {};
     uint32_t times = 0;
@@ -14,36 +55,27 @@ uint32_t times_listed(Store& store, const SubkeyIndex& index, CellOffset key) {
     return times;
 }
 
-// Whether the way up from a key by what its record and its parents' say leads to the root past the given parent, each
-// on it listing the one below.
-bool reaches_root_past(Store& store, CellOffset parent, const KeyView& key) {
-    CellOffset below = key.offset();
-    CellOffset above = cell_offset(key.record.parent);
-    if (above == parent)
-        return false;
-    for (uint32_t level = 0; level < depth_limit; level++) {
-        KeyView upper;
-        SubkeyIndex index;
-        if (!read_key(store, above, upper))
-            return false;
-        if (!load_key_index(store, upper.record, index))
-            return true;
-        const bool lists = times_listed(store, index, below) > 0;
-        free_index(index);
-        if (!lists || above == store.root)
-            return lists;
-        below = above;
-        above = cell_offset(upper.record.parent);
-    }
-    return false;
-}
-
 }  // namespace
 
 // A wrong parent in the record alone does no harm and is passed over: a rename that was cut short leaves some.
-bool has_other_parent(Store& store, CellOffset parent, const KeyView& key) {
+bool has_other_parent(Store& store, CellOffset parent, const KeyView& key, StrayParent& last) {
+    const CellOffset above = cell_offset(key.record.parent);
+    if (key.offset() == store.root || above == parent)
+        return key.offset() == store.root;
     const uint32_t failed = store.failed_reads;
-    return key.offset() == store.root || reaches_root_past(store, parent, key) || store.failed_reads != failed;
+    if (last.key != above)
+        last = {above, is_reached(store, above)};
+    return (last.reached && lists(store, above, key.offset())) || store.failed_reads != failed;
+}
+
+bool has_other_parent(Store& store, CellOffset parent, const KeyView& key) {
+    StrayParent last;
+    return has_other_parent(store, parent, key, last);
+}
+
+bool may_be_anothers(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position) {
+    KeyView subkey;
+    return !read_key(store, subkey_at(store, index, position), subkey) || has_other_parent(store, parent, subkey);
 }
 
 bool belongs_elsewhere(Store& store, CellOffset parent, const SubkeyIndex& index, const KeyView& key) {

@@ -17,4 +17,16 @@ bool belongs_elsewhere(Store& store, CellOffset parent, const SubkeyIndex& index
 // The same, but a key that stands in the index twice passes: for a caller that looks at each entry anyway.
 bool has_other_parent(Store& store, CellOffset parent, const KeyView& key);
 
+// The last parent that a subkey's record named in place of the key that lists it, and whether that one is in the tree:
+// of many subkeys that all name it, only the first is asked the whole way up. Holds while nothing above it changes.
+struct StrayParent {
+    CellOffset key = CellOffset::none;
+    bool reached = false;
+};
+bool has_other_parent(Store& store, CellOffset parent, const KeyView& key, StrayParent& last);
+
+// Whether the subkey at a position below index.total says that the list it stands in may be another key's than
+// parent's: it has another parent, or cannot be read.
+bool may_be_anothers(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position);
+
 }  // namespace engine

@@ -75,9 +75,7 @@ bool is_shared(Store& store, CellOffset parent, const SubkeyIndex& index, uint32
         if (i != number && index.leaf(i).cell.offset == leaf.cell.offset)
             return true;
     }
-    KeyView first;
-    return leaf.count > 0 &&
-           (!read_key(store, subkey_at(store, index, leaf.first), first) || has_other_parent(store, parent, first));
+    return leaf.count > 0 && may_be_anothers(store, parent, index, leaf.first);
 }
 
 // A longer copy of a leaf, with half as many entries again to spare so that it is not moved for each; none on failure.
@@ -300,7 +298,8 @@ bool can_grow(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_
     if (index.leaf_count == 0)
         return true;
     const uint32_t number = leaf_for_new(index, position);
-    return index.leaf(number).count < leaf_limit && !is_shared(store, parent, index, number);
+    const Leaf& leaf = index.leaf(number);
+    return is_read(store, leaf) && leaf.count < leaf_limit && !is_shared(store, parent, index, number);
 }
 
 bool can_move(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position, uint32_t place) {

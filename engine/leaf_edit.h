@@ -15,9 +15,9 @@ namespace engine {
 // without it the hive would not open again.
 void free_leaf(Store& store, CellOffset leaf);
 
-// Whether a new entry at this position, in the index of the key at parent, has a leaf to go to: there is room in its
-// count, and nothing else leads to it. In a damaged hive the index may lead to a leaf twice, or to another key's,
-// whose subkeys would go when the leaf is moved.
+// Whether a new entry at this position, in the index of the key at parent, has a leaf to go to: its entries
+// are read, there is room in its count, and nothing else leads to it. In a damaged hive the index may lead to a leaf
+// twice, or to another key's, whose subkeys would go when the leaf is moved.
 bool can_grow(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_t position);
 
 // Whether move_entry can put the entry at a position into the leaf of its new place.

@@ -45,13 +45,6 @@ CellOffset place_key(Store& store, const KeyRecord& record, const Name& name) {
     return CellOffset::none;
 }
 
-// Whether the list may be another key's, which its first subkey says.
-bool is_anothers(Store& store, const KeyView& parent, const SubkeyIndex& index) {
-    KeyView first;
-    return index.total > 0 &&
-           (!read_key(store, subkey_at(store, index, 0), first) || has_other_parent(store, parent.offset(), first));
-}
-
 Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& index, const Name& name,
                      bool new_reference, CellOffset& key) {
     if (name.length == 0 || name.length > longest_key_name)
@@ -65,8 +58,8 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
     }
     // Where a sibling cannot be read, the name may be there already.
     if (!index.whole || index.total != parent.record.subkey_count || lookup == Lookup::unreadable ||
-        is_anothers(store, parent, index) || !place_for_name(store, index, name, position) ||
-        !can_grow(store, parent.offset(), index, position))
+        (index.total > 0 && may_be_anothers(store, parent.offset(), index, 0)) ||
+        !place_for_name(store, index, name, position) || !can_grow(store, parent.offset(), index, position))
         return Inserted::failed;
 
     const CellOffset security = cell_offset(parent.record.security);
@@ -91,12 +84,13 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
 // were seen to.
 uint32_t set_parents(Store& store, CellOffset own, const SubkeyIndex& children, uint32_t count, CellOffset parent) {
     OffsetBatch batch = {};
+    StrayParent stray;
     for (uint32_t i = 0; i < count; i++) {
         KeyView child;
         const CellOffset offset = subkey_at(store, children, i, batch);
         if (!read_key(store, offset, child))
             return i;
-        if (has_other_parent(store, own, child))
+        if (has_other_parent(store, own, child, stray))
             continue;
         KeyRecord changed = child.record;
         changed.parent = raw(parent);

@@ -31,10 +31,11 @@ bool read_leaf(Store& store, CellOffset offset, Leaf& leaf, bool& whole) {
     return true;
 }
 
-// Adds a leaf's entries to the index; false when that would be more than the hive can hold.
+// Adds a leaf's entries to the index; false when that would be more than the hive can hold, or more leaves than it can
+// hold keys: a damaged root may lead to one empty leaf with each of its entries.
 bool count_leaf(const Store& store, SubkeyIndex& index, Leaf& leaf) {
     const uint32_t most = most_keys(store);
-    if (leaf.count > most - index.total)
+    if (leaf.count > most - index.total || index.leaf_count == most)
         return false;
     leaf.first = index.total;
     index.total += leaf.count;
@@ -119,6 +120,20 @@ Lookup search_each(Store& store, const SubkeyIndex& index, CellOffset parent, co
     return complete ? Lookup::absent : Lookup::unreadable;
 }
 
+Lookup search_in_turn(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
+                      uint32_t& position, KeyView& key) {
+    if (store.sorted_key == parent && parent != CellOffset::none) {
+        const Lookup lookup = search_by(store, index, name, compare_upper, position, key);
+        if (lookup != Lookup::unreadable)
+            return lookup;
+        store.sorted_key = CellOffset::none;  // an entry that could be read then cannot now
+    }
+    if (search_by(store, index, name, order, position, key) == Lookup::found ||
+        search_by(store, index, name, compare_upper, position, key) == Lookup::found)
+        return Lookup::found;
+    return search_each(store, index, parent, name, position, key);
+}
+
 }  // namespace
 
 bool load_index(Store& store, CellOffset offset, SubkeyIndex& index) {
@@ -153,6 +168,10 @@ bool load_key_index(Store& store, const KeyRecord& key, SubkeyIndex& index) {
     return true;
 }
 
+bool is_read(const Store& store, const Leaf& leaf) {
+    return leaf.signature == sig_index_leaf || leaf.signature == leaf_signature(store);
+}
+
 uint32_t leaf_holding(const SubkeyIndex& index, uint32_t position) {
     assert(index.leaf_count > 0);
     uint32_t low = 0;
@@ -171,7 +190,7 @@ uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, C
     if (position >= index.total)
         return 0;
     const Leaf& leaf = index.leaf(leaf_holding(index, position));
-    if (leaf.signature != sig_index_leaf && leaf.signature != leaf_signature(store))
+    if (!is_read(store, leaf))
         return 0;
     const uint32_t size = leaf.entry_size();
     uint32_t entry = position - leaf.first;
@@ -210,16 +229,10 @@ CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position, 
 
 Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
                    uint32_t& position, KeyView& key) {
-    if (store.sorted_key == parent && parent != CellOffset::none) {
-        const Lookup lookup = search_by(store, index, name, compare_upper, position, key);
-        if (lookup != Lookup::unreadable)
-            return lookup;
-        store.sorted_key = CellOffset::none;  // an entry that could be read then cannot now
-    }
-    if (search_by(store, index, name, order, position, key) == Lookup::found ||
-        search_by(store, index, name, compare_upper, position, key) == Lookup::found)
-        return Lookup::found;
-    return search_each(store, index, parent, name, position, key);
+    const uint32_t failed = store.failed_reads;
+    const Lookup lookup = search_in_turn(store, index, parent, name, order, position, key);
+    // Where the device failed, another key of that name may be the one that is met first.
+    return lookup == Lookup::found && store.failed_reads != failed ? Lookup::unreadable : lookup;
 }
 
 bool place_for_name(Store& store, const SubkeyIndex& index, const Name& name, uint32_t& position) {

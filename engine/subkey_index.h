@@ -51,11 +51,13 @@ void free_index(SubkeyIndex& index);
 // The same for the index of a key's record: an empty whole one where the key has no subkeys.
 bool load_key_index(Store& store, const KeyRecord& key, SubkeyIndex& index);
 
+// Whether the entries of a leaf are read: it is an "li", or of the hive's kind.
+bool is_read(const Store& store, const Leaf& leaf);
 // Which leaf holds a position; the last one for a position at the end. The index must have a leaf.
 uint32_t leaf_holding(const SubkeyIndex& index, uint32_t position);
 // The key offsets of up to most entries from a position on, as far as its leaf goes; returns how many were read.
 uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, CellOffset* offsets, uint32_t most);
-// The key offset at a position; none when it cannot be read or its leaf is neither "li" nor of the hive's kind.
+// The key offset at a position; none when it cannot be read.
 CellOffset subkey_at(Store& store, const SubkeyIndex& index, uint32_t position);
 
 // The same for a caller that goes through the positions in turn, with a batch that was empty at first.
@@ -69,7 +71,8 @@ using NameOrder = int (*)(const Name& searched, const Name& stored);
 // Finds a subkey by name in whatever order the list stands. The given order comes first: it is the one by which other
 // writers of hives find their way, so where a list has two keys of one name, the one that they would meet is met. Then
 // upper-cased order, in which Windows keeps its lists; then each entry, unless the list of this key (its offset is
-// parent) is known to be in upper-cased order. found: position and key are set.
+// parent) is known to be in upper-cased order. found: position and key are set, and the device failed no read on the
+// way.
 Lookup find_subkey(Store& store, const SubkeyIndex& index, CellOffset parent, const Name& name, NameOrder order,
                    uint32_t& position, KeyView& key);
 // Where upper-cased order wants a new name. false when a record on the way cannot be read.

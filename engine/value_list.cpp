@@ -300,6 +300,7 @@ int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueV
     // Slots are fetched many at a time, or the window would go to and fro between the list and the records.
     constexpr uint32_t most = 2048;
     CellOffset offsets[most];
+    const uint32_t failed = store.failed_reads;
     int32_t missing = list.whole ? no_value : unreadable_value;
     int32_t first_begun = no_value;
     uint32_t position = 0;
@@ -309,8 +310,8 @@ int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueV
             return unreadable_value;
         for (uint32_t i = 0; i < count; i++) {
             const Named named = compare_value(store, offsets[i], name, begun != nullptr, value);
-            if (named == Named::so)
-                return static_cast<int32_t>(position + i);
+            if (named == Named::so)  // what the device did not deliver may have been an earlier one of that name
+                return store.failed_reads == failed ? static_cast<int32_t>(position + i) : unreadable_value;
             if (named == Named::unreadable)
                 missing = unreadable_value;
             if (named == Named::begun && first_begun == no_value)

@@ -291,11 +291,12 @@ int RegKey::new_key() {
         const int32_t status = RCreateKey(handle, name, &made, &existed);
         if (made != nullptr)
             RCloseKey(made);
-        if (status != R_SUCCESS && slots_agree(handle))
-            return -1;
-        // A key that was made but could not be read back is there all the same.
-        if (status != R_SUCCESS || existed == 0)
+        // A key that was made but could not be read back is there all the same, and so is one whose last write failed
+        // and could not be taken back.
+        if (existed == 0 || (status != R_SUCCESS && subkey_count(handle) == children_.size() + 1))
             break;
+        if (status != R_SUCCESS)
+            return -1;
     }
     hive_->forget_other_handles(this);
     const int position = find_child_position(handle, name);

@@ -12,18 +12,27 @@
 
 #include <QTest>
 
+#include <algorithm>
 #include <map>
 #include <stdexcept>
 
 namespace {
 
-// As many keys and as much data as make the engine go to the file often.
-testkit::HiveLayout layout() {
+// As many keys and as much data as make the engine go to the file often. One has the name that a new one gets, and its
+// list of values far off.
+testkit::Bytes content() {
     testkit::HiveLayout hive;
     testkit::KeyLayout& parent = hive.root.add("Parent");
+    parent.add("New Key #1");
     for (int i = 0; i < 60; i++)
         parent.add("p" + std::to_string(100 + 2 * i)).set("v", 3, testkit::pattern(3000));
-    return hive;
+    const HiveOnDisk file(testkit::lay_out(hive).bytes);
+    DummyRegKey top(QStringLiteral("TOP"));
+    RegHive mounted(QStringLiteral("HIVE"), file.path(), &top);
+    auto* key = static_cast<RegKey*>(mounted.root_key()->child(0)->child(0));
+    for (int i = 0; i < 16; i++)
+        key->set_binary_value(QStringLiteral("v%1").arg(i), QByteArray(30000, 'v'), REG_BINARY, RegKey::new_value);
+    return file.bytes();
 }
 
 struct Operation {
@@ -64,6 +73,8 @@ QString try_with(const HiveOnDisk& file, const Operation& operation, int nth, bo
     const testkit::Hive disk = file.read();
     if (!lasting && static_cast<size_t>(parent->child_count()) != disk.find("Parent")->children.size())
         return QStringLiteral("the tree has another number of keys than the file");
+    if (disk.find("Parent\\New Key #1") == nullptr)
+        return QStringLiteral("a key that was there is gone");
     for (int i = 0; i < parent->child_count(); i++) {
         AbstractRegKey* const key = parent->shown_child(i);
         QString name;
@@ -117,6 +128,71 @@ const ValueOperation value_operations[] = {
      }},
 };
 
+// Two values of one name with other data between and around them, so that the engine goes to the file for each.
+testkit::Bytes two_values_of_one_name() {
+    testkit::HiveLayout hive;
+    hive.root.add("Wide");
+    const HiveOnDisk file(testkit::lay_out(hive).bytes);
+    DummyRegKey top(QStringLiteral("TOP"));
+    RegHive mounted(QStringLiteral("HIVE"), file.path(), &top);
+    auto* key = static_cast<RegKey*>(mounted.root_key()->child(0));
+    for (const auto& [name, size] : {std::pair("a", 30000), std::pair("dup", 3000), std::pair("b", 60000),
+                                     std::pair("dup2", 3001), std::pair("c", 30000)})
+        key->set_binary_value(QLatin1String(name), QByteArray(size, 'v'), REG_BINARY, RegKey::new_value);
+    testkit::Bytes bytes = file.bytes();
+    const testkit::Hive laid = testkit::read_hive(bytes);
+    const uint32_t second = laid.find("Wide")->values[3].offset;
+    testkit::set16(bytes, testkit::LaidHive::position(second, 2), 3);
+    return bytes;
+}
+
+// Two keys of one name in a list without order, told apart by the names of their values.
+testkit::Bytes two_keys_of_one_name() {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout& wide = hive.root.add("Wide");
+    wide.sorted = false;
+    int number = 0;
+    for (const char* name : {"zz", "mm", "dup", "aa", "yy", "bb", "vv", "cc", "xx", "ww", "dup"})
+        wide.add(name).set(std::to_string(number++), 3, testkit::pattern(20000));
+    return testkit::lay_out(hive).bytes;
+}
+
+struct NamesakeOperation {
+    const char* name;
+    testkit::Bytes (*content)();
+    void (*run)(RegKey* key);
+    bool (*has_the_other)(const testkit::Key& key);  // the one that is not pointed at, as it was
+};
+
+bool has_value_of(const testkit::Key& key, size_t size) {
+    return std::any_of(key.values.begin(), key.values.end(), [size](const testkit::Value& value) {
+        return value.name == u"dup" && value.data == testkit::Bytes(size, 'v');
+    });
+}
+
+bool has_key_with(const testkit::Key& key, const std::u16string& value) {
+    return std::any_of(key.children.begin(), key.children.end(), [&value](const testkit::Key& child) {
+        return child.name == u"dup" && child.values.size() == 1 && child.values[0].name == value;
+    });
+}
+
+const NamesakeOperation namesake_operations[] = {
+    {"delete the first value", two_values_of_one_name, [](RegKey* key) { key->delete_value(1); },
+     [](const testkit::Key& key) { return has_value_of(key, 3001); }},
+    {"delete the second value", two_values_of_one_name, [](RegKey* key) { key->delete_value(3); },
+     [](const testkit::Key& key) { return has_value_of(key, 3000); }},
+    {"rename the first value", two_values_of_one_name,
+     [](RegKey* key) { key->rename_value(1, QStringLiteral("fresh")); },
+     [](const testkit::Key& key) { return has_value_of(key, 3001); }},
+    {"set the first value", two_values_of_one_name,
+     [](RegKey* key) { key->set_binary_value(QStringLiteral("dup"), QByteArray(9, 'n'), REG_BINARY, 1); },
+     [](const testkit::Key& key) { return has_value_of(key, 3001); }},
+    {"delete the first key", two_keys_of_one_name, [](RegKey* key) { key->delete_key(2); },
+     [](const testkit::Key& key) { return has_key_with(key, u"10"); }},
+    {"delete the second key", two_keys_of_one_name, [](RegKey* key) { key->delete_key(10); },
+     [](const testkit::Key& key) { return has_key_with(key, u"2"); }},
+};
+
 // The values of the key but one.
 std::map<std::string, testkit::Bytes> values_but(const testkit::Hive& hive, const std::string& left_out) {
     std::map<std::string, testkit::Bytes> values;
@@ -145,7 +221,7 @@ private slots:
     void no_object_stands_for_another_key_afterwards() {
         QFETCH(const int, operation);
         QFETCH(const bool, lasting);
-        const testkit::Bytes bytes = testkit::lay_out(layout()).bytes;
+        const testkit::Bytes bytes = content();
         // Most of the reads come before anything is written: few of those will do.
         constexpr int close = 60;
         int total = 1;
@@ -212,6 +288,42 @@ private slots:
             QVERIFY(failed || done != is_refused);
         }
         QVERIFY(nth > 2);
+    }
+
+    void nothing_of_the_same_name_goes_instead_data() {
+        QTest::addColumn<int>("operation");
+        for (int i = 0; i < 6; i++)
+            QTest::addRow("%s", namesake_operations[i].name) << i;
+    }
+
+    void nothing_of_the_same_name_goes_instead() {
+        QFETCH(const int, operation);
+        const NamesakeOperation& tried = namesake_operations[operation];
+        const testkit::Bytes bytes = tried.content();
+        bool failed = true;
+        int nth = 1;
+        for (; failed; nth++) {
+            const HiveOnDisk file(bytes);
+            DummyRegKey top(QStringLiteral("TOP"));
+            RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+            auto* key = static_cast<RegKey*>(hive.root_key()->child(0));
+            for (int i = 0; i < key->child_count(); i++)
+                key->child(i)->name();
+            for (int i = 0; i < key->value_count(); i++)
+                key->value_name(i);
+            {
+                const testkit::ReadFaults faults(nth);
+                try {
+                    tried.run(key);
+                } catch (const std::exception&) {
+                    // it cannot be read, and nothing was done
+                }
+                failed = faults.failed();
+            }
+            const testkit::Hive disk = file.read();
+            QVERIFY2(tried.has_the_other(*disk.find("Wide")), qPrintable(QStringLiteral("read %1").arg(nth)));
+        }
+        QVERIFY(nth > 3);
     }
 };
 

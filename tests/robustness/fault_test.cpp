@@ -304,6 +304,100 @@ TEST(FailedRead, LetsNothingPassThatIsRefused) {
     }
 }
 
+// What a hive of a root and the key "Top" holds after these values were set in it, one after the other: the list of
+// values moves away from the key.
+Bytes with_values(const HiveLayout& layout, const std::string& path,
+                  const std::vector<std::pair<std::string, Bytes>>& values) {
+    Scene scene(layout);
+    for (const auto& [name, data] : values)
+        EXPECT_EQ(scene.Set(path, name, 3, data), R_SUCCESS);
+    return scene.bytes();
+}
+
+// Runs a call with each of its reads failing, once and from there on, and then asks what it left.
+void with_each_read_failing(const Bytes& start, const std::function<void(RegistryKey* top)>& run,
+                            const std::function<void(Scene& scene)>& look) {
+    for (const bool lasting : {false, true}) {
+        bool struck = true;
+        for (uint64_t nth = 1; struck; nth++) {
+            SCOPED_TRACE((lasting ? "from read " : "read ") + std::to_string(nth));
+            Scene scene(start);
+            const Handle top = scene.OpenKey("Top");
+            scene.file().arm({Call::read, nth, lasting, false});
+            run(top.get());
+            struck = scene.file().failed();
+            scene.file().disarm();
+            look(scene);
+            EXPECT_TRUE(struck || nth > 1);
+        }
+    }
+}
+
+// The caller would take the key for its own, and give it another name or take it away again.
+TEST(FailedRead, DoesNotTellAKeyForMadeThatWasThere) {
+    HiveLayout layout;
+    layout.root.add("Top").add("There");
+    std::vector<std::pair<std::string, Bytes>> values;
+    for (int i = 0; i < 16; i++)
+        values.emplace_back("v" + std::to_string(i), pattern(30000));
+    uint32_t disposition = 9;
+    with_each_read_failing(
+        with_values(layout, "Top\\There", values),
+        [&disposition](RegistryKey* top) {
+            Handle made;
+            disposition = 9;
+            RCreateKey(top, "There", made.out(), &disposition);
+        },
+        [&disposition](Scene& scene) {
+            EXPECT_NE(disposition, 0U);
+            EXPECT_TRUE(scene.Untouched());
+        });
+}
+
+// The first of two values of one name is the one that is met. Where its record cannot be read, nobody knows.
+TEST(FailedRead, LeavesTheSecondOfTwoValuesOfOneNameAlone) {
+    HiveLayout layout;
+    layout.root.add("Top");
+    const Bytes second = pattern(3000, 9);
+    Bytes start = with_values(
+        layout, "Top",
+        {{"a", pattern(30000)}, {"dup", pattern(3000, 5)}, {"b", pattern(60000)}, {"dup2", second}, {"c", pattern(9)}});
+    const Hive laid = read_hive(start);
+    for (const Value& value : laid.find("Top")->values) {
+        if (value.name == u"dup2")
+            set16(start, LaidHive::position(value.offset, 2), 3);
+    }
+    const auto look = [&second](Scene& scene) {
+        const Hive hive = scene.Read();
+        const auto& values = hive.find("Top")->values;
+        EXPECT_TRUE(std::any_of(values.begin(), values.end(),
+                                [&](const Value& value) { return value.name == u"dup" && value.data == second; }));
+    };
+    with_each_read_failing(
+        start, [](RegistryKey* top) { RDeleteValue(top, "dup"); }, look);
+    with_each_read_failing(
+        start, [](RegistryKey* top) { RSetValueExW(top, "dup", 3, "new", 3); }, look);
+}
+
+// The same for keys in a list without order. Of the first one, values "v2", no read must make the second, "v10".
+TEST(FailedRead, LeavesTheSecondOfTwoKeysOfOneNameAlone) {
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    top.sorted = false;
+    int number = 0;
+    for (const char* name : {"zz", "mm", "dup", "aa", "yy", "bb", "vv", "cc", "xx", "ww", "dup"})
+        top.add(name).set("v" + std::to_string(number++), 3, pattern(20000));
+    const auto look = [](Scene& scene) {
+        const Hive hive = scene.Read();
+        const auto& keys = hive.find("Top")->children;
+        EXPECT_TRUE(std::any_of(keys.begin(), keys.end(), [](const Key& key) {
+            return key.name == u"dup" && key.values.size() == 1 && key.values[0].name == u"v10";
+        }));
+    };
+    with_each_read_failing(
+        lay_out(layout).bytes, [](RegistryKey* key) { RDeleteKey(key, "dup"); }, look);
+}
+
 // In a damaged hive a value's data may lead to a record or a list. A failed read must not make that pass for data.
 TEST(FailedRead, LetsNothingPassForDataThatIsNone) {
     HiveLayout layout;

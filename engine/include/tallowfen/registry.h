@@ -176,7 +176,8 @@ int32_t RQueryInfoKeyW(RegistryKey* key, uint16_t* name, uint32_t* name_size, vo
 // ---- changing -----------------------------------------------------------------------------------------------------
 // Opens the key at `path`, or makes every missing component of it. *out_disposition: 1 opened, 0 made. 87: null or
 // empty path, or one that cannot be made; out null. -1: null key. 6: an incomplete handle. 1013: read-only. 8: no
-// memory. 1003: the new record cannot be read. *out is null unless the result is 0.
+// memory. 1003: the record cannot be read. *out is null unless the result is 0; a disposition of 0 stands beside 8 and
+// 1003 too, where the key was made all the same.
 int32_t RCreateKey(RegistryKey* key, const char* path, RegistryKey** out, uint32_t* out_disposition);
 // Stores a value, replacing type and data of one with that name (case ignored) or adding it at the list's end.
 // null or empty name: the default value. 1013: read-only. 8: no memory. 6: not a key. -1: not stored.
