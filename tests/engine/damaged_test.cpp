@@ -188,6 +188,47 @@ TEST(Damaged, no_key_is_put_into_a_leaf_that_an_index_root_has_twice) {
     EXPECT_TRUE(scene.OpenKey("Rooted\\zz"));
 }
 
+// Its entries are not read: a key in it would be out of sight.
+TEST(Damaged, no_key_is_put_into_an_empty_leaf_of_the_other_kind) {
+    LaidHive hive = rooted_beside_alpha();
+    const KeyPlaces& rooted = hive.at("Rooted");
+    hive.put16(rooted.leaves[2], 0, 0x666C);
+    hive.put16(rooted.leaves[2], 2, 0);
+    hive.put32(rooted.record, 20, 4);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Create("Rooted\\zz"), R_INVALID_PARAMETER);
+    EXPECT_EQ(scene.Rename("Rooted\\a1", "zz"), R_FAILED);
+    EXPECT_TRUE(scene.Untouched());
+    EXPECT_EQ(scene.Create("Rooted\\a15"), 0);  // goes into a leaf that is read
+    EXPECT_EQ(scene.Rename("Rooted\\a1", "a0"), 0);
+}
+
+// An empty leaf adds nothing to what the root counts. Each handle would keep 65,535 of them.
+TEST(Damaged, an_index_root_is_followed_to_no_more_leaves_than_the_hive_can_hold_keys) {
+    constexpr uint32_t entries = 65535;
+    Bytes leaf(8);
+    set16(leaf, 0, 0x686C);
+    Bytes root(4 + 4 * size_t{entries});
+    set16(root, 0, 0x6972);
+    set16(root, 2, entries);
+    HiveLayout layout;
+    KeyLayout& key = layout.root.add("Top");
+    key.set("leaf", 3, leaf);
+    key.set("root", 3, root).storage = Storage::cell;
+    LaidHive hive = lay_out(layout);
+    const KeyPlaces& top = hive.at("Top");
+    for (uint32_t i = 0; i < entries; i++)
+        hive.put32(top.values[1].data, 4 + 4 * i, top.values[0].data);
+    hive.put32(top.record, 20, 1);
+    hive.put32(top.record, 28, top.values[1].data);
+    Scene scene(hive.bytes);
+    scene.file().disarm();
+    EXPECT_TRUE(scene.OpenKey("Top"));
+    EXPECT_LT(scene.file().counts().reads, 4 * hive.bytes.size() / 80);  // 80: the smallest cell of a key
+    EXPECT_EQ(scene.Create("Top\\New"), R_INVALID_PARAMETER);
+    EXPECT_TRUE(scene.Untouched());
+}
+
 TEST(Damaged, a_key_made_in_the_list_of_the_root_leaves_the_root_its_list) {
     HiveLayout layout;
     layout.root.add("Loop");
@@ -387,6 +428,26 @@ TEST(Damaged, a_key_whose_cells_last_bytes_are_cut_off_with_the_files_end_is_rea
     Scene scene(Bytes(hive.bytes.begin(), hive.bytes.begin() + 4100 + to + 76 + 4));
     EXPECT_TRUE(scene.OpenKey("Alpha"));
     EXPECT_FALSE(scene.OpenKey("Alpha\\Inner"));
+}
+
+TEST(Damaged, a_security_record_with_too_low_a_count_goes_with_the_last_key_counted_and_nothing_else_does) {
+    HiveLayout layout;
+    layout.security_records = 2;
+    KeyLayout& top = layout.root.add("Top");
+    top.add("first").security = 1;
+    KeyLayout& second = top.add("second");
+    second.security = 1;
+    second.set("v", 3, pattern(40));
+    LaidHive hive = lay_out(layout);
+    hive.put32(hive.security[1], 12, 1);
+    Scene scene(hive.bytes);
+    EXPECT_EQ(scene.Delete("Top\\first"), 0);
+    EXPECT_EQ(scene.Changes(), (std::vector<std::string>{"- key Top\\first"}));
+    const Bytes left = scene.bytes();
+    EXPECT_EQ(scene.Create("Top\\second\\New"), R_INVALID_PARAMETER);
+    EXPECT_EQ(scene.bytes(), left);
+    EXPECT_EQ(scene.Delete("Top\\second"), 0);
+    EXPECT_EQ(subkey_names(scene.OpenKey("Top").get()), std::vector<std::string>());
 }
 
 TEST(Damaged, a_value_that_its_list_has_twice_keeps_its_record_until_both_are_gone) {

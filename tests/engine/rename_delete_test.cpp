@@ -272,6 +272,62 @@ TEST_F(Moving, a_list_in_no_order_is_asked_about_without_going_to_and_fro_betwee
     EXPECT_LT(other.file().counts().reads, count * count / 4);
 }
 
+// The key "Top\\full" with count subkeys, all of which name the key "Top\\stray" as their parent. That one has the same
+// list, and is itself in none: a stop in the midst of a rename leaves as much.
+LaidHive subkeys_of_a_stray(uint32_t count) {
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    top.add("full");
+    top.add("stray");
+    KeyLayout& full = top.children[0];
+    for (uint32_t i = 0; i < count; i++)
+        full.add("key" + std::to_string(10000 + i));
+    LaidHive hive = lay_out(layout);
+    const KeyPlaces& stray = hive.at("Top\\stray");
+    hive.put32(stray.record, 20, count);
+    hive.put32(stray.record, 28, hive.at("Top\\full").index);
+    for (const KeyLayout& key : full.children)
+        hive.put32(hive.at("Top\\full\\" + utf8(key.name)).record, 16, stray.record);
+    hive.put32(hive.at("Top").record, 20, 1);
+    hive.put16(hive.at("Top").index, 2, 1);
+    return hive;
+}
+
+// The same, but the stray and a subkey that lies far from it are each other's parents. Both end the list: a rename puts
+// their parents right when it comes to them.
+LaidHive subkeys_of_a_ring(uint32_t count) {
+    LaidHive hive = subkeys_of_a_stray(count);
+    const auto record = [&hive](uint32_t i) { return hive.at("Top\\full\\key" + std::to_string(10000 + i)).record; };
+    const uint32_t middle = count / 2;
+    const uint32_t subkey = record(middle);
+    const uint32_t stray = hive.at("Top\\stray").record;
+    const uint32_t list = hive.at("Top\\full").index;
+    hive.put32(subkey, 20, count);
+    hive.put32(subkey, 28, list);
+    hive.put32(stray, 16, subkey);
+    hive.put32(list, 4 + 8 * middle, record(count - 1));
+    hive.put32(list, 4 + 8 * (count - 2), stray);
+    hive.put32(list, 4 + 8 * (count - 1), subkey);
+    return hive;
+}
+
+double reads_to_rename_a_subkey(const LaidHive& hive, uint32_t count) {
+    Scene scene(hive.bytes);
+    const Handle top = scene.OpenKey("Top");
+    scene.file().disarm();
+    EXPECT_EQ(RRenameKey(top.get(), 0, "new"), 0);
+    return static_cast<double>(scene.file().counts().reads) / count;
+}
+
+// Whether a subkey belongs elsewhere is found out on the way up from its parent, through lists as long as its own. One
+// of so many keys takes six reads to look through, and the way round the ring one for each of 512 levels.
+TEST_F(Moving, of_many_subkeys_with_one_stray_parent_not_each_is_asked_the_way_up) {
+    constexpr uint32_t many = 12000;
+    EXPECT_LT(reads_to_rename_a_subkey(subkeys_of_a_stray(many), many), 5);
+    constexpr uint32_t few = 600;
+    EXPECT_LT(reads_to_rename_a_subkey(subkeys_of_a_ring(few), few), 20);
+}
+
 TEST_F(Moving, a_tree_deleted_leaf_by_leaf_is_gone_and_its_place_can_be_used_again) {
     for (const char* path : {"Top\\Middle\\Child1\\Deep", "Top\\Middle\\Child1", "Top\\Middle\\Child2"}) {
         EXPECT_EQ(scene.Delete(path), 0) << path;

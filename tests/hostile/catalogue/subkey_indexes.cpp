@@ -157,6 +157,11 @@ void add_roots(List& list) {
         d.hive.put16(d.at("Beta").leaves[2], 2, 0);
         d.hive.put32(d.at("Beta").record, 20, 4);
     });
+    beta("points_to_an_empty_leaf_of_the_other_kind_last", Readable::partly, [](Damage& d) {
+        d.hive.put16(d.at("Beta").leaves[2], 0, fast);
+        d.hive.put16(d.at("Beta").leaves[2], 2, 0);
+        d.hive.put32(d.at("Beta").record, 20, 4);
+    });
     beta("points_to_empty_leaves_alone", Readable::partly, [](Damage& d) {
         for (const uint32_t leaf : d.at("Beta").leaves)
             d.hive.put16(leaf, 2, 0);
