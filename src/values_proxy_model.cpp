@@ -151,12 +151,13 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
     const bool is_rename = index.column() == ValuesModel::NameColumn;
     const int rows = rowCount();
     const QVariant name = is_rename ? data(index, Qt::DisplayRole) : QVariant();
+    const QHash<int, QString> held = is_rename ? names_of_held_rows() : QHash<int, QString>();
     if (!change_source([&] { return sourceModel()->setData(mapToSource(index), value, role); })) {
         // A rename that failed may have moved the value to the end of its list, beside the one of the new name or
         // alone.
         if (is_rename && (rowCount() != rows || data(index, Qt::DisplayRole) != name)) {
             ask_for_default();
-            sort(ValuesModel::NameColumn, Qt::AscendingOrder);
+            arrange([&] { move_held_rows(held, index.row(), value.toString()); });
         }
         return false;
     }
@@ -322,7 +323,22 @@ void ValuesProxyModel::announce_layout() {
 }
 
 void ValuesProxyModel::sort(int, Qt::SortOrder) {
+    arrange([] {});
+}
+
+void ValuesProxyModel::arrange(const std::function<void()>& move_indexes) {
     emit layoutAboutToBeChanged();
+    try {
+        order_rows();
+        move_indexes();
+    } catch (...) {
+        emit layoutChanged();
+        throw;
+    }
+    emit layoutChanged();
+}
+
+void ValuesProxyModel::order_rows() {
     if (auto* values = qobject_cast<ValuesModel*>(sourceModel()))
         values->forget_rows();
     const int rows = sourceModel() != nullptr ? sourceModel()->rowCount() : 0;
@@ -334,11 +350,37 @@ void ValuesProxyModel::sort(int, Qt::SortOrder) {
         names = names_of_rows(rows, name_of).value();
     } catch (...) {
         mapping_.clear();
-        emit layoutChanged();
         throw;
     }
     mapping_ = rows_by_name(names, default_name_, unnamed_);
-    emit layoutChanged();
+}
+
+// What the rows are called that somebody has an index of.
+QHash<int, QString> ValuesProxyModel::names_of_held_rows() const {
+    QHash<int, QString> names;
+    const QModelIndexList persistent = persistentIndexList();
+    for (const QModelIndex& held : persistent)
+        names.insert(held.row(), spoken_data(index(held.row(), ValuesModel::NameColumn)).toString());
+    return names;
+}
+
+// A sort that nobody asked for: an index is about the same value after it. One that a rename has got halfway with may
+// be there under its new name alone. The first row is the default value's before and after.
+void ValuesProxyModel::move_held_rows(const QHash<int, QString>& names_before, int renamed, const QString& new_name) {
+    QStringList names;
+    for (int row = 0; row < rowCount(); row++)
+        names.append(spoken_data(index(row, ValuesModel::NameColumn)).toString());
+    const QModelIndexList persistent = persistentIndexList();
+    for (const QModelIndex& held : persistent) {
+        const QString name = names_before.value(held.row());
+        if (held.row() == 0 || names.value(held.row()) == name)
+            continue;
+        qsizetype row = names.indexOf(name, 1);
+        if (row < 0 && held.row() == renamed)
+            row = names.indexOf(new_name, 1);
+        if (row > 0)
+            changePersistentIndex(held, index(static_cast<int>(row), held.column()));
+    }
 }
 
 bool ValuesProxyModel::add_value(int type) {

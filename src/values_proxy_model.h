@@ -5,6 +5,7 @@
 #pragma once
 
 #include <QAbstractProxyModel>
+#include <QHash>
 
 #include <functional>
 #include <vector>
@@ -58,6 +59,10 @@ private:
     void give_way_to_default();
     int rows_now(int otherwise) const;  // otherwise: where the key cannot say
     void announce_layout();
+    void arrange(const std::function<void()>& move_indexes);
+    void order_rows();
+    QHash<int, QString> names_of_held_rows() const;
+    void move_held_rows(const QHash<int, QString>& names_before, int renamed, const QString& new_name);
     void move_to_end(int row);
     bool remove_from_source(int row, int source_row);
     void end_removal(int row, int source_row, int rows_before);
