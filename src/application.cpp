@@ -52,6 +52,11 @@ QByteArray& file_being_opened() {
     std::abort();
 }
 
+bool is_of_the_mouse(QEvent::Type type) {
+    return type == QEvent::MouseButtonPress || type == QEvent::MouseMove || type == QEvent::MouseButtonRelease ||
+           type == QEvent::MouseButtonDblClick;
+}
+
 bool is_in_values_table(const QObject* part) {
     while (part && !qobject_cast<const ValuesView*>(part)) {
         part = part->parent();
@@ -77,10 +82,10 @@ bool Application::notify(QObject* receiver, QEvent* event) {
     const bool is_in_table = is_in_values_table(receiver);
     try {
         // Here, since the toolkit moves the keyboard, which ends a naming, before any filter sees the press.
-        if (event->type() == QEvent::MouseButtonPress && receiver->isWidgetType()) {
+        if (is_of_the_mouse(event->type()) && receiver->isWidgetType()) {
             auto* keys = qobject_cast<KeysView*>(receiver->parent());
             if (keys && receiver == keys->viewport() &&
-                keys->take_press_from_naming(*static_cast<QMouseEvent*>(event))) {
+                keys->take_mouse_from_naming(*static_cast<QMouseEvent*>(event))) {
                 return true;
             }
         }

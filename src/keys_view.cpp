@@ -237,6 +237,19 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
     event->accept();
 }
 
+bool KeysView::take_mouse_from_naming(const QMouseEvent& event) {
+    if (event.type() == QEvent::MouseButtonPress) {
+        taken_button_ = Qt::NoButton;
+        if (take_press_from_naming(event)) {
+            taken_button_ = event.button();
+        }
+        return taken_button_ != Qt::NoButton;
+    }
+    // The rows that these would find have moved away under the pointer.
+    return taken_button_ != Qt::NoButton && (event.type() == QEvent::MouseMove ? event.buttons().testFlag(taken_button_)
+                                                                               : event.button() == taken_button_);
+}
+
 bool KeysView::take_press_from_naming(const QMouseEvent& press) {
     const QPoint point = press.position().toPoint();
     menu_is_stale_ = false;

@@ -21,9 +21,10 @@ public:
     // The index of the same key at the row where the key stands now.
     static QModelIndex in_place(const QModelIndex& key);
 
-    // Asked before a press of the mouse takes the keyboard from the editor of a name. Ends the naming; where that moves
-    // the rows, the key that was pressed becomes current, and true says that the press has done its work.
-    bool take_press_from_naming(const QMouseEvent& press);
+    // Asked before a press of the mouse takes the keyboard from the editor of a name. Ends the naming; where that
+    // moves the rows, the key that was pressed becomes current, and true says that the press has done its work. The
+    // same is said then of the moves with the button held, of its release, and of a double click that follows.
+    bool take_mouse_from_naming(const QMouseEvent& event);
 
     // Moves to the next shown key whose name begins with what is being typed; passes over those without a name.
     void keyboardSearch(const QString& typed) override;
@@ -40,6 +41,7 @@ protected:
     void paintEvent(QPaintEvent* event) override;
 
 private:
+    bool take_press_from_naming(const QMouseEvent& press);
     void make_key(RegModel& keys);
     void delete_key();
     bool confirm_remove();
@@ -48,5 +50,7 @@ private:
 
     // The press that asks for the next context menu was meant for a row that has moved away.
     bool menu_is_stale_ = false;
+    // The button of the last press, where it ended a naming and moved the rows.
+    Qt::MouseButton taken_button_ = Qt::NoButton;
     TypeAhead typed_;
 };

@@ -115,7 +115,12 @@ def press_while_naming(session):
     siblings = program.child_names(session.tree, session.root + CONTROL)
     pressed = CONTROL + [siblings[siblings.index(MADE[-1]) + 1]]
     last = CONTROL + ["zz last"]
-    for button in (1, 3):
+    for gesture in (
+        ("click", 1),
+        ("click", 3),
+        ("mousedown", 1, "mousemove_relative", 1, 1, "mouseup", 1),
+        ("click", "--repeat", 2, "--delay", 40, 1),
+    ):
         session.click_key(MADE)
         where = place(session.cell(pressed))
         program.keys("F2")
@@ -123,7 +128,7 @@ def press_while_naming(session):
         program.keys("ctrl+a")
         program.type(last[-1])
         until(lambda: text_of(editor) == last[-1], "the name in the editor")
-        program.click((where[0] + 10, where[1] + where[3] // 2), button)
+        xdotool("mousemove", where[0] + 10, where[1] + where[3] // 2, *gesture)
         session.key_renamed("a press elsewhere", MADE, last[-1])
         session.selected(pressed)
         session.click_key(last)

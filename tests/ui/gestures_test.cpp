@@ -14,12 +14,14 @@
 #include <QClipboard>
 #include <QHelpEvent>
 #include <QLineEdit>
+#include <QMetaEnum>
 #include <QMouseEvent>
 #include <QRegularExpression>
 #include <QScrollBar>
 #include <QStyledItemDelegate>
 #include <QTest>
 #include <QToolTip>
+#include <QWindow>
 
 namespace {
 
@@ -42,7 +44,7 @@ const QString services = QStringLiteral("MACHINE\\SYSTEM\\Services");
 // As the application object asks it, before the press goes anywhere.
 bool is_taken(KeysView& keys, QPoint point, Qt::MouseButton button = Qt::LeftButton) {
     const QPointF global = keys.viewport()->mapToGlobal(point);
-    return keys.take_press_from_naming(QMouseEvent(QEvent::MouseButtonPress, point, global, button, button, {}));
+    return keys.take_mouse_from_naming(QMouseEvent(QEvent::MouseButtonPress, point, global, button, button, {}));
 }
 
 QString below(const char* name) { return services + QLatin1Char('\\') + QLatin1String(name); }
@@ -108,6 +110,92 @@ private slots:
             QVERIFY(!with_context_menu(*stage.keys, point, [](QMenu&) {}));
         }
         QVERIFY(with_context_menu(*stage.keys, point, [](QMenu&) {}));
+    }
+
+    // The press has moved the rows: the pointer stands on another key than the one that was meant, also while the
+    // button is held, and when it goes down again at once.
+    void a_gesture_that_ends_a_naming_is_about_the_key_that_stood_there_data() {
+        QTest::addColumn<QString>("gesture");
+        QTest::newRow("a click") << "click";
+        QTest::newRow("a click that moves") << "drag";
+        QTest::newRow("a double click") << "double click";
+    }
+
+    void a_gesture_that_ends_a_naming_is_about_the_key_that_stood_there() {
+        QFETCH(const QString, gesture);
+        const Scene scene(many_keys());
+        Stage stage(scene);
+        stage.keys->expand(stage.key(services));
+        stage.select_key(below("Beep"));
+        stage.return_to(*stage.keys);
+        // The mouse's own way, by the window.
+        QWindow* const window = stage.window.windowHandle();
+        const auto middle_of = [&](const char* name) {
+            return stage.keys->viewport()->mapTo(&stage.window,
+                                                 stage.keys->visualRect(stage.key(below(name))).center());
+        };
+        QTest::keyClick(stage.keys, Qt::Key_F2);
+        stage.keys->viewport()->findChild<QLineEdit*>()->setText(QStringLiteral("zz"));
+        const QPoint point = middle_of("Dhcp");
+        if (gesture == QStringLiteral("double click")) {
+            QTest::mouseDClick(window, Qt::LeftButton, {}, point);
+        } else {
+            QTest::mousePress(window, Qt::LeftButton, {}, point);
+            QCOMPARE(stage.status(), below("Dhcp"));
+            if (gesture == QStringLiteral("drag")) {
+                QTest::mouseMove(window, point + QPoint(1, 0));
+                QTest::mouseMove(window, middle_of("k10"));
+            }
+            QTest::mouseRelease(window, Qt::LeftButton, {}, point);
+        }
+        QVERIFY(stage.key(below("zz")).isValid());
+        QVERIFY(middle_of("Dhcp") != point);
+        const auto is_current = [&](const char* name) {
+            return stage.keys->selectionModel()->selectedIndexes() == QModelIndexList{stage.key(below(name))} &&
+                   stage.status() == below(name);
+        };
+        QVERIFY2(is_current("Dhcp"), qPrintable(stage.status()));
+        QVERIFY(!stage.keys->isExpanded(stage.keys->indexAt(stage.keys->viewport()->mapFrom(&stage.window, point))));
+
+        // And it is over: the mouse that passes selects nothing, and what is pressed next is pressed.
+        QTest::mouseMove(window, middle_of("k10"));
+        QVERIFY(is_current("Dhcp"));
+        QTest::mouseClick(window, Qt::LeftButton, {}, middle_of("EventLog"));
+        QVERIFY(is_current("EventLog"));
+        QTest::mouseMove(window, middle_of("k10"));
+        QVERIFY(is_current("EventLog"));
+        QTest::mouseDClick(window, Qt::LeftButton, {}, middle_of("EventLog"));
+        QVERIFY(stage.keys->isExpanded(stage.key(below("EventLog"))));
+    }
+
+    void an_arrow_key_that_ends_a_naming_leads_to_the_key_that_stood_there_data() {
+        QTest::addColumn<Qt::Key>("key");
+        for (const Qt::Key key : {Qt::Key_Down, Qt::Key_Up, Qt::Key_PageDown}) {
+            QTest::addRow("%s", QMetaEnum::fromType<Qt::Key>().valueToKey(key)) << key;
+        }
+    }
+
+    void an_arrow_key_that_ends_a_naming_leads_to_the_key_that_stood_there() {
+        QFETCH(const Qt::Key, key);
+        const Scene scene(many_keys());
+        Stage stage(scene);
+        stage.keys->expand(stage.key(services));
+        stage.select_key(below("Disk"));
+        stage.return_to(*stage.keys);
+        const int scrolled_to = stage.keys->verticalScrollBar()->value();
+        QTest::keyClick(stage.keys, key);
+        const QString meant = stage.status();
+        QVERIFY(meant != below("Disk"));
+        stage.select_key(below("Disk"));
+        stage.keys->verticalScrollBar()->setValue(scrolled_to);
+        QTest::keyClick(stage.keys, Qt::Key_F2);
+        auto* editor = stage.keys->viewport()->findChild<QLineEdit*>();
+        QVERIFY(editor);
+        editor->setText(QStringLiteral("zz"));
+        QTest::keyClick(editor, key);
+        QTRY_VERIFY(stage.key(below("zz")).isValid());
+        QCOMPARE(stage.status(), meant);
+        QCOMPARE(stage.keys->selectionModel()->selectedIndexes(), QModelIndexList{stage.key(meant)});
     }
 
     // Letters that take no room leave an empty cell, which must say that there is more.
