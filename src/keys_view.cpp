@@ -112,15 +112,25 @@ void KeysView::delete_key() {
     const int row = current.row();
     const int rows = model()->rowCount(parent);
     const bool was_expanded = isExpanded(current);
-    if (model()->removeRows(row, 1, parent)) {
+    // A removal that was announced and then did not come to be has moved the selection to a neighbour.
+    const auto return_to_kept = [&] {
+        if (model()->rowCount(parent) == rows) {
+            const QModelIndex kept = model()->index(row, 0, parent);
+            setCurrentIndex(kept);
+            setExpanded(kept, was_expanded);
+        }
+    };
+    bool removed = false;
+    try {
+        removed = model()->removeRows(row, 1, parent);
+    } catch (...) {
+        return_to_kept();
+        throw;
+    }
+    if (removed) {
         return;
     }
-    // A removal that was announced and then refused has moved the selection to a neighbour.
-    if (model()->rowCount(parent) == rows) {
-        const QModelIndex kept = model()->index(row, 0, parent);
-        setCurrentIndex(kept);
-        setExpanded(kept, was_expanded);
-    }
+    return_to_kept();
     tell_failure(this, tr("The key could not be deleted."));
 }
 

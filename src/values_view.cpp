@@ -62,6 +62,11 @@ QString shown_text(const QModelIndex& cell, qsizetype limit = std::numeric_limit
     return datum.isValid() ? value_text(datum, limit) : QString();
 }
 
+// The name of a row, or what is said where it has none that can be read.
+QString spoken_name(const QAbstractItemModel& model, int row) {
+    return model.index(row, name_column).data(Qt::AccessibleTextRole).toString();
+}
+
 }  // namespace
 
 ValuesView::ValuesView(QWidget* parent) : QTableView(parent) {
@@ -250,6 +255,20 @@ void ValuesView::run_delete_value_action(bool /*checked*/) {
     }
 }
 
+// Where a value that was in `row` stands by now; `row` again, as long as there is one, where it has gone. The first
+// row is the default value's always, and another value may have the name that it is shown with.
+int ValuesView::row_of(const QString& name, int row) const {
+    const int rows = model()->rowCount();
+    if (row > 0 && spoken_name(*model(), row) != name) {
+        for (int other = rows - 1; other > 0; --other) {
+            if (spoken_name(*model(), other) == name) {
+                return other;
+            }
+        }
+    }
+    return qMin(row, rows - 1);
+}
+
 void ValuesView::delete_value() {
     // What is deleted is the value that was asked about.
     const QPersistentModelIndex asked = currentIndex();
@@ -265,9 +284,19 @@ void ValuesView::delete_value() {
     }
     const int row = asked.row();
     const int column = asked.column();
-    if (!model()->removeRows(row, 1, QModelIndex())) {
-        // A removal that was announced and then refused has moved the selection to a neighbour.
-        make_current(model()->index(row, column));
+    const QString name = spoken_name(*model(), row);
+    // A removal that was announced and then did not come to be has moved the selection to a neighbour, and the table
+    // may have been sorted since.
+    const auto return_to_kept = [&] { make_current(model()->index(row_of(name, row), column)); };
+    bool removed = false;
+    try {
+        removed = model()->removeRows(row, 1, QModelIndex());
+    } catch (...) {
+        return_to_kept();
+        throw;
+    }
+    if (!removed) {
+        return_to_kept();
         tell_failure(this, tr("The value could not be deleted."));
         return;
     }

@@ -41,6 +41,7 @@ protected:
 private:
     void size_columns(int old_count, int new_count);
     void make_current(const QModelIndex& index);
+    int row_of(const QString& name, int row) const;
     bool can_ask();
     void make_value(ValuesProxyModel& values, int type);
     void delete_value();
