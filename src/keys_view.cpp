@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "keys_view.h"
 
+#include "current_row.h"
 #include "failure_report.h"
 #include "finish_editing.h"
 #include "reg_model.h"
@@ -14,6 +15,8 @@
 #include <QMenu>
 #include <QMessageBox>
 #include <QMouseEvent>
+#include <QScrollBar>
+#include <QStyle>
 
 #include <deque>
 #include <utility>
@@ -55,6 +58,44 @@ QModelIndex KeysView::in_place(const QModelIndex& key) {
     return {};
 }
 
+// What a command is about is seen before it asks for a name or an answer: also where its branch was closed, or the
+// tree was scrolled.
+void KeysView::show_current() {
+    const QModelIndex current = currentIndex();
+    if (!current.isValid()) {
+        return;
+    }
+    QScrollBar& sideways = *horizontalScrollBar();
+    const int before = sideways.value();
+    setCurrentIndex(current);
+    scrollTo(current);
+    // The tree's own scrolling goes to its edge, and the name of a deep key can begin beyond the other.
+    sideways.setValue(before);
+    const int all = viewport()->width();
+    const QRect row = visualRect(current);
+    const QSize size(qMin(sizeHintForIndex(current).width(), all), row.height());
+    const QRect name = QStyle::alignedRect(layoutDirection(), Qt::AlignLeft, size, row);
+    const int beyond = qMin(name.left(), 0) + qMax(name.left() + name.width() - all, 0);
+    sideways.setValue(sideways.value() + (isRightToLeft() ? -beyond : beyond));
+}
+
+bool KeysView::event(QEvent* event) {
+    if (!is_menu_key(*event) || !currentIndex().isValid()) {
+        return QTreeView::event(event);
+    }
+    if (may_change_rows(*this)) {
+        meet_failures(this, key_path_of(currentIndex()), [this] {
+            show_current();
+            ask_for_menu_over_current(*this);
+        });
+    }
+    return true;
+}
+
+QItemSelectionModel::SelectionFlags KeysView::selectionCommand(const QModelIndex& index, const QEvent* event) const {
+    return keeping_highlight(QTreeView::selectionCommand(index, event), index, event);
+}
+
 void KeysView::show_keys_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
     if (std::exchange(menu_is_stale_, false) || !may_change_rows(*this)) {
@@ -88,6 +129,7 @@ void KeysView::make_key(RegModel& keys) {
     }
     const QModelIndex created = keys.index(row, 0, current);
     setCurrentIndex(created);
+    show_current();
     edit(created);
 }
 
@@ -101,6 +143,7 @@ void KeysView::run_delete_key_action(bool /*checked*/) {
 void KeysView::delete_key() {
     // What is deleted is the key that was asked about.
     const QPersistentModelIndex asked = currentIndex();
+    show_current();
     if (!asked.isValid() || !confirm_remove()) {
         return;
     }
@@ -150,7 +193,7 @@ void KeysView::run_rename_key_action(bool /*checked*/) {
     }
     meet_failures(this, key_path_of(current), [&] {
         ask_for_name(current);
-        setCurrentIndex(current);
+        show_current();
         edit(current);
     });
 }
@@ -237,6 +280,7 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
     case Qt::Key_F2:
         meet_failures(this, key_path_of(currentIndex()), [&] {
             ask_for_name(currentIndex());
+            show_current();
             QTreeView::keyPressEvent(event);
         });
         return;

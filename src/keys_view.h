@@ -36,12 +36,15 @@ public slots:
     void run_rename_key_action(bool checked);
 
 protected:
+    bool event(QEvent* event) override;
+    QItemSelectionModel::SelectionFlags selectionCommand(const QModelIndex& index, const QEvent* event) const override;
     void keyPressEvent(QKeyEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
 
 private:
     bool take_press_from_naming(const QMouseEvent& press);
+    void show_current();
     void make_key(RegModel& keys);
     void delete_key();
     bool confirm_remove();

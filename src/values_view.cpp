@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "values_view.h"
 
+#include "current_row.h"
 #include "delegates.h"
 #include "edit_dialogs.h"
 #include "edit_number_dialog.h"
@@ -170,6 +171,7 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
     } else if (event->key() == Qt::Key_F2) {
         meet_failures(this, FailureReport::instance().shown_key(), [&] {
             ask_for_name(currentIndex());
+            show_current();
             QTableView::keyPressEvent(event);
         });
     } else {
@@ -192,6 +194,30 @@ void ValuesView::keyboardSearch(const QString& typed) {
             return;
         }
     }
+}
+
+// What a command is about is seen before it asks for a name or an answer.
+void ValuesView::show_current() {
+    const QModelIndex current = currentIndex();
+    setCurrentIndex(current);
+    scrollTo(current);
+}
+
+bool ValuesView::event(QEvent* event) {
+    if (!is_menu_key(*event) || !currentIndex().isValid()) {
+        return QTableView::event(event);
+    }
+    if (may_change_rows(*this)) {
+        meet_failures(this, FailureReport::instance().shown_key(), [this] {
+            show_current();
+            ask_for_menu_over_current(*this);
+        });
+    }
+    return true;
+}
+
+QItemSelectionModel::SelectionFlags ValuesView::selectionCommand(const QModelIndex& index, const QEvent* event) const {
+    return keeping_highlight(QTableView::selectionCommand(index, event), index, event);
 }
 
 void ValuesView::show_values_context_menu(QPoint point) {
@@ -275,6 +301,7 @@ void ValuesView::delete_value() {
     if (!asked.isValid()) {
         return;
     }
+    show_current();
     if (QMessageBox::question(this, tr("Confirm Value Removal"), tr("Are you sure you want to delete this value?"),
                               QMessageBox::Yes | QMessageBox::No) != QMessageBox::Yes) {
         return;
@@ -315,7 +342,7 @@ void ValuesView::run_rename_value_action(bool /*checked*/) {
     }
     meet_failures(this, FailureReport::instance().shown_key(), [&] {
         ask_for_name(current);
-        setCurrentIndex(current);
+        show_current();
         edit(current);
     });
 }

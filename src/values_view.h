@@ -32,6 +32,8 @@ public slots:
     void run_rename_value_action(bool checked);
 
 protected:
+    bool event(QEvent* event) override;
+    QItemSelectionModel::SelectionFlags selectionCommand(const QModelIndex& index, const QEvent* event) const override;
     void keyPressEvent(QKeyEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
     bool viewportEvent(QEvent* event) override;
@@ -41,6 +43,7 @@ protected:
 private:
     void size_columns(int old_count, int new_count);
     void make_current(const QModelIndex& index);
+    void show_current();
     int row_of(const QString& name, int row) const;
     bool can_ask();
     void make_value(ValuesProxyModel& values, int type);

@@ -3,7 +3,7 @@
 """The session of a user without a mouse: no pointer event is ever sent."""
 import os
 
-from desktop import State, has, text_of, until
+from desktop import State, has, place, text_of, until
 from session import TITLE, Session, equal, list_data, make_sample, run, step, text_data
 
 CONTROL = ["ControlSet001", "Control"]
@@ -168,6 +168,24 @@ def commands_in_a_name(session):
     program.alone(TITLE)
 
 
+def menu_key(session):
+    """The Menu key opens the menu of the key or value that has the keyboard, over it"""
+    program = session.program
+    for go_there, row, texts in (
+        (lambda: go(session, MADE), lambda: session.cell(MADE), ["New", "Delete", "Rename"]),
+        (lambda: go_to_value(session, "Qword"), lambda: session.value_cell("Qword"), ["Edit", "Delete", "Rename"]),
+    ):
+        go_there()
+        program.keys("Menu")
+        menu = program.context_menu()
+        equal(program.context_items(), texts, "the menu's items")
+        x, y, width, height = place(row())
+        until(lambda: x <= place(menu)[0] < x + width and y <= place(menu)[1] < y + height, "the menu over its row")
+        program.keys("Escape")
+        program.gone(menu)
+    session.unchanged("a menu")
+
+
 def number_base(session):
     """The base of a number switched by keyboard"""
     program = session.program
@@ -234,7 +252,7 @@ def finding(session):
 def whole_session(scratch):
     """The session with the keyboard alone"""
     with Session(make_sample(os.path.join(scratch, "SYSTEM"))) as session:
-        for scene in (keys_session, values_session, commands_in_a_name, number_base, deleting, finding):
+        for scene in (keys_session, values_session, commands_in_a_name, menu_key, number_base, deleting, finding):
             step(scene.__doc__)
             scene(session)
         session.program.keys("alt+f")

@@ -3,7 +3,7 @@
 """A user with a mouse on a made hive: every gesture, and the file after each."""
 import os
 
-from desktop import name, place, text_of, until, xdotool
+from desktop import Failure, State, has, name, place, text_of, until, xdotool
 from session import NEW_VALUE_KINDS, TITLE, Session, equal, list_data, make_sample, run, step, text_data
 
 CONTROL = ["ControlSet001", "Control"]
@@ -136,6 +136,49 @@ def press_while_naming(session):
         session.fill_editor(MADE[-1])
         session.key_renamed("the name of before", last, MADE[-1])
         session.selected(MADE)
+
+
+def name_out_of_sight(session):
+    """A key that was scrolled away, and one in a closed branch, come back before they are named"""
+    program = session.program
+    window = xdotool("search", "--onlyvisible", "--name", f"^{TITLE}$").split()[-1]
+    xdotool("windowsize", "--sync", window, 640, 240)
+    until(lambda: place(session.main)[2:] == (640, 240), "the lower window")
+    for hide in (scroll_away, close_branch):
+        session.click_key(MADE)
+        hide(session)
+        program.keys("F2")
+        editor = program.editor()
+        until(lambda: begins_in(place(editor), place(session.tree)), f"the editor in sight after {hide.__name__}")
+        equal(text_of(editor), MADE[-1], "the name in the editor")
+        program.keys("Escape")
+        session.unchanged(hide.__name__)
+        session.selected(MADE)
+    xdotool("windowsize", "--sync", window, 640, 480)
+    until(lambda: place(session.main)[2:] == (640, 480), "the window as it was")
+
+
+def begins_in(inner, outer):
+    """In sight with its first letters; an editor may be as wide as its column."""
+    return outer[0] <= inner[0] < outer[0] + outer[2] - 50 and outer[1] <= inner[1] <= outer[1] + outer[3] - inner[3]
+
+
+def scroll_away(session):
+    x, y, width, height = place(session.tree)
+    xdotool("mousemove", x + width // 2, y + height // 2)
+    for _ in range(100):
+        top = place(session.cell(MADE))[1]
+        if top + 20 < y:
+            return
+        xdotool("click", 5)
+        until(lambda: place(session.cell(MADE))[1] < top, "the tree to scroll")
+    raise Failure("the key stays in sight")
+
+
+def close_branch(session):
+    x, y, _, height = place(session.program.scroll_to(session.tree, session.cell(CONTROL)))
+    session.program.click((x - 10, y + height // 2))
+    until(lambda: not has(session.cell(CONTROL), State.EXPANDED), "the branch to close")
 
 
 def make_values(session):
@@ -351,6 +394,7 @@ def whole_session(scratch):
             action_states,
             make_key,
             press_while_naming,
+            name_out_of_sight,
             make_values,
             edit_values,
             number_bases,

@@ -198,6 +198,29 @@ private slots:
         QCOMPARE(stage.keys->selectionModel()->selectedIndexes(), QModelIndexList{stage.key(meant)});
     }
 
+    // Delete and Rename are about the current row, which shows by its highlight.
+    void the_current_row_keeps_its_highlight() {
+        const Scene scene;
+        Stage stage(scene);
+        stage.keys->expand(stage.key(alpha));
+        stage.select_value(alpha + QStringLiteral("\\Deep"), QStringLiteral("b"));
+        for (QAbstractItemView* view :
+             {static_cast<QAbstractItemView*>(stage.keys), static_cast<QAbstractItemView*>(stage.values)}) {
+            stage.return_to(*view);
+            const QModelIndexList current{view->currentIndex()};
+            QCOMPARE(view->selectionModel()->selectedIndexes(), current);
+            QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::ControlModifier,
+                              view->visualRect(view->currentIndex()).center());
+            QCOMPARE(view->selectionModel()->selectedIndexes(), current);
+            QTest::keyClick(view, Qt::Key_Space, Qt::ControlModifier);
+            QCOMPARE(view->selectionModel()->selectedIndexes(), current);
+            QTest::mouseClick(view->viewport(), Qt::LeftButton, {},
+                              view->viewport()->rect().bottomLeft() + QPoint(5, -5));
+            QCOMPARE(view->selectionModel()->selectedIndexes(), current);
+            QCOMPARE(view->currentIndex(), current.first());
+        }
+    }
+
     // Letters that take no room leave an empty cell, which must say that there is more.
     void a_text_that_a_cell_cuts_is_whole_in_its_tip_whatever_room_its_letters_take() {
         testkit::HiveLayout layout;

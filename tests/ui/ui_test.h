@@ -123,9 +123,8 @@ inline void press(const QWidget& dialog, QDialogButtonBox::StandardButton button
     QTest::mouseClick(dialog.findChild<QDialogButtonBox*>()->button(button), Qt::LeftButton);
 }
 
-// Opens the context menu of a view at a point of its viewport, hands it to `act` and closes it; false when no
-// menu came.
-inline bool with_context_menu(QAbstractScrollArea& view, QPoint point, const std::function<void(QMenu&)>& act) {
+// Does what asks for a context menu, hands the menu to `act` and closes it; false when no menu came.
+inline bool with_menu(const std::function<void()>& ask, const std::function<void(QMenu&)>& act) {
     bool shown = false;
     QTimer timer;
     QObject::connect(&timer, &QTimer::timeout, &timer, [&] {
@@ -139,9 +138,18 @@ inline bool with_context_menu(QAbstractScrollArea& view, QPoint point, const std
         menu->close();
     });
     timer.start(1);
-    QContextMenuEvent event(QContextMenuEvent::Mouse, point, view.viewport()->mapToGlobal(point));
-    QCoreApplication::sendEvent(view.viewport(), &event);
+    ask();
     return shown;
+}
+
+// The context menu of a view at a point of its viewport.
+inline bool with_context_menu(QAbstractScrollArea& view, QPoint point, const std::function<void(QMenu&)>& act) {
+    return with_menu(
+        [&] {
+            QContextMenuEvent event(QContextMenuEvent::Mouse, point, view.viewport()->mapToGlobal(point));
+            QCoreApplication::sendEvent(view.viewport(), &event);
+        },
+        act);
 }
 
 // The texts of a menu; "-" for a separator.
