@@ -75,7 +75,8 @@ bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record, uint
 }
 
 // The counts that the handle knows, over the lists as they lie now: a list that was moved through another handle has
-// left its cell to whatever came next. Where the record cannot be read, they lie nowhere.
+// left its cell to whatever came next. After a change of its own that the handle could not take in, the record's
+// counts. Where the record cannot be read, the lists lie nowhere.
 KeyRecord snapshot(RegistryKey& handle) {
     KeyRecord record = {};
     record.subkey_count = handle.info->subkey_count;
@@ -86,8 +87,10 @@ KeyRecord snapshot(RegistryKey& handle) {
     if (read_key(*handle.store, handle.info->own, key)) {
         record.subkey_index = key.record.subkey_index;
         record.value_list = key.record.value_list;
-        if (key.record.value_count < record.value_count)
+        if (key.record.value_count < record.value_count || handle.counts_are_old)
             record.value_count = key.record.value_count;
+        if (handle.counts_are_old && handle.depth < depth_limit)
+            record.subkey_count = key.record.subkey_count;
     }
     return record;
 }

@@ -17,13 +17,17 @@ bool belongs_elsewhere(Store& store, CellOffset parent, const SubkeyIndex& index
 // The same, but a key that stands in the index twice passes: for a caller that looks at each entry anyway.
 bool has_other_parent(Store& store, CellOffset parent, const KeyView& key);
 
-// The last parent that a subkey's record named in place of the key that lists it, and whether that one is in the tree:
-// of many subkeys that all name it, only the first is asked the whole way up. Holds while nothing above it changes.
-struct StrayParent {
-    CellOffset key = CellOffset::none;
-    bool reached = false;
+// What has come out about parents that records name in place of the key that lists theirs. Holds while nothing above
+// those changes.
+struct StrayParents {
+    // The last one, and whether it is in the tree: of many subkeys that name it only the first is asked the whole way.
+    CellOffset last = CellOffset::none;
+    bool is_reached = false;
+    uint64_t looked_at = 0;  // entries of lists on all ways up, a level counting as some
 };
-bool has_other_parent(Store& store, CellOffset parent, const KeyView& key, StrayParent& last);
+// The same for many subkeys in turn. Also true once more was looked at than a few strays ask for: a hostile hive may
+// lead each subkey another long way up.
+bool has_other_parent(Store& store, CellOffset parent, const KeyView& key, StrayParents& strays);
 
 // Whether the subkey at a position below index.total says that the list it stands in may be another key's than
 // parent's: it has another parent, or cannot be read.

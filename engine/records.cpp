@@ -57,9 +57,9 @@ Outcome rewrite_value(Store& store, const ValueView& value, const ValueRecord& c
 
 namespace {
 
-// Compares the first length bytes of the stored name; buffer has room for them, and is null when memory ran out.
+// Compares the first length bytes of the stored name; buffer has room for them.
 Named compare_name(Store& store, const ValueView& value, const Name& name, uint32_t length, uint8_t* buffer) {
-    if (buffer == nullptr || !read_part(store, value.cell, sizeof(ValueRecord), buffer, length))
+    if (!read_part(store, value.cell, sizeof(ValueRecord), buffer, length))
         return Named::unreadable;
     if (!same_name(name, {buffer, length, value.wide()}))
         return Named::otherwise;
@@ -86,6 +86,10 @@ Named compare_value(Store& store, CellOffset offset, const Name& name, bool tell
     if (length <= sizeof few)
         return compare_name(store, value, name, length, few);
     const Block many(length);
+    if (many.bytes == nullptr) {
+        store.failed_reads++;
+        return Named::unreadable;
+    }
     return compare_name(store, value, name, length, many.bytes);
 }
 

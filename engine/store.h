@@ -53,11 +53,13 @@ struct Store {
     uint8_t* cell_map;
     uint32_t cell_map_size;  // bytes
 
-    const Bin* held_bin;    // not walked again after a write, see HeldBin; mostly null
-    int32_t unread_bins;    // how many bins are unread
-    uint32_t failed_reads;  // raised when the device fails, which tells what could not be read from what is not there
-    int32_t recent_bin;     // where the last look-up of a cell ended: the next is mostly near
-    uint32_t generation;    // raised by every write, so that what was derived from the file can be known for stale
+    const Bin* held_bin;  // not walked again after a write, see HeldBin; mostly null
+    int32_t unread_bins;  // how many bins are unread
+    // Raised when the device fails, or memory to read into runs out, which tells what could not be read from what is
+    // not there.
+    uint32_t failed_reads;
+    int32_t recent_bin;   // where the last look-up of a cell ended: the next is mostly near
+    uint32_t generation;  // raised by every write, so that what was derived from the file can be known for stale
     // The key whose index was last found to be in upper-cased order throughout; none when unknown. Its insertions keep
     // it so. While it holds, a name that a binary search misses is not there, and no scan has to prove it.
     CellOffset sorted_key;

@@ -84,13 +84,13 @@ Inserted insert_into(Store& store, const KeyView& parent, const SubkeyIndex& ind
 // were seen to.
 uint32_t set_parents(Store& store, CellOffset own, const SubkeyIndex& children, uint32_t count, CellOffset parent) {
     OffsetBatch batch = {};
-    StrayParent stray;
+    StrayParents strays;
     for (uint32_t i = 0; i < count; i++) {
         KeyView child;
         const CellOffset offset = subkey_at(store, children, i, batch);
         if (!read_key(store, offset, child))
             return i;
-        if (has_other_parent(store, own, child, stray))
+        if (has_other_parent(store, own, child, strays))
             continue;
         KeyRecord changed = child.record;
         changed.parent = raw(parent);

@@ -31,11 +31,12 @@ bool read_leaf(Store& store, CellOffset offset, Leaf& leaf, bool& whole) {
     return true;
 }
 
-// Adds a leaf's entries to the index; false when that would be more than the hive can hold, or more leaves than it can
-// hold keys: a damaged root may lead to one empty leaf with each of its entries.
+// A damaged root may lead to one empty leaf with each of its entries. More leaves than keys are not taken beyond this.
+constexpr uint32_t most_empty_leaves = 256;
+
+// Adds a leaf's entries to the index; false when that would be more, or more leaves, than a hive can hold.
 bool count_leaf(const Store& store, SubkeyIndex& index, Leaf& leaf) {
-    const uint32_t most = most_keys(store);
-    if (leaf.count > most - index.total || index.leaf_count == most)
+    if (leaf.count > most_keys(store) - index.total || index.leaf_count >= index.total + most_empty_leaves)
         return false;
     leaf.first = index.total;
     index.total += leaf.count;
@@ -54,12 +55,15 @@ bool load_root(Store& store, uint32_t claimed, SubkeyIndex& index) {
     index.leaves = static_cast<Leaf*>(malloc(count * sizeof(Leaf)));
     if (index.leaves == nullptr)
         return false;
+    // Many entries at a time, or the window would go to and fro between the root and the leaves.
+    Le32 entries[256];
+    constexpr uint32_t most = sizeof entries / sizeof entries[0];
     for (uint32_t i = 0; i < count; i++) {
-        Le32 entry;
+        const uint32_t rest = count - i < most ? count - i : most;
+        const auto skip = static_cast<uint32_t>(sizeof(IndexHead) + i * sizeof entries[0]);
         Leaf& leaf = index.leaves[i];
-        if (!read_part(store, index.cell, static_cast<uint32_t>(sizeof(IndexHead) + i * sizeof entry), &entry,
-                       sizeof entry) ||
-            !read_leaf(store, cell_offset(entry), leaf, index.whole) || !count_leaf(store, index, leaf)) {
+        if ((i % most == 0 && !read_part(store, index.cell, skip, entries, rest * sizeof entries[0])) ||
+            !read_leaf(store, cell_offset(entries[i % most]), leaf, index.whole) || !count_leaf(store, index, leaf)) {
             index.whole = false;
             return true;
         }

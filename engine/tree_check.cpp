@@ -75,7 +75,7 @@ bool is_component(const Name& name) {
 }
 
 // Whether the entry at a position can be deleted by its name: stored in 8 bits, fit for a path, and met first by it.
-int32_t check_entry(Store& store, const Level& parent, uint32_t position, StrayParent& stray, KeyView& key) {
+int32_t check_entry(Store& store, const Level& parent, uint32_t position, StrayParents& strays, KeyView& key) {
     if (parent.children.is_root)
         return R_PATH_NOT_FOUND;
     if (!read_key(store, subkey_at(store, parent.children, position), key))
@@ -87,7 +87,7 @@ int32_t check_entry(Store& store, const Level& parent, uint32_t position, StrayP
     uint32_t where;
     if (!is_component(name) ||
         find_subkey(store, parent.children, parent.key.offset(), name, compare_signed, where, met) != Lookup::found ||
-        where != position || has_other_parent(store, parent.key.offset(), key, stray))
+        where != position || has_other_parent(store, parent.key.offset(), key, strays))
         return R_PATH_NOT_FOUND;
     return check_own_lists(store, key);
 }
@@ -111,8 +111,8 @@ int32_t check_level(const Level& level) {
 int32_t walk(Store& store, Level* levels, uint32_t room, const Level& parent, uint32_t position) {
     auto steps = static_cast<uint32_t>(static_cast<uint32_t>(store.bins_size) / sizeof(KeyRecord));
     OwnedCells cells;
-    StrayParent stray;
-    int32_t status = check_entry(store, parent, position, stray, levels[0].key);
+    StrayParents strays;
+    int32_t status = check_entry(store, parent, position, strays, levels[0].key);
     if (status == R_SUCCESS)
         status = enter(store, levels[0], cells);
     if (status != R_SUCCESS)
@@ -127,7 +127,7 @@ int32_t walk(Store& store, Level* levels, uint32_t room, const Level& parent, ui
         } else if (status == R_SUCCESS && (depth == room || steps-- == 0)) {
             status = R_FAILED;
         } else if (status == R_SUCCESS) {
-            status = check_entry(store, level, level.next++, stray, levels[depth].key);
+            status = check_entry(store, level, level.next++, strays, levels[depth].key);
             if (status == R_SUCCESS)
                 status = enter(store, levels[depth], cells);
             if (status == R_SUCCESS)
@@ -158,8 +158,9 @@ int32_t check_tree(Store& store, CellOffset parent_offset, uint32_t depth, uint3
         return R_NOT_ENOUGH_MEMORY;
     int32_t status = room > 0 ? check_level(parent) : int32_t{R_FAILED};
     KeyView key;
-    if (status == R_SUCCESS && read_key(store, subkey_at(store, parent.children, position), key) &&
-        belongs_elsewhere(store, parent_offset, parent.children, key))
+    if (status == R_SUCCESS && !read_key(store, subkey_at(store, parent.children, position), key))
+        status = R_FAILED;
+    if (status == R_SUCCESS && belongs_elsewhere(store, parent_offset, parent.children, key))
         status = R_PATH_NOT_FOUND;
     if (status == R_SUCCESS)
         status = walk(store, levels, room, parent, position);

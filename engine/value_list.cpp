@@ -270,8 +270,11 @@ ValueList find_value_list(Store& store, const KeyRecord& key) {
     if (!find_used_cell(store, cell_offset(key.value_list), list.cell))
         return list;
     const uint32_t capacity = list.cell.room() / slot_size;
-    list.count = claimed < capacity ? claimed : capacity;
-    list.whole = claimed <= capacity;
+    // Slots that lead to one value over and over, in a damaged hive, are not taken for more than there can be.
+    const uint32_t most = static_cast<uint32_t>(store.bins_size) / (sizeof(ValueRecord) + cell_head_size);
+    const uint32_t limit = capacity < most ? capacity : most;
+    list.count = claimed < limit ? claimed : limit;
+    list.whole = claimed <= limit;
     return list;
 }
 

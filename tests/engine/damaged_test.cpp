@@ -229,6 +229,28 @@ TEST(Damaged, an_index_root_is_followed_to_no_more_leaves_than_the_hive_can_hold
     EXPECT_TRUE(scene.Untouched());
 }
 
+TEST(Damaged, a_list_has_no_more_values_than_the_hive_can_hold_records) {
+    constexpr uint32_t slots = 60000;
+    HiveLayout layout;
+    layout.root.add("Top").set("list", 3, Bytes(4 * size_t{slots})).storage = Storage::cell;
+    LaidHive hive = lay_out(layout);
+    const KeyPlaces& top = hive.at("Top");
+    for (uint32_t i = 0; i < slots; i++)
+        hive.put32(top.values[0].data, 4 * i, top.values[0].record);
+    hive.put32(top.record, 36, slots);
+    hive.put32(top.record, 40, top.values[0].data);
+    Scene scene(hive.bytes);
+    const Handle key = scene.OpenKey("Top");
+    uint32_t values = 0;
+    EXPECT_EQ(RQueryInfoKeyW(key.get(), nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, &values, nullptr,
+                             nullptr, nullptr, nullptr),
+              0);
+    EXPECT_GT(values, 0U);
+    EXPECT_LE(values, hive.bytes.size() / 24);  // 24: the smallest cell of a value
+    EXPECT_NE(scene.Set("Top", "new", 4, pattern(4)), 0);
+    EXPECT_TRUE(scene.Untouched());
+}
+
 TEST(Damaged, a_key_made_in_the_list_of_the_root_leaves_the_root_its_list) {
     HiveLayout layout;
     layout.root.add("Loop");

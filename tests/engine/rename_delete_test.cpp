@@ -311,6 +311,29 @@ LaidHive subkeys_of_a_ring(uint32_t count) {
     return hive;
 }
 
+// The key "Top\\full" with count subkeys that name one of two other ones as their parents, by turns. From both of these
+// a way of 200 levels leads to the root, every key on it with the list of "full".
+LaidHive subkeys_of_two_by_turns(uint32_t count) {
+    constexpr uint32_t levels = 200;
+    HiveLayout layout;
+    KeyLayout& full = layout.root.add("Top").add("full");
+    for (uint32_t i = 0; i < count + levels + 2; i++)
+        full.add("key" + std::to_string(10000 + i));
+    LaidHive hive = lay_out(layout);
+    const auto record = [&hive](uint32_t i) { return hive.at("Top\\full\\key" + std::to_string(10000 + i)).record; };
+    for (uint32_t i = count; i < count + levels + 2; i++) {
+        hive.put32(record(i), 20, count + levels + 2);
+        hive.put32(record(i), 28, hive.at("Top\\full").index);
+    }
+    for (uint32_t i = count + 1; i < count + levels; i++)
+        hive.put32(record(i), 16, record(i - 1));
+    for (const uint32_t stray : {count + levels, count + levels + 1})
+        hive.put32(record(stray), 16, record(count + levels - 1));
+    for (uint32_t i = 0; i < count; i++)
+        hive.put32(record(i), 16, record(count + levels + i % 2));
+    return hive;
+}
+
 double reads_to_rename_a_subkey(const LaidHive& hive, uint32_t count) {
     Scene scene(hive.bytes);
     const Handle top = scene.OpenKey("Top");
@@ -321,11 +344,13 @@ double reads_to_rename_a_subkey(const LaidHive& hive, uint32_t count) {
 
 // Whether a subkey belongs elsewhere is found out on the way up from its parent, through lists as long as its own. One
 // of so many keys takes six reads to look through, and the way round the ring one for each of 512 levels.
-TEST_F(Moving, of_many_subkeys_with_one_stray_parent_not_each_is_asked_the_way_up) {
+TEST_F(Moving, of_many_subkeys_with_stray_parents_not_each_is_asked_the_way_up) {
     constexpr uint32_t many = 12000;
     EXPECT_LT(reads_to_rename_a_subkey(subkeys_of_a_stray(many), many), 5);
     constexpr uint32_t few = 600;
     EXPECT_LT(reads_to_rename_a_subkey(subkeys_of_a_ring(few), few), 20);
+    constexpr uint32_t some = 2000;
+    EXPECT_LT(reads_to_rename_a_subkey(subkeys_of_two_by_turns(some), some), 20);
 }
 
 TEST_F(Moving, a_tree_deleted_leaf_by_leaf_is_gone_and_its_place_can_be_used_again) {

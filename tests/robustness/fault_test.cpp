@@ -265,6 +265,62 @@ TEST(FailedAllocation, AHandleCountsTheKeyThatItMade) {
     }
 }
 
+// The caller would take the name for free, and store over the value.
+TEST(FailedAllocation, AHandleThatCouldNotTakeInItsValueDoesNotSayThatItIsNotThere) {
+    bool stored_and_not_taken_in = false;
+    for (uint64_t nth = 1, struck = 1; struck != 0; nth++) {
+        SCOPED_TRACE(nth);
+        Scene scene(operation_hive(Leaf::hash));
+        const Handle key = scene.OpenKey("Rooted");  // its index takes memory
+        const Bytes data = pattern(40);
+        int32_t stored = R_FAILED;
+        int32_t found = R_FAILED;
+        {
+            const AllocationFaults faults(nth, true);
+            stored = RSetValueExW(key.get(), "fresh", 3, data.data(), 40);
+            found = RQueryValueExA(key.get(), "fresh", nullptr, nullptr, nullptr);
+            struck = faults.failed() ? 1 : 0;
+        }
+        if (stored == R_SUCCESS) {
+            EXPECT_NE(found, R_FILE_NOT_FOUND);
+            stored_and_not_taken_in = stored_and_not_taken_in || struck != 0;
+        }
+    }
+    EXPECT_TRUE(stored_and_not_taken_in);
+}
+
+// A name too long for the stack takes memory to compare.
+TEST(FailedAllocation, LeavesTheSecondOfTwoValuesOfOneLongNameAlone) {
+    const std::string name(600, 'n');
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    top.set(name, 3, pattern(100, 5));
+    top.set(name.substr(1) + "m", 3, pattern(100, 9));
+    LaidHive laid = lay_out(layout);
+    laid.bytes[LaidHive::position(laid.at("Top").values[1].record, 20) + name.size() - 1] = 'n';
+    for (const bool is_removal : {true, false}) {
+        bool struck = true;
+        for (uint64_t nth = 1; struck; nth++) {
+            SCOPED_TRACE(nth);
+            Scene scene(laid.bytes);
+            const Handle key = scene.OpenKey("Top");
+            {
+                const AllocationFaults faults(nth);
+                if (is_removal)
+                    RDeleteValue(key.get(), name.c_str());
+                else
+                    RSetValueExW(key.get(), name.c_str(), 3, "new", 3);
+                struck = faults.failed();
+            }
+            const Hive hive = scene.Read();
+            const auto& values = hive.find("Top")->values;
+            EXPECT_TRUE(std::any_of(values.begin(), values.end(),
+                                    [](const Value& value) { return value.data == pattern(100, 9); }));
+            EXPECT_TRUE(struck || nth > 1);
+        }
+    }
+}
+
 // What is refused, or there already, stays so when a failed read hides why: no second key of one name, no key gone that
 // has subkeys.
 TEST(FailedRead, LetsNothingPassThatIsRefused) {
@@ -396,6 +452,28 @@ TEST(FailedRead, LeavesTheSecondOfTwoKeysOfOneNameAlone) {
     };
     with_each_read_failing(
         lay_out(layout).bytes, [](RegistryKey* key) { RDeleteKey(key, "dup"); }, look);
+}
+
+// A key that its list has twice is not deleted: what is below it would be, and then it itself refused.
+TEST(FailedRead, DoesNotLetATreeBeDeletedThatItsListHasTwice) {
+    HiveLayout layout;
+    KeyLayout& top = layout.root.add("Top");
+    for (const char* name : {"a", "b", "c", "d"})
+        top.add(name).set("far", 3, pattern(40000));
+    top.children[0].add("child").set("far", 3, pattern(40000));
+    LaidHive laid = lay_out(layout);
+    laid.put32(laid.at("Top").index, 12, laid.at("Top\\a").record);
+    for (const uint32_t position : {0U, 1U}) {
+        int32_t status = R_FAILED;
+        with_each_read_failing(
+            laid.bytes,
+            [&](RegistryKey* key) {
+                Handle last;
+                ROpenKey(key, "d", last.out());
+                status = RCheckDeleteTree(key, position);
+            },
+            [&status](Scene&) { EXPECT_NE(status, R_SUCCESS); });
+    }
 }
 
 // In a damaged hive a value's data may lead to a record or a list. A failed read must not make that pass for data.
