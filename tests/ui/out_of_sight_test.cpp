@@ -243,7 +243,8 @@ private slots:
         stage.return_to(*stage.keys);
         const auto is_in_sight = [&] {
             const QWidget* editor = editor_in(*stage.keys);
-            return editor && stage.keys->viewport()->rect().contains(editor->geometry());
+            const QRect row = stage.keys->visualRect(stage.keys->currentIndex());
+            return editor && stage.keys->viewport()->rect().contains(row) && row.contains(editor->geometry().center());
         };
         QScrollBar* sideways = stage.keys->horizontalScrollBar();
         for (const int scrolled_to : {sideways->minimum(), sideways->maximum()}) {
