@@ -62,7 +62,12 @@ int position_by_path(RegistryKey* handle, const char* name) {
 
 AbstractRegKey::~AbstractRegKey() = default;
 
-AbstractRegKey* AbstractRegKey::child(int i) { return children_[static_cast<size_t>(i)]; }
+AbstractRegKey* AbstractRegKey::child(int i) { return laid_out()[static_cast<size_t>(i)]; }
+
+std::vector<AbstractRegKey*>& AbstractRegKey::laid_out() {
+    children_.resize(slot_count_, nullptr);
+    return children_;
+}
 
 std::unique_lock<std::recursive_mutex> AbstractRegKey::lock_children() const {
     std::recursive_mutex* const lock = children_lock();
@@ -71,7 +76,7 @@ std::unique_lock<std::recursive_mutex> AbstractRegKey::lock_children() const {
 
 int AbstractRegKey::child_count() const {
     const auto locker = lock_children();
-    return static_cast<int>(children_.size());
+    return static_cast<int>(slot_count_);
 }
 
 int AbstractRegKey::child_number() const {
@@ -93,7 +98,8 @@ int AbstractRegKey::child_number() const {
 
 void AbstractRegKey::add_child(AbstractRegKey* key) {
     const auto locker = lock_children();
-    children_.push_back(key);
+    laid_out().push_back(key);
+    slot_count_++;
 }
 
 RegKey::RegKey(RegHive* hive, AbstractRegKey* parent) : AbstractRegKey(parent), hive_(hive) {}
@@ -123,9 +129,9 @@ std::recursive_mutex* RegKey::children_lock() const { return hive_->api_mutex();
 
 AbstractRegKey* RegKey::child(int i) {
     const RegHive::Dialogue dialogue(hive_);
-    if (static_cast<size_t>(i) >= children_.size() || i < 0)
+    if (static_cast<size_t>(i) >= slot_count_ || i < 0)
         throw std::out_of_range("vector::_M_range_check");
-    AbstractRegKey*& slot = children_[static_cast<size_t>(i)];
+    AbstractRegKey*& slot = laid_out()[static_cast<size_t>(i)];
     if (slot == nullptr) {
         auto made = std::make_unique<RegKey>(hive_, this, i);
         made->number_hint(static_cast<size_t>(i));
@@ -184,7 +190,9 @@ QString RegKey::name() {
 }
 
 void RegKey::refresh_children(RegistryKey* handle) {
-    children_.resize(subkey_count(handle), nullptr);
+    slot_count_ = subkey_count(handle);
+    if (!children_.empty())
+        laid_out();
     learn_offset(RKeyOffset(handle));
 }
 
@@ -193,7 +201,7 @@ void RegKey::learn_offset(uint32_t offset) {
     freed_before_ = hive_->times_freed_;
 }
 
-bool RegKey::slots_agree(RegistryKey* handle) const { return children_.size() == subkey_count(handle); }
+bool RegKey::slots_agree(RegistryKey* handle) const { return slot_count_ == subkey_count(handle); }
 
 void RegKey::reload() {
     const RegHive::Dialogue dialogue(hive_);
@@ -235,7 +243,7 @@ int RegKey::find_child_position(RegistryKey* handle, const QByteArray& name) {
     int result = -2;
     size_t low = 0;
     // The number of slots, not one less: a key that was just made has no slot yet.
-    size_t high = children_.size();
+    size_t high = slot_count_;
     while (low <= high) {
         const size_t middle = low + (high - low) / 2;
         NameBuffer listed;
@@ -268,13 +276,12 @@ int RegKey::find_child_position(RegistryKey* handle, const QByteArray& name) {
 // Whether the subkey at an index is the one that the slot's object shows. Where a damaged hive lists a key below
 // itself, two objects stand for one key, and what is made through the one moves what the other shows.
 bool RegKey::is_shown_at(RegistryKey* handle, int index) const {
-    if (index < 0 || static_cast<size_t>(index) >= children_.size())
+    if (index < 0 || static_cast<size_t>(index) >= slot_count_)
         return false;
-    const auto* shown = static_cast<const RegKey*>(children_[static_cast<size_t>(index)]);
+    const auto* shown = children_.empty() ? nullptr : static_cast<const RegKey*>(children_[static_cast<size_t>(index)]);
     if (shown == nullptr || shown->offset_ == UINT32_MAX)
         return true;  // nothing was shown
-    const uint32_t listed = subkey_offset(handle, index);
-    return listed == UINT32_MAX || listed == shown->offset_;  // what cannot be opened cannot be harmed
+    return subkey_offset(handle, index) == shown->offset_ && !hive_->has_left(shown);
 }
 
 int RegKey::new_key() {
@@ -293,7 +300,7 @@ int RegKey::new_key() {
             RCloseKey(made);
         // A key that was made but could not be read back is there all the same, and so is one whose last write failed
         // and could not be taken back.
-        if (existed == 0 || (status != R_SUCCESS && subkey_count(handle) == children_.size() + 1))
+        if (existed == 0 || (status != R_SUCCESS && subkey_count(handle) == slot_count_ + 1))
             break;
         if (status != R_SUCCESS)
             return -1;
@@ -305,9 +312,9 @@ int RegKey::new_key() {
         RDeleteKey(handle, name);
         return position;
     }
-    if (static_cast<size_t>(position) > children_.size())
-        children_.resize(static_cast<size_t>(position), nullptr);  // made through another object, see is_shown_at
-    children_.insert(children_.begin() + position, nullptr);
+    slot_count_ = std::max(slot_count_, static_cast<size_t>(position));  // made through another object, see is_shown_at
+    laid_out().insert(children_.begin() + position, nullptr);
+    slot_count_++;
     try {
         child(position);
     } catch (const std::runtime_error&) {
@@ -328,6 +335,8 @@ bool RegKey::delete_key(int index) {
         std::strchr(name.data(), '\\') != nullptr || position_by_path(handle, name.data()) != index)
         return false;
     const uint32_t offset = subkey_offset(handle, index);
+    if (offset == UINT32_MAX)
+        return false;  // the cell that becomes free could not be noted
     const bool is_deleted = RDeleteKey(handle, name.data()) == R_SUCCESS;
     // Where a damaged hive lists the key, or keys below it, in other places too, handles from there would go on leading
     // to cells that become other keys'.
@@ -336,15 +345,16 @@ bool RegKey::delete_key(int index) {
     if (!is_deleted && !lists_one_less())
         return false;
     hive_->note_freed(offset);
-    const auto slot = children_.begin() + index;
+    const auto slot = laid_out().begin() + index;
     const std::unique_ptr<AbstractRegKey> gone(*slot);
     children_.erase(slot);
+    slot_count_--;
     return true;
 }
 
 bool RegKey::lists_one_less() const {
     try {
-        return subkey_count(hive_->key_handle(this)) + 1 == children_.size();
+        return subkey_count(hive_->key_handle(this)) + 1 == slot_count_;
     } catch (const std::runtime_error&) {
         return false;
     }
@@ -386,16 +396,23 @@ int RegKey::rename_key(int index, const QString& new_name) {
     hive_->clear_handle_cache();
     RegistryKey* handle = hive_->key_handle(this);
     const uint32_t old_offset = subkey_offset(handle, index);
-    if (!slots_agree(handle) || !is_shown_at(handle, index) ||
+    if (old_offset == UINT32_MAX || !slots_agree(handle) || !is_shown_at(handle, index) ||
         RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
         return -1;
     hive_->note_freed(old_offset);
-    const int position = find_child_position(handle, name.bytes);
+    // The key has its new name, so what follows is tried once more where a read fails.
+    int position = find_child_position(handle, name.bytes);
+    if (position < 0)
+        position = find_child_position(handle, name.bytes);
     if (position < 0)
         return -2;
-    AbstractRegKey* renamed = children_[static_cast<size_t>(index)];
-    if (renamed != nullptr)
-        static_cast<RegKey*>(renamed)->learn_offset(subkey_offset(handle, position));
+    AbstractRegKey* renamed = laid_out()[static_cast<size_t>(index)];
+    uint32_t offset = subkey_offset(handle, position);
+    if (offset == UINT32_MAX)
+        offset = subkey_offset(handle, position);
+    // Else the old one stays, whose cell the key has left: its object is taken for no other key's.
+    if (renamed != nullptr && offset != UINT32_MAX)
+        static_cast<RegKey*>(renamed)->learn_offset(offset);
     children_.erase(children_.begin() + index);
     children_.insert(children_.begin() + position, renamed);
     return position;

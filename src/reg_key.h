@@ -45,9 +45,12 @@ public:
 
 protected:
     explicit AbstractRegKey(AbstractRegKey* parent) : parent_(parent) {}
+    // The slots, laid out when a child is first asked for: in a damaged hive many keys may list the same many subkeys.
+    std::vector<AbstractRegKey*>& laid_out();
 
     AbstractRegKey* parent_;  // null at the top; not owned
-    std::vector<AbstractRegKey*> children_;
+    size_t slot_count_ = 0;
+    std::vector<AbstractRegKey*> children_;  // empty until laid_out() is called, then of slot_count_
 
 private:
     std::unique_lock<std::recursive_mutex> lock_children() const;

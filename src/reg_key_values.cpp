@@ -11,9 +11,11 @@
 #include <tallowfen/registry.h>
 
 #include <array>
-#include <cstdio>
+#include <charconv>
 #include <cstring>
+#include <set>
 #include <stdexcept>
+#include <string>
 
 namespace {
 
@@ -43,6 +45,27 @@ EnumeratedName enumerate_name(RegistryKey* handle, int index) {
         throw std::invalid_argument("index");
     found.name = QString(reinterpret_cast<const QChar*>(buffer.constData()), static_cast<qsizetype>(size / 2));
     return found;
+}
+
+constexpr char new_value_prefix[] = "New Value #";
+constexpr uint32_t prefix_length = sizeof new_value_prefix - 1;
+
+// The numbers behind the prefix in the names of the first count values, as far as those can be read.
+std::set<int> new_value_numbers(RegistryKey* handle, int count) {
+    std::set<int> numbers;
+    for (int i = 0; i < count; i++) {
+        std::array<char, prefix_length + 10> name = {};
+        auto size = static_cast<uint32_t>(name.size());
+        if (REnumValueA(handle, static_cast<uint32_t>(i), name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
+            size > name.size() || qstrnicmp(name.data(), new_value_prefix, prefix_length) != 0)
+            continue;
+        int number = 0;
+        const char* const digits = name.data() + prefix_length;
+        const char* const end = name.data() + size;
+        if (std::from_chars(digits, end, number).ptr == end && *digits != '0')
+            numbers.insert(number);
+    }
+    return numbers;
 }
 
 // The data as stored. false when it cannot be read, or is said to be longer than the file.
@@ -272,15 +295,19 @@ bool RegKey::rename_value(int index, const QString& new_name) {
            store_value(new_name, old.type, bytes, new_value) && delete_value(index);
 }
 
+// Names of the form that new ones get are read in one go, since to ask the engine for each takes a walk over all names.
+// It is asked for the first that was not met: one stored in UTF-16, say, may have the name.
 QString RegKey::new_value_name() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
+    const std::set<int> taken = new_value_numbers(handle, value_count());
     for (int i = 1;; i++) {
-        char name[64];
-        std::snprintf(name, sizeof name, "New Value #%i", i);
-        const int32_t status = RQueryValueExA(handle, name, nullptr, nullptr, nullptr);
+        if (taken.count(i) != 0)
+            continue;
+        const std::string name = new_value_prefix + std::to_string(i);
+        const int32_t status = RQueryValueExA(handle, name.c_str(), nullptr, nullptr, nullptr);
         if (status == R_FILE_NOT_FOUND)
-            return QString::fromLatin1(name);
+            return QString::fromStdString(name);
         if (status != R_SUCCESS)
             return QString();
     }

@@ -110,14 +110,14 @@ private:
     QModelIndex searched_;  // set by find; the tree may have changed since
     QMutex mutex_;          // guards stop_; held too where the search's stack goes to its thread and back
     bool stop_ = false;
-    // How many keys of each hive the search may still visit, and go further down from. A damaged hive can list a key
-    // more often than the file has room for keys; twice what its size allows bounds the walk, the first half of it
-    // going down.
-    struct KeysLeft {
-        qint64 to_visit;
-        qint64 to_descend;
+    // How far the search may still go in a hive. A damaged one can list keys and values more often than the file has
+    // room for them; what its size allows bounds the walk.
+    struct WayLeft {
+        qint64 keys;     // to visit
+        qint64 subkeys;  // of the keys that are gone down into
+        qint64 values;   // of the keys whose values are visited
     };
-    std::map<const RegHive*, KeysLeft> keys_left_;
+    std::map<const RegHive*, WayLeft> way_left_;
 };
 
 Q_DECLARE_OPERATORS_FOR_FLAGS(RegModel::FindMode)

@@ -22,6 +22,9 @@ constexpr int frames_between_stop_checks = 10;
 // A key takes at least its record and its cell's size word in the file.
 constexpr qint64 smallest_key = 80;
 
+// The same for a value.
+constexpr qint64 smallest_value = 24;
+
 qint64 most_keys_in(const RegHive& hive) { return 1 + hive.file_size() / smallest_key; }
 
 // Every kind of match ignores case. The low four bits of the flags say which kind.
@@ -67,10 +70,10 @@ void RegModel::begin_find(const QModelIndex& start) {
     value_names_.clear();
     if (start.isValid())
         search_.push_back({start, with_siblings});
-    keys_left_.clear();
+    way_left_.clear();
     for (const auto& hive : hives_) {
         const qint64 most = most_keys_in(*hive);
-        keys_left_[hive.get()] = {2 * most, most};
+        way_left_[hive.get()] = {2 * most, most, 2 * hive->file_size() / smallest_value};
     }
     // Last, so that the lock hands the stack over to the worker as well.
     const QMutexLocker locker(&mutex_);
@@ -101,13 +104,14 @@ bool RegModel::push_key_frames(const Frame& frame, FindMode mode) {
     const auto* const in_hive = dynamic_cast<const RegKey*>(visited);
     bool goes_on = true;
     bool goes_down = !visited->is_below_itself();
-    if (in_hive != nullptr) {
-        KeysLeft& left = keys_left_[in_hive->hive()];
-        left.to_visit--;
-        left.to_descend--;
+    WayLeft* const left = in_hive != nullptr ? &way_left_[in_hive->hive()] : nullptr;
+    const WayLeft left_before = left != nullptr ? *left : WayLeft();
+    if (left != nullptr) {
+        left->keys--;
+        left->subkeys -= in_hive->child_count();
         // A hive's root is listed in its group, whose other hives have nothing to do with it.
-        goes_on = left.to_visit > 0 || in_hive == in_hive->hive()->root_key();
-        goes_down = goes_down && left.to_descend > 0;
+        goes_on = left->keys > 0 || in_hive == in_hive->hive()->root_key();
+        goes_down = goes_down && left->subkeys >= 0;
     }
     if (goes_on && frame.value == with_siblings)
         push_next_sibling(frame.key);
@@ -117,11 +121,15 @@ bool RegModel::push_key_frames(const Frame& frame, FindMode mode) {
     RegKey* const key = mode.testFlag(FindValues) ? editable_key(frame.key) : nullptr;
     if (key == nullptr)
         return true;
+    left->values -= key->value_count();
+    if (left->values < 0)
+        return true;
     // Read and sorted once for all of the key's values.
     auto names = shown_value_names(*key, ValuesModel::default_name(), [this] { return is_stopped(); });
     if (!names.has_value()) {
         search_.resize(frames_before, frame);
         search_.push_back(frame);
+        *left = left_before;
         return false;
     }
     value_names_ = std::move(*names);

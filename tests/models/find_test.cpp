@@ -11,6 +11,8 @@
 
 #include <QTest>
 
+#include <malloc.h>
+
 #include <algorithm>
 #include <random>
 #include <utility>
@@ -242,6 +244,48 @@ private slots:
             laid.put32(laid.at("Loop").index, entry, laid.at("Loop").record);
         Searched searched(laid.bytes);
         QCOMPARE(searched.all(QStringLiteral("target"), RegModel::FindKeys), list({"TOP/HIVE/Target"}));
+    }
+
+    // Keys whose records have the list of values of one: each is found, until there are more than a file can hold.
+    void keys_that_share_a_list_of_values_are_not_searched_without_end() {
+        constexpr int keys = 100;
+        constexpr int values = 300;
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& parent = hive.root.add("Parent");
+        for (int i = 0; i < keys; i++)
+            parent.add("key" + std::to_string(1000 + i));
+        for (int i = 0; i < values; i++)
+            hive.root.children[0].children[0].set("v" + std::to_string(i), 4, testkit::pattern(4));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        const testkit::KeyPlaces& first = laid.at("Parent\\key1000");
+        for (int i = 1; i < keys; i++) {
+            const uint32_t record = laid.at("Parent\\key" + std::to_string(1000 + i)).record;
+            laid.put32(record, 36, values);
+            laid.put32(record, 40, first.value_list);
+        }
+        Searched searched(laid.bytes);
+        const qsizetype hits = searched.all(QStringLiteral("v"), RegModel::FindValues).size();
+        QVERIFY(hits > 2 * values);
+        QVERIFY(hits <= static_cast<qsizetype>(2 * laid.bytes.size() / 24));
+    }
+
+    // Keys that list all of their siblings and themselves: few of them are gone down into.
+    void keys_that_share_a_list_of_keys_do_not_fill_the_memory() {
+        constexpr int keys = 1000;
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& parent = hive.root.add("Parent");
+        for (int i = 0; i < keys; i++)
+            parent.add("key" + std::to_string(1000 + i));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        for (int i = 0; i < keys; i++) {
+            const uint32_t record = laid.at("Parent\\key" + std::to_string(1000 + i)).record;
+            laid.put32(record, 20, keys);
+            laid.put32(record, 28, laid.at("Parent").index);
+        }
+        Searched searched(laid.bytes);
+        const size_t before = mallinfo2().uordblks;
+        QVERIFY(searched.all(QStringLiteral("absent"), RegModel::FindKeys).isEmpty());
+        QVERIFY(mallinfo2().uordblks - before < 20 * laid.bytes.size());  // a sanitizer's memory is not counted
     }
 
     // Every key lists the next one twice: without a loop, but with more ways down than any file has keys.

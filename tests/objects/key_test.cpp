@@ -7,6 +7,8 @@
 
 #include <QTest>
 
+#include <malloc.h>
+
 #include <functional>
 #include <stdexcept>
 
@@ -232,6 +234,31 @@ private slots:
         QCOMPARE(first->parent(), static_cast<AbstractRegKey*>(parent));
         QCOMPARE(first->child_number(), 0);
         QCOMPARE(first->child_count(), 1);
+    }
+
+    // Each of them has as many subkeys, none of which was asked for.
+    void rows_of_keys_that_list_the_same_keys_take_little_memory() {
+        constexpr int count = 1500;
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& parent = hive.root.add("Parent");
+        for (int i = 0; i < count; i++)
+            parent.add("key" + std::to_string(10000 + i));
+        testkit::LaidHive laid = testkit::lay_out(hive);
+        for (const testkit::KeyLayout& key : hive.root.children[0].children) {
+            const uint32_t record = laid.at("Parent\\" + testkit::utf8(key.name)).record;
+            laid.put32(record, 20, count);
+            laid.put32(record, 28, laid.at("Parent").index);
+        }
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        auto* key = static_cast<RegKey*>(opened.root_key()->child(0));
+        key->child(0);
+        const size_t before = mallinfo2().uordblks;
+        for (int i = 0; i < count; i++)
+            QCOMPARE(key->child(i)->child_count(), count);
+        QVERIFY(mallinfo2().uordblks - before < 10 * laid.bytes.size());  // a sanitizer's memory is not counted
+        QVERIFY(key->child(1)->child(2)->parent() == key->child(1));
     }
 
     // The file is mended behind the program's back: the row that was shown without subkeys stays without, and says so.

@@ -121,6 +121,22 @@ private slots:
         QVERIFY(taken > 0);
     }
 
+    // Another key by the time it is asked of the other object, though it lies where the first one did.
+    void a_new_key_in_the_cell_of_one_that_is_gone_is_changed_through_no_old_object() {
+        for (const bool renames : {true, false}) {
+            Opened opened;
+            RegKey* const here = Opened::child(opened.first, 0);
+            RegKey* const there = Opened::child(opened.second, 0);
+            Opened::child(here, 0);
+            Opened::child(there, 0);
+            QVERIFY(here->delete_key(0));
+            QCOMPARE(here->new_key(), 0);
+            const testkit::Bytes before = opened.file.bytes();
+            QVERIFY(renames ? there->rename_key(0, QStringLiteral("other")) < 0 : !there->delete_key(0));
+            QVERIFY(opened.file.bytes() == before);
+        }
+    }
+
     void values_count_in_both_places() {
         Opened opened;
         RegKey* const one = Opened::child(opened.first, 0);

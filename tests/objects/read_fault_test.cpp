@@ -193,6 +193,24 @@ const NamesakeOperation namesake_operations[] = {
      [](const testkit::Key& key) { return has_key_with(key, u"2"); }},
 };
 
+// A key listed below two parents, with its list of values far off.
+testkit::Bytes key_listed_twice() {
+    testkit::HiveLayout hive;
+    hive.root.add("First").add("Twice listed").set("old", 3, testkit::pattern(40000));
+    hive.root.add("Second").add("other");
+    hive.root.add("Third");
+    testkit::LaidHive laid = testkit::lay_out(hive);
+    laid.put32(laid.at("Second").index, 4, laid.at("First\\Twice listed").record);
+    const HiveOnDisk file(laid.bytes);
+    DummyRegKey top(QStringLiteral("TOP"));
+    RegHive mounted(QStringLiteral("HIVE"), file.path(), &top);
+    const auto child = [](AbstractRegKey* key, int i) { return static_cast<RegKey*>(key->child(i)); };
+    child(mounted.root_key(), 2)->set_binary_value(QStringLiteral("far"), QByteArray(60000, 'v'), REG_BINARY);
+    for (int i = 0; i < 30; i++)
+        child(child(mounted.root_key(), 0), 0)->set_dword_value(QStringLiteral("v%1").arg(i), 7, little_endian_order);
+    return file.bytes();
+}
+
 // The values of the key but one.
 std::map<std::string, testkit::Bytes> values_but(const testkit::Hive& hive, const std::string& left_out) {
     std::map<std::string, testkit::Bytes> values;
@@ -288,6 +306,101 @@ private slots:
             QVERIFY(failed || done != is_refused);
         }
         QVERIFY(nth > 2);
+    }
+
+    // The rename is done, but where its key is now cannot be read: the rows stay in the old order.
+    void a_row_that_a_failed_rename_left_behind_deletes_no_other_key() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& parent = hive.root.add("Parent");
+        for (const char* name : {"Aa", "Bb", "Cc", "Dd"})
+            parent.add(name).set("far", 3, testkit::pattern(40000));
+        const testkit::Bytes bytes = testkit::lay_out(hive).bytes;
+        bool failed = true;
+        int left_behind = 0;
+        for (int nth = 1; failed; nth++) {
+            for (int then = 1; then < 12; then++) {
+                const HiveOnDisk file(bytes);
+                DummyRegKey top(QStringLiteral("TOP"));
+                RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+                auto* key = static_cast<RegKey*>(opened.root_key()->child(0));
+                for (int i = 0; i < 4; i++)
+                    key->child(i)->name();
+                int row = -1;
+                {
+                    const testkit::ReadFaults faults(nth, true);
+                    try {
+                        row = key->rename_key(0, QStringLiteral("Zz"));
+                    } catch (const std::exception&) {
+                        // nothing was done
+                    }
+                    failed = faults.failed();
+                }
+                if (row >= 0 || file.read().find("Parent\\Zz") == nullptr)
+                    break;
+                left_behind++;
+                {
+                    const testkit::ReadFaults faults(then);
+                    try {
+                        key->delete_key(1);
+                    } catch (const std::exception&) {
+                        // nothing was done
+                    }
+                }
+                QVERIFY(file.read().find("Parent\\Cc") != nullptr);
+            }
+        }
+        QVERIFY(left_behind > 0);
+    }
+
+    // Its cell could not be noted as free, so that the other object would take the next key there for its own.
+    void a_key_deleted_while_a_read_fails_is_no_other_key_elsewhere() {
+        const testkit::Bytes bytes = key_listed_twice();
+        bool failed = true;
+        for (int nth = 1; failed; nth++) {
+            const HiveOnDisk file(bytes);
+            DummyRegKey top(QStringLiteral("TOP"));
+            RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+            const auto child = [](AbstractRegKey* key, int i) { return static_cast<RegKey*>(key->child(i)); };
+            RegKey* const first = child(hive.root_key(), 0);
+            RegKey* const shown = child(child(hive.root_key(), 1), 0);
+            RegKey* const third = child(hive.root_key(), 2);
+            first->child(0);
+            bool deleted = false;
+            {
+                const testkit::ReadFaults faults(nth);
+                try {
+                    deleted = first->delete_key(0);
+                } catch (const std::exception&) {
+                    // nothing was done
+                }
+                failed = faults.failed();
+            }
+            for (int i = 0; i < 40; i++)
+                third->new_key();
+            bool stored = false;
+            try {
+                stored = shown->set_dword_value(QStringLiteral("stray"), 1, little_endian_order);
+            } catch (const std::exception&) {
+                // it is gone
+            }
+            QVERIFY2(!deleted || !stored, qPrintable(QStringLiteral("read %1").arg(nth)));
+        }
+    }
+
+    // To ask for each number would take a walk over all names for each.
+    void a_name_for_a_new_value_is_found_in_one_pass() {
+        constexpr int count = 3000;
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& wide = hive.root.add("Wide");
+        for (int i = 1; i <= count; i++)
+            wide.set("New Value #" + std::to_string(i), 4, testkit::pattern(4));
+        const HiveOnDisk file(hive);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        const testkit::ReadFaults reads(0);
+        QCOMPARE(static_cast<RegKey*>(opened.root_key()->child(0))->new_value_name(),
+                 QStringLiteral("New Value #3001"));
+        QVERIFY(reads.reads() < 1000);
     }
 
     void nothing_of_the_same_name_goes_instead_data() {

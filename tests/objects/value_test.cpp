@@ -182,6 +182,11 @@ private slots:
         QCOMPARE(opened.empty()->new_value_name(), QStringLiteral("New Value #1"));
         QVERIFY(opened.empty()->set_qword_value(QStringLiteral("New Value #1"), 1));
         QCOMPARE(opened.empty()->new_value_name(), QStringLiteral("New Value #2"));
+        for (const char* name : {"NEW value #2", "New Value #4", "New Value #03", "New Value #3x", "New Value #"})
+            QVERIFY(opened.empty()->set_qword_value(QLatin1String(name), 1));
+        QCOMPARE(opened.empty()->new_value_name(), QStringLiteral("New Value #3"));
+        QVERIFY(opened.empty()->set_qword_value(QStringLiteral("New Value #3"), 1));
+        QCOMPARE(opened.empty()->new_value_name(), QStringLiteral("New Value #5"));
     }
 
     void a_rename_keeps_type_and_bytes() {
