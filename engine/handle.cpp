@@ -83,6 +83,8 @@ KeyRecord snapshot(RegistryKey& handle) {
     record.subkey_index = raw(CellOffset::none);
     record.value_count = handle.info->value_count;
     record.value_list = raw(CellOffset::none);
+    if (handle.counts_are_old && record.value_count == 0)
+        record.value_count = 1;  // there may be one by now, which must not pass for none
     KeyView key;
     if (read_key(*handle.store, handle.info->own, key)) {
         record.subkey_index = key.record.subkey_index;

@@ -55,8 +55,8 @@ struct Store {
 
     const Bin* held_bin;  // not walked again after a write, see HeldBin; mostly null
     int32_t unread_bins;  // how many bins are unread
-    // Raised when the device fails, or memory to read into runs out, which tells what could not be read from what is
-    // not there.
+    // Raised when the device fails, or memory for a name to compare runs out: it tells what could not be read from what
+    // is not there.
     uint32_t failed_reads;
     int32_t recent_bin;   // where the last look-up of a cell ended: the next is mostly near
     uint32_t generation;  // raised by every write, so that what was derived from the file can be known for stale

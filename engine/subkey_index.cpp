@@ -44,6 +44,17 @@ bool count_leaf(const Store& store, SubkeyIndex& index, Leaf& leaf) {
     return true;
 }
 
+// Reads as many of a root's count entries as there is room for, from the i-th on: of those that end with the file one
+// alone. Returns how many were read.
+template <uint32_t room>
+uint32_t read_entries(Store& store, const Cell& root, uint32_t i, uint32_t count, Le32 (&entries)[room]) {
+    const uint32_t rest = count - i < room ? count - i : room;
+    const auto skip = static_cast<uint32_t>(sizeof(IndexHead) + i * sizeof entries[0]);
+    if (read_part(store, root, skip, entries, rest * static_cast<uint32_t>(sizeof entries[0])))
+        return rest;
+    return read_part(store, root, skip, entries, sizeof entries[0]) ? 1 : 0;
+}
+
 bool load_root(Store& store, uint32_t claimed, SubkeyIndex& index) {
     const uint32_t capacity =
         (index.cell.room() - static_cast<uint32_t>(sizeof(IndexHead))) / static_cast<uint32_t>(sizeof(Le32));
@@ -52,22 +63,26 @@ bool load_root(Store& store, uint32_t claimed, SubkeyIndex& index) {
     index.whole = count == claimed && count > 0;
     if (count == 0)
         return true;
-    index.leaves = static_cast<Leaf*>(malloc(count * sizeof(Leaf)));
+    const uint32_t room = most_keys(store) + most_empty_leaves;
+    index.leaves = static_cast<Leaf*>(malloc((count < room ? count : room) * sizeof(Leaf)));
     if (index.leaves == nullptr)
         return false;
     // Many entries at a time, or the window would go to and fro between the root and the leaves.
     Le32 entries[256];
-    constexpr uint32_t most = sizeof entries / sizeof entries[0];
-    for (uint32_t i = 0; i < count; i++) {
-        const uint32_t rest = count - i < most ? count - i : most;
-        const auto skip = static_cast<uint32_t>(sizeof(IndexHead) + i * sizeof entries[0]);
+    uint32_t held = 0;
+    for (uint32_t i = 0, first = 0; i < count && index.leaf_count < room; i++) {
+        if (i == first + held) {
+            first = i;
+            held = read_entries(store, index.cell, i, count, entries);
+        }
         Leaf& leaf = index.leaves[i];
-        if ((i % most == 0 && !read_part(store, index.cell, skip, entries, rest * sizeof entries[0])) ||
-            !read_leaf(store, cell_offset(entries[i % most]), leaf, index.whole) || !count_leaf(store, index, leaf)) {
+        if (held == 0 || !read_leaf(store, cell_offset(entries[i - first]), leaf, index.whole) ||
+            !count_leaf(store, index, leaf)) {
             index.whole = false;
             return true;
         }
     }
+    index.whole = index.whole && index.leaf_count == count;
     return true;
 }
 
@@ -203,9 +218,13 @@ uint32_t subkeys_at(Store& store, const SubkeyIndex& index, uint32_t position, C
         uint8_t bytes[32 * sizeof(LeafEntry)];
         const uint32_t fits = static_cast<uint32_t>(sizeof bytes) / size;
         const uint32_t rest = leaf.count - entry < most - read ? leaf.count - entry : most - read;
-        const uint32_t count = rest < fits ? rest : fits;
-        if (!read_part(store, leaf.cell, static_cast<uint32_t>(sizeof(IndexHead)) + entry * size, bytes, count * size))
-            break;
+        uint32_t count = rest < fits ? rest : fits;
+        const uint32_t skip = static_cast<uint32_t>(sizeof(IndexHead)) + entry * size;
+        if (!read_part(store, leaf.cell, skip, bytes, count * size)) {
+            count = 1;  // the file may end among them
+            if (!read_part(store, leaf.cell, skip, bytes, size))
+                break;
+        }
         for (uint32_t i = 0; i < count; i++) {
             Le32 key;
             memcpy(&key, bytes + i * size, sizeof key);

@@ -284,9 +284,12 @@ uint32_t values_at(Store& store, const ValueList& list, uint32_t i, CellOffset* 
         Le32 slots[256];
         constexpr uint32_t fits = sizeof slots / slot_size;
         const uint32_t rest = list.count - i < most - read ? list.count - i : most - read;
-        const uint32_t count = rest < fits ? rest : fits;
-        if (!read_part(store, list.cell, i * slot_size, slots, count * slot_size))
-            break;
+        uint32_t count = rest < fits ? rest : fits;
+        if (!read_part(store, list.cell, i * slot_size, slots, count * slot_size)) {
+            count = 1;  // the file may end among them
+            if (!read_part(store, list.cell, i * slot_size, slots, slot_size))
+                break;
+        }
         for (uint32_t slot = 0; slot < count; slot++)
             offsets[read++] = cell_offset(slots[slot]);
         i += count;

@@ -289,6 +289,31 @@ TEST(FailedAllocation, AHandleThatCouldNotTakeInItsValueDoesNotSayThatItIsNotThe
     EXPECT_TRUE(stored_and_not_taken_in);
 }
 
+// The same where it is the first value, and nothing can be read any more.
+TEST(FailedRead, DoesNotHideTheFirstValueFromTheHandleThatStoredIt) {
+    HiveLayout layout;
+    layout.root.add("Top");
+    layout.root.add("Zzz").set("far", 3, pattern(240000));
+    const Bytes start = lay_out(layout).bytes;
+    bool stored_and_not_taken_in = false;
+    bool struck = true;
+    for (uint64_t nth = 1; struck; nth++) {
+        SCOPED_TRACE(nth);
+        Scene scene(start);
+        const Handle key = scene.OpenKey("Top");
+        const Bytes data = pattern(40);
+        scene.file().arm({Call::read, nth, true, false});
+        const int32_t stored = RSetValueExW(key.get(), "fresh", 3, data.data(), 40);
+        const int32_t found = RQueryValueExW(key.get(), "fresh", nullptr, nullptr, nullptr);
+        struck = scene.file().failed();
+        if (stored == R_SUCCESS) {
+            EXPECT_NE(found, R_FILE_NOT_FOUND);
+            stored_and_not_taken_in = stored_and_not_taken_in || struck;
+        }
+    }
+    EXPECT_TRUE(stored_and_not_taken_in);
+}
+
 // A name too long for the stack takes memory to compare.
 TEST(FailedAllocation, LeavesTheSecondOfTwoValuesOfOneLongNameAlone) {
     const std::string name(600, 'n');
