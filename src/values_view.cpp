@@ -296,11 +296,13 @@ int ValuesView::row_of(const QString& name, int row) const {
 }
 
 void ValuesView::delete_value() {
-    // What is deleted is the value that was asked about.
-    const QPersistentModelIndex asked = currentIndex();
+    // What is deleted is the value that was asked about. The other cells of its row cannot be highlighted, and do not
+    // say which value it is.
+    const QPersistentModelIndex asked = currentIndex().siblingAtColumn(name_column);
     if (!asked.isValid()) {
         return;
     }
+    setCurrentIndex(asked);
     show_current();
     if (QMessageBox::question(this, tr("Confirm Value Removal"), tr("Are you sure you want to delete this value?"),
                               QMessageBox::Yes | QMessageBox::No) != QMessageBox::Yes) {
@@ -310,11 +312,10 @@ void ValuesView::delete_value() {
         return;
     }
     const int row = asked.row();
-    const int column = asked.column();
     const QString name = spoken_name(*model(), row);
     // A removal that was announced and then did not come to be has moved the selection to a neighbour, and the table
     // may have been sorted since.
-    const auto return_to_kept = [&] { make_current(model()->index(row_of(name, row), column)); };
+    const auto return_to_kept = [&] { make_current(model()->index(row_of(name, row), name_column)); };
     bool removed = false;
     try {
         removed = model()->removeRows(row, 1, QModelIndex());

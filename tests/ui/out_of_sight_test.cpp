@@ -185,6 +185,28 @@ private slots:
         QVERIFY(was_seen);
     }
 
+    // The cells beside the name become current by a click, but cannot be highlighted.
+    void the_name_of_the_value_that_is_asked_about_is_highlighted() {
+        const Scene scene(many_rows());
+        Stage stage(scene);
+        const CurrentRow row(stage, true);
+        const QModelIndex name = stage.values->currentIndex();
+        for (const int column : {1, 2}) {
+            stage.return_to(*stage.values);
+            stage.values->setCurrentIndex(name.siblingAtColumn(column));
+            QModelIndexList highlighted;
+            DialogHand hand;
+            hand.then([&](QWidget* question) {
+                highlighted = stage.values->selectionModel()->selectedIndexes();
+                QTest::keyClick(question, Qt::Key_Escape);
+            });
+            QTest::keyClick(stage.values, Qt::Key_Delete);
+            QVERIFY(hand.is_done());
+            QCOMPARE(highlighted, QModelIndexList{name});
+            QVERIFY(row.is_seen());
+        }
+    }
+
     void the_menu_key_is_about_the_current_row_data() {
         add_hidden_rows();
         QTest::newRow("a key in sight") << false << "no";
