@@ -385,8 +385,8 @@ TEST(FailedRead, LetsNothingPassThatIsRefused) {
     }
 }
 
-// What a hive of a root and the key "Top" holds after these values were set in it, one after the other: the list of
-// values moves away from the key.
+// A hive of this layout after the values were set in the key at the path, one after the other: its list of values moves
+// away from the key.
 Bytes with_values(const HiveLayout& layout, const std::string& path,
                   const std::vector<std::pair<std::string, Bytes>>& values) {
     Scene scene(layout);
