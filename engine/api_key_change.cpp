@@ -49,9 +49,9 @@ void free_index_cell(Store& store, const KeyRecord& key) {
     free_index(index);
 }
 
-// Frees what a key owned that nothing leads to any more. Of its values' records only every other one, beginning with
-// the first: a deletion takes values off by ascending position from a list that closes up behind each, and a hive that
-// was written here is the same, cell by cell, as ever. The rest, and all data cells, stay allocated.
+// Frees what a key owned that nothing leads to any more. Of its values' records only the first, third, fifth and so on,
+// as deleting by ascending position from a list that closes up behind each would: which cells a deletion frees is kept
+// so on purpose, and every hive written here agrees. The rest, and all data cells, stay allocated.
 void free_key(Store& store, const KeyView& key, const KeyView& parent) {
     ValueList values = find_value_list(store, key.record);
     if (values.count > 0 && is_record(store, values.cell))
@@ -174,7 +174,7 @@ int32_t RDeleteKey(RegistryKey* key, const char* path) {
     const StoredName stored(path);
     if (stored.text() == nullptr)
         return R_NOT_ENOUGH_MEMORY;
-    // A path is followed by as much of a component as can be told apart; what is deleted has the whole name.
+    // follow_path cuts a component that is too long; a deletion must not take a key that merely begins like it.
     const char* separator = strrchr(stored.text(), '\\');
     const size_t last = strlen(separator != nullptr ? separator + 1 : stored.text());
     if (last == 0 || last > longest_key_name)

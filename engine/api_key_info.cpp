@@ -46,7 +46,8 @@ int32_t give_numbers(RegistryKey& key, const Numbers& out) {
     return R_SUCCESS;
 }
 
-// The class as stored, as much as there is room for, ended by as much of a zero unit as fits.
+// The class as stored, as much as there is room for, ended by as much of a terminator as fits: 1 byte in A calls, 2 in
+// W calls.
 void give_class(const KeyInfo& info, void* out, uint32_t* size, uint32_t terminator) {
     if (size == nullptr)
         return;

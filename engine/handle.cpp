@@ -74,9 +74,9 @@ bool take_index(RegistryKey& handle, Store& store, const KeyRecord& record, uint
     return true;
 }
 
-// The counts that the handle knows, over the lists as they lie now: a list that was moved through another handle has
-// left its cell to whatever came next. After a change of its own that the handle could not take in, the record's
-// counts. Where the record cannot be read, the lists lie nowhere.
+// A record to read the lists by: the counts that the handle knows, and the places where the lists lie by now, since one
+// that was moved through another handle has left its cell to whatever came next. After a change of its own that the
+// handle could not take in, the record's counts. Where the record cannot be read, the lists lie nowhere.
 KeyRecord snapshot(RegistryKey& handle) {
     KeyRecord record = {};
     record.subkey_count = handle.info->subkey_count;

@@ -46,9 +46,8 @@ struct RegistryKey {
     engine::OffsetBatch value_offsets;
     engine::ValueView recent_value;  // the value asked for last: its name and its data are asked for in turn
     uint32_t recent_position;        // UINT32_MAX when there is none
-    uint32_t values_generation;
-    // The record could not be read after a change through this handle: the counts are brought up to it at the next
-    // call.
+    uint32_t values_generation;      // the store's when the list was read; one less where it is to be read again
+    // The record could not be read after a change through this handle: the next call reads it and takes its counts.
     bool counts_are_old;
 };
 
@@ -56,7 +55,7 @@ namespace engine {
 
 // Fills a zeroed handle from the record at an offset. 0, -1 for a damaged record, 8 without memory.
 int32_t fill_handle(RegistryKey& handle, Store& store, CellOffset offset, uint32_t depth);
-// A new handle for the subkey at an offset, counted as open.
+// A new handle for the subkey at an offset, counted as open. Status as fill_handle's; *out is set with 0 alone.
 int32_t open_handle(Store& store, CellOffset offset, uint32_t depth, RegistryKey** out);
 // The flags that a subkey's handle gets.
 uint32_t handle_flags(const KeyInfo& info);
@@ -74,7 +73,7 @@ const ValueView* listed_value(RegistryKey& handle, uint32_t position);
 void take_counts(RegistryKey& handle, const KeyRecord& record);
 // The same, reading the record. Where that fails, the next call on the handle tries again.
 bool reread_counts(RegistryKey& handle);
-// Whether it is a key's handle: what every call asks first.
+// Whether it is a key's handle: what every call asks first. May read the record, see counts_are_old.
 inline bool is_key(RegistryKey* key) {
     if (key == nullptr || key->info == nullptr)
         return false;

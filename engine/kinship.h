@@ -17,8 +17,8 @@ bool belongs_elsewhere(Store& store, CellOffset parent, const SubkeyIndex& index
 // The same, but a key that stands in the index twice passes: for a caller that looks at each entry anyway.
 bool has_other_parent(Store& store, CellOffset parent, const KeyView& key);
 
-// What has come out about parents that records name in place of the key that lists theirs. Holds while nothing above
-// those changes.
+// What is known of stray parents: keys that a record names as its parent though another key lists it. Holds while
+// nothing above those changes.
 struct StrayParents {
     // The last one, and whether it is in the tree: of many subkeys that name it only the first is asked the whole way.
     CellOffset last = CellOffset::none;

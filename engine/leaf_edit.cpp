@@ -269,7 +269,8 @@ Outcome move_between(Store& store, CellOffset parent_offset, KeyRecord& parent, 
     KeyRecord counted = parent;
     counted.subkey_count = counted.subkey_count + 1;
     LeafBytes now(target);
-    Removal removal(index, position);  // the entry has it from another leaf than the one that it goes to
+    // The entry leaves another leaf than the one that it goes to, which alone may move before the removal is written.
+    Removal removal(index, position);
     if (!is_used_cell(store, target.cell.offset) || !is_used_cell(store, index.cell.offset) || !removal.has_memory() ||
         !read_leaf_bytes(store, target, now))
         return Outcome::unchanged;

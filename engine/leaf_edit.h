@@ -10,6 +10,9 @@ namespace engine {
 
 // A key is seen when both its parent's count and the leaf's count reach it. So a count that rises is written to the
 // parent first, and one that falls to the leaf first: no other key is ever out of sight.
+//
+// What comes out of a change says what may be freed. unchanged: no list leads to the key because of it, so the key may
+// go again. unknown: one may, and nothing is to be freed.
 
 // Frees a leaf that its key leads to no more. Where the hive's root leads to it as well, in a damaged hive, it stays:
 // without it the hive would not open again.
@@ -30,7 +33,8 @@ bool can_move(Store& store, CellOffset parent, const SubkeyIndex& index, uint32_
 Outcome add_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
                   uint32_t position, CellOffset key, const Name& name);
 
-// Takes an entry out of an index that is a single leaf. In turn: the leaf, the parent's count.
+// Takes an entry out of an index that is a single leaf; unchanged for any other and for a position past its end. In
+// turn: the leaf, the parent's count.
 Outcome remove_entry(Store& store, CellOffset parent_offset, KeyRecord& parent, const SubkeyIndex& index,
                      uint32_t position);
 

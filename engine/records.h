@@ -9,8 +9,8 @@
 
 namespace engine {
 
-// Longest key name, in bytes, that a search looks at whole: 259 characters in UTF-16. A longer one equals no name that
-// can be asked for.
+// Bytes of a key's name that a search looks at: 260 units of UTF-16, one more than a component of a path has, so that a
+// name that is cut here equals none that can be asked for.
 constexpr uint32_t key_name_kept = 520;
 
 // A key record with the beginning of its name.
@@ -46,6 +46,7 @@ struct ValueView {
 bool read_value(Store& store, CellOffset offset, ValueView& value);
 // Writes the fixed 20 bytes over what the file holds; the name stays.
 Outcome rewrite_value(Store& store, const ValueView& value, const ValueRecord& changed);
+// This name; this name, a zero byte and more; another one; nobody knows.
 enum class Named { so, begun, otherwise, unreadable };
 // Reads the value at an offset and says whether it has this name, case ignored; an empty name is the default value's.
 // tell_begun: also whether it is an 8-bit name that goes on behind a zero byte after this one.
@@ -62,7 +63,8 @@ struct Block {
     ~Block();
 };
 
-// Whether the cell holds the root key or the index of its subkeys, without which the hive does not open.
+// Whether the cell holds the root key or the index of its subkeys, without which the hive does not open. Also true
+// where the root cannot be read, since nobody knows then.
 bool is_root_or_its_index(Store& store, CellOffset offset);
 
 // Whether the cell holds a record, judged by its signature and one more trait. A record that is damaged in another one

@@ -23,8 +23,8 @@ bool unlink(Store& store, CellOffset self, const SecurityRecord& record) {
     const CellOffset previous = cell_offset(record.previous);
     if (next == self || previous == self)
         return false;
-    SecurityRecord after = {};
-    SecurityRecord before = {};
+    SecurityRecord after = {};   // the next one
+    SecurityRecord before = {};  // the previous one
     const bool has_next = static_cast<int32_t>(next) > 0;
     const bool has_previous = static_cast<int32_t>(previous) > 0;
     if ((has_next && (!read_security(store, next, after) || cell_offset(after.previous) != self)) ||

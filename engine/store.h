@@ -1,7 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// One open hive: the caller's callbacks, the table of bins and the read window; all reading and writing goes through.
+// One open hive: the caller's callbacks, the table of bins and the read window. Reading and writing go through it, but
+// for the signature that is asked about first and the zeros that lengthen the file.
 #pragma once
 
 #include "format.h"
@@ -22,7 +23,7 @@ struct Bin {
     uint32_t offset;        // from the first bin
     uint32_t size;          // bytes, header included
     uint32_t largest_free;  // size of the largest free cell, 0 when there is none
-    bool unread;            // it could not be walked when that was to be found out; it counts as full meanwhile
+    bool unread;            // the last walk failed; it counts as full until one succeeds
     bool mapped;            // its cells are in the cell map
 };
 
@@ -40,7 +41,7 @@ struct Store {
     int32_t bin_count;
     int32_t bin_capacity;
     int32_t bins_size;  // bytes of all bins
-    Bin* bins;
+    Bin* bins;          // in the order of the file
     CellOffset root;
     CellOffset root_index;
     uint32_t flags;
@@ -108,15 +109,16 @@ bool find_used_cell(Store& store, CellOffset offset, Cell& cell);
 // Whether it is a cell in use: only then may it be written to, freed or replaced.
 bool is_used_cell(Store& store, CellOffset offset);
 
-// Reads up to length bytes of the record in a cell in use, never past its end; returns how many, 0 on failure.
+// Reads up to length bytes of the record in a cell in use, never past its end; returns how many, 0 on failure or when
+// the bytes do not begin with the signature (sig_none: any).
 uint32_t read_record(Store& store, uint32_t signature, CellOffset offset, void* buffer, uint32_t length);
 // Reads exactly length bytes, skip bytes into the cell's record.
 bool read_part(Store& store, const Cell& cell, uint32_t skip, void* buffer, uint32_t length);
 
 // Finds the bin that holds an offset, its header included; null when none does.
 Bin* bin_of(Store& store, CellOffset offset);
-// Reads the bin's header and walks its cells; fills bin, and with map the bin's share of the cell map; returns the end
-// of the walk, counted from the first bin, or -1, what the walk did not reach then being as it was in the map.
+// Reads the bin's header and walks its cells; fills bin, and with map the bin's share of the cell map. Returns the end
+// of the walk, counted from the first bin, or -1; the map has then changed as far as the walk came.
 int64_t scan_bin(Store& store, uint32_t bin_offset, Bin& bin, bool map);
 // Reads one size word: false when it cannot be read. The walk over a bin's cells steps with it, so the common case, a
 // word inside the window, is kept short.
@@ -140,12 +142,13 @@ inline bool is_cell_size(int32_t size, uint32_t room, uint32_t& absolute) {
 
 // Fills the bin's share of the cell map. Where the walk stops short, the next call tries again.
 void map_bin(Store& store, Bin& bin);
-// Finds out a bin's largest free cell. A bin that cannot be walked offers nothing to the allocator.
+// Walks a bin afresh: its largest free cell and, if it has one by now, its share of the cell map. A bin that cannot be
+// walked offers nothing to the allocator.
 void refresh_bin(Store& store, Bin& bin);
 // The same for the bins that could not be walked the last time.
 void refresh_unread_bins(Store& store);
-// While it lives, writes do not find out that bin's cells afresh; its end does, once. For one change of many size
-// words, which nothing in between asks for. No bin may be added meanwhile.
+// While it lives, writes do not walk that bin afresh; its end does, once. For one change of many size words, none of
+// which is asked for in between. No bin may be added meanwhile.
 class HeldBin {
 public:
     HeldBin(Store& store, Bin& bin) : store_(store), bin_(bin) { store.held_bin = &bin; }

@@ -31,7 +31,7 @@ bool read_leaf(Store& store, CellOffset offset, Leaf& leaf, bool& whole) {
     return true;
 }
 
-// A damaged root may lead to one empty leaf with each of its entries. More leaves than keys are not taken beyond this.
+// How many leaves an index may have beyond one for each key: a damaged root may lead to one empty leaf over and over.
 constexpr uint32_t most_empty_leaves = 256;
 
 // Adds a leaf's entries to the index; false when that would be more, or more leaves, than a hive can hold.
@@ -44,8 +44,8 @@ bool count_leaf(const Store& store, SubkeyIndex& index, Leaf& leaf) {
     return true;
 }
 
-// Reads as many of a root's count entries as there is room for, from the i-th on: of those that end with the file one
-// alone. Returns how many were read.
+// Reads as many of a root's count entries as there is room for, from the i-th on; where the file ends among them, only
+// one. Returns how many were read.
 template <uint32_t room>
 uint32_t read_entries(Store& store, const Cell& root, uint32_t i, uint32_t count, Le32 (&entries)[room]) {
     const uint32_t rest = count - i < room ? count - i : room;
@@ -133,7 +133,7 @@ Lookup search_each(Store& store, const SubkeyIndex& index, CellOffset parent, co
         previous = current;
         current = next;
     }
-    // An empty one may be what a handle still knows of a key whose cell is another's by now.
+    // Not for an empty list: an old handle may know that of a key whose cell is another's by now.
     if (sorted && complete && index.total > 0)
         store.sorted_key = parent;
     return complete ? Lookup::absent : Lookup::unreadable;

@@ -37,7 +37,7 @@ struct SubkeyIndex {
     bool whole;      // every count was one that its cell can hold, every leaf a leaf
     uint32_t total;  // entries of all leaves
     uint32_t leaf_count;
-    uint32_t generation;  // the store's when the index was read
+    uint32_t generation;  // the store's when the index was read; one less where it is to be read again
     Leaf* leaves;         // null for a single leaf, which then stands in only
     Leaf only;
 

@@ -8,11 +8,11 @@
 
 namespace engine {
 
-// Whether the key's own lists are such that it can be deleted once it has no subkeys. 0, or -1.
+// Whether the key's list of values is whole, without which the key is not deleted. 0, or -1.
 int32_t check_own_lists(Store& store, const KeyView& key);
 
-// Walks the subtree of the subkey at a position of the parent, which lies that deep, and asks of every key what its
-// deletion will ask, by path and through its parent's handle. Status as RCheckDeleteTree's.
+// Walks the subtree of the subkey at a position of the parent and asks of every key what its deletion will ask, by path
+// and through its parent's handle. depth: levels of the parent below the root. Status as RCheckDeleteTree's.
 int32_t check_tree(Store& store, CellOffset parent, uint32_t depth, uint32_t position);
 
 }  // namespace engine

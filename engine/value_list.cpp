@@ -40,7 +40,8 @@ void put_inline(ValueRecord& record, const NewValue& value) {
     record.size = value.size | data_inline;
 }
 
-// Makes the record lead to a new data cell, which is freed where that surely failed; record is then as it stands.
+// Writes record with cell as its data, in place of what old has. Where that surely failed, the cell is freed. record
+// receives the cell in any case, and is what the file holds only after true.
 bool lead_to(Store& store, const ValueView& old, CellOffset cell, ValueRecord& record) {
     record.data = raw(cell);
     const Outcome outcome = rewrite_value(store, old, record);
@@ -374,7 +375,7 @@ Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const Ne
 //   a second time. Its data stays allocated.
 int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t position) {
     const ValueList list = find_value_list(store, key);
-    // An offset is a multiple of 8 and so begins like no record: where the list does, it is another's.
+    // A slot holds a multiple of 8, which no signature is: a cell that looks like a record is no list.
     if (!list.whole || position >= list.count || !is_used_cell(store, key_offset) ||
         !is_used_cell(store, list.cell.offset) || is_record(store, list.cell))
         return R_FAILED;

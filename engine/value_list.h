@@ -22,9 +22,10 @@ CellOffset value_at(Store& store, const ValueList& list, uint32_t i);
 uint32_t values_at(Store& store, const ValueList& list, uint32_t i, CellOffset* offsets, uint32_t most);
 constexpr int32_t no_value = -1;
 constexpr int32_t unreadable_value = -2;
-// Position of the value of that name; no_value when there is none, unreadable_value when there may be one among
-// records that cannot be read. begun, when given, receives the position of the first value whose name goes on behind a
-// zero byte after that name, or no_value.
+// Position of the value of that name, which value then is; no_value when there is none, unreadable_value when there may
+// be one among records that cannot be read. begun, when given, receives the position of the first value whose name goes
+// on behind a zero byte after that name, or no_value; it is left alone where the name is found or a slot cannot be
+// read.
 int32_t find_value(Store& store, const ValueList& list, const Name& name, ValueView& value, int32_t* begun = nullptr);
 
 // The same for a name from a call, null being the empty one: the value that has it, else the first whose name it
@@ -42,7 +43,8 @@ enum class Stored { failed, replaced, added };
 
 // Stores a value in the key and brings key, its record, up to what the file holds.
 Stored store_value(Store& store, CellOffset key_offset, KeyRecord& key, const NewValue& value);
-// Removes the value at a position of the key's list; brings key up to what the file holds.
+// Removes the value at a position of the key's list; brings key up to what the file holds. 0, -1 refused or damaged,
+// 8 without memory, 1003 a failed write.
 int32_t remove_value(Store& store, CellOffset key_offset, KeyRecord& key, uint32_t position);
 
 }  // namespace engine

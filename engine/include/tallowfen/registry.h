@@ -59,17 +59,19 @@ enum RegistryHandleFlag : uint32_t {
 // by ROpenHive and ROpenHiveEx and released by RCloseHive.
 struct RegistryKey;
 
-// What the engine calls to reach the hive's bytes. `device` is handed back to every callback untouched. Positions are
-// byte positions in the file and stay below 2 GiB.
+// What the engine calls to reach the hive's bytes. `device` is handed back to every callback untouched. It and the
+// functions must stay usable until RCloseHive. Positions are byte positions in the file and stay below 2 GiB.
 struct RegistryIo {
     void* device;
-    // Moves to `offset` counted from the start (whence 0), the present position (1) or the end (2); returns the
-    // resulting position, or -1.
+    // Moves to `offset` counted from the start (whence 0), the present position (1, which the engine never asks for) or
+    // the end (2); returns the resulting position, or -1.
     int32_t (*seek)(void* device, int32_t offset, int32_t whence);
-    // Reads up to `length` bytes at the present position; returns how many were read, negative on error.
+    // Reads up to `length` bytes at the present position; returns how many were read, negative on error. After fewer
+    // the rest is asked for; 0 is the file's end.
     int32_t (*read)(void* device, void* buffer, int32_t length);
-    // Writes `length` bytes at the present position; returns how many were written, negative on error. When the call
-    // returns, the bytes must be in the file as other processes see it. Null: the hive is read-only.
+    // Writes `length` bytes at the present position; returns how many were written, negative on error. Fewer than
+    // `length` are a failure. When the call returns, the bytes must be in the file as other processes see it. Null: the
+    // hive is read-only.
     int32_t (*write)(void* device, const void* buffer, int32_t length);
 };
 
@@ -110,8 +112,8 @@ int32_t RCloseHive(RegistryKey* root);
 
 // ---- opening keys ---------------------------------------------------------------------------------------------
 // Opens the index-th subkey in the order of the key's index. *out is null unless the result is 0.
-// 259: no such index, or its entry leads nowhere or could not be read. 8: no memory. -1: no key given, or a damaged
-// record. 87: out null.
+// 259: no such index, or its entry is -1 or could not be read. -1: no key given, or an entry that leads to no key
+// record or to a damaged one. 8: no memory. 87: out null.
 int32_t ROpenSubKey(RegistryKey* key, uint32_t index, RegistryKey** out);
 // ROpenKeyEx without the position. Null key: -1.
 int32_t ROpenKey(RegistryKey* key, const char* path, RegistryKey** out);
@@ -123,12 +125,17 @@ int32_t ROpenKey(RegistryKey* key, const char* path, RegistryKey** out);
 int32_t ROpenKeyEx(RegistryKey* key, const char* path, RegistryKey** out, uint32_t* out_index);
 
 // ---- enumerating and querying -----------------------------------------------------------------------------------
-// The index-th subkey: its 8-bit name, how many subkeys it has, its class in 8 bits, its time. Name: room larger than
-// the name: terminated; room equal to it: not terminated, still 0; smaller: cut, 111, size unchanged. No buffer or no
-// room: size becomes length + 1. A name stored in UTF-16 gives 123, its bytes copied as they stand. Class: room larger
-// than it: terminated, class_size becomes its characters; otherwise as many characters as fit, never 111. Without a
-// buffer or room half the stored length + 1, 0 without a class; with them and no class, both are left as they were.
-// -1: not a key, or a damaged record. 259: index past the end. 8: no memory.
+// The index-th subkey: its 8-bit name, how many subkeys it has, its class in 8 bits, its time.
+//   name_size in         buffer                        name_size out      status
+//   0, or no buffer      left alone                    length + 1         0
+//   above the length     the name and a zero           the length         0
+//   the length           the name                      as it was          0
+//   below the length     the beginning of the name     as it was          111, class and time given all the same
+// For a name stored in UTF-16 the same goes for its bytes as they stand, but what is copied gives 123, and neither
+// class nor time. Class: room larger than it: terminated, class_size becomes its characters; otherwise as many
+// characters as fit, class_size as it was, never 111. Without a buffer or room half the stored length + 1, 0 without a
+// class; with them and no class, both are left as they were. -1: not a key, or a damaged record. 259: index past the
+// end. 8: no memory.
 int32_t REnumKeyInfoA(RegistryKey* key, uint32_t index, char* name, uint32_t* name_size, uint32_t* out_subkeys,
                       char* class_name, uint32_t* class_size, RegistryTime* out_last_write);
 // The same without the subkey count.
@@ -159,15 +166,19 @@ int32_t RQueryValueExW(RegistryKey* key, const char* name, uint32_t* out_type, v
 // The key itself. Unlike its Windows namesake the first text pair is the key's own name, the second its class. Only a
 // handle with flag 32 has a name; others give an empty one and size 0. A: size is characters. Larger than the name:
 // terminated, size becomes the length; equal: not terminated; smaller: cut, 111. A name in UTF-16 is copied as stored,
-// 123. All else is given with 111 and 123 as well. No buffer or no room: size becomes the length. Longest names are
-// characters, the longest class and the class itself bytes, the largest data bytes. security_size: the descriptor's
-// length less 20. 6: not a key. 1003: the security record cannot be read.
+// 123. All else is given with 111 and 123 as well. No buffer or no room: size becomes the length. The class is handed
+// out as stored, as many bytes as fit, never 111: with room to spare it is ended by one zero byte in A, by up to two in
+// W, and class_size becomes its bytes; otherwise class_size is left as it was. Without a buffer or room class_size
+// becomes its bytes in A, two more in W. Longest names are characters, the longest class and the class itself bytes,
+// the largest data bytes. security_size: the descriptor's length less 20. 6: not a key. 1003: the security record
+// cannot be read.
 int32_t RQueryInfoKeyA(RegistryKey* key, char* name, uint32_t* name_size, void* class_name, uint32_t* class_size,
                        uint32_t* out_subkeys, uint32_t* out_longest_subkey, uint32_t* out_longest_class,
                        uint32_t* out_values, uint32_t* out_longest_value, uint32_t* out_largest_data,
                        uint32_t* out_security_size, RegistryTime* out_last_write);
-// W: sizes are bytes. A need larger than the given size: 111 at once. More than one byte to spare: terminated. No
-// buffer or no room: size becomes 2 * (length + 1), but length + 1 for a name stored in UTF-16.
+// W: sizes are bytes. A need larger than the given size: 111, nothing handed out and every size left as it was. More
+// than one byte to spare: terminated. No buffer or no room: size becomes 2 * (length + 1), but length + 1 for a name
+// stored in UTF-16.
 int32_t RQueryInfoKeyW(RegistryKey* key, uint16_t* name, uint32_t* name_size, void* class_name, uint32_t* class_size,
                        uint32_t* out_subkeys, uint32_t* out_longest_subkey, uint32_t* out_longest_class,
                        uint32_t* out_values, uint32_t* out_longest_value, uint32_t* out_largest_data,
@@ -184,8 +195,8 @@ int32_t RCreateKey(RegistryKey* key, const char* path, RegistryKey** out, uint32
 // W stores the bytes as given; A widens text of types 1, 2 and 6, and of type 7 with two zero bytes behind it.
 int32_t RSetValueExW(RegistryKey* key, const char* name, uint32_t type, const void* data, uint32_t size);
 int32_t RSetValueExA(RegistryKey* key, const char* name, uint32_t type, const void* data, uint32_t size);
-// Removes the value of that name. 1013: read-only. 6: not a key. 1003: no such value, or a failed write. 8: no memory.
-// -1: damaged.
+// Removes the value of that name. 1013: read-only. 6: not a key. 1003: no such value, a record that cannot be read may
+// be it, or a failed write. 8: no memory. -1: damaged.
 int32_t RDeleteValue(RegistryKey* key, const char* name);
 // Renames the index-th subkey; it stays the same key. 1013: read-only. 6: not a key. 87: null or empty name, one with
 // a backslash, or one that is too long. 3: the subkey cannot be opened. -1: a sibling has that name in any case, the
@@ -197,7 +208,8 @@ int32_t RRenameKey(RegistryKey* key, uint32_t index, const char* new_name);
 // more than 259 characters. 145: it has subkeys. 8: no memory. -1: a step failed. A null or empty path gives 3.
 int32_t RDeleteKey(RegistryKey* key, const char* path);
 // What RDeleteKey would say to the index-th subkey and to each key below it, leaves first; writes nothing. 0: the
-// whole subtree can be deleted key by key. 123: a name in it is stored in UTF-16, which no path can say.
+// whole subtree can be deleted key by key. 123: a name in it is stored in UTF-16, which no path can say. -1: no such
+// index, or a damaged record.
 int32_t RCheckDeleteTree(RegistryKey* key, uint32_t index);
 // Where the key's cell lies, in bytes from the first bin: the same for every handle of one key, so that a key which a
 // damaged hive lists below itself can be told. UINT32_MAX: not a key. A rename gives the key another cell.
