@@ -17,7 +17,8 @@
 
 namespace {
 
-constexpr int longest_key_name = 255;  // characters, as Windows has it
+constexpr int longest_new_name = 255;         // characters, as Windows has it
+constexpr uint32_t longest_shown_name = 512;  // characters; a key with a longer one counts as unreadable
 
 // One byte more than the engine is told of, preset to zero: a name that fills the buffer comes without a terminator.
 using NameBuffer = std::array<char, 513>;
@@ -167,26 +168,33 @@ bool RegKey::is_below_itself() const {
 QString RegKey::name() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
-    std::array<uint16_t, 512> buffer;
+    std::array<uint16_t, longest_shown_name> buffer;
     auto size = static_cast<uint32_t>(sizeof buffer);
     if (RQueryInfoKeyW(handle, buffer.data(), &size, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr, nullptr,
                        nullptr, nullptr, nullptr) != R_SUCCESS)
         throw std::runtime_error("RQueryInfoKeyW failed");
-    if (size == 0 && this != hive_->root_key()) {
-        // The engine names no key that is a symbolic link; its parent's list does, and a row needs a name.
-        NameBuffer listed;
-        uint32_t length = 0;
-        RegistryKey* parent = hive_->key_handle(static_cast<RegKey*>(parent_));
-        const int32_t status = subkey_name(parent, static_cast<uint32_t>(child_number()), listed, length);
-        if (status == R_SUCCESS)
-            return QString::fromLatin1(listed.data());
-        if (status == R_INVALID_NAME) {  // handed out as stored, in UTF-16
-            QString wide(static_cast<qsizetype>(length / 2), Qt::Uninitialized);
-            qFromLittleEndian<char16_t>(listed.data(), wide.size(), wide.data());
-            return wide;
-        }
-    }
+    // The engine names no key that is a symbolic link; its parent's list does, and a row needs a name.
+    if (size == 0 && this != hive_->root_key())
+        return listed_name();
     return QString(reinterpret_cast<const QChar*>(buffer.data()), static_cast<qsizetype>(size / 2));
+}
+
+QString RegKey::listed_name() {
+    RegistryKey* parent = hive_->key_handle(static_cast<RegKey*>(parent_));
+    const int position = child_number();
+    if (subkey_offset(parent, position) != offset_)  // what stands there now is another key
+        throw std::runtime_error("RQueryInfoKeyW failed");
+    std::array<char, 2 * longest_shown_name + 1> listed;
+    auto size = static_cast<uint32_t>(listed.size());
+    const int32_t status = REnumKeyInfoA(parent, static_cast<uint32_t>(position), listed.data(), &size, nullptr,
+                                         nullptr, nullptr, nullptr);
+    if (status == R_SUCCESS && size <= longest_shown_name)
+        return QString::fromLatin1(listed.data(), static_cast<qsizetype>(size));
+    if (status != R_INVALID_NAME || size > 2 * longest_shown_name)
+        throw std::runtime_error("RQueryInfoKeyW failed");
+    QString wide(static_cast<qsizetype>(size / 2), Qt::Uninitialized);  // handed out as stored, in UTF-16
+    qFromLittleEndian<char16_t>(listed.data(), wide.size(), wide.data());
+    return wide;
 }
 
 void RegKey::refresh_children(RegistryKey* handle) {
@@ -230,8 +238,14 @@ int RegKey::default_value_position() {
     RegistryKey* handle = hive_->key_handle(this);
     std::array<uint16_t, 512> name;
     for (uint32_t i = 0;; i++) {
-        auto size = static_cast<uint32_t>(sizeof name);
-        const int32_t status = REnumValueW(handle, i, name.data(), &size, nullptr, nullptr, nullptr);
+        uint32_t size = 0;
+        const auto ask = [&] {
+            size = static_cast<uint32_t>(sizeof name);
+            return REnumValueW(handle, i, name.data(), &size, nullptr, nullptr, nullptr);
+        };
+        int32_t status = ask();
+        if (status == R_FAILED)  // it may be the one: a failed read that passes is over the second time
+            status = ask();
         if (status == R_NO_MORE_ITEMS)
             return -1;
         if (size < sizeof name[0])  // an odd last byte is no character
@@ -386,7 +400,7 @@ bool RegKey::agrees_below(int index) {
 }
 
 int RegKey::rename_key(int index, const QString& new_name) {
-    if (new_name.size() > longest_key_name)
+    if (new_name.size() > longest_new_name)
         return -3;
     const StoredText name = stored_text(new_name);
     if (!name.fits || name.bytes.isEmpty() || name.bytes.contains('\\') || index < 0)
@@ -400,10 +414,17 @@ int RegKey::rename_key(int index, const QString& new_name) {
         RRenameKey(handle, static_cast<uint32_t>(index), name.bytes.constData()) != R_SUCCESS)
         return -1;
     hive_->note_freed(old_offset);
+    const int position = move_slot(handle, index, name.bytes);
+    // Where a damaged hive lists the key above itself too, the handle from there would go on leading to its old cell.
+    hive_->clear_handle_cache();
+    return position;
+}
+
+int RegKey::move_slot(RegistryKey* handle, int index, const QByteArray& name) {
     // The key has its new name, so what follows is tried once more where a read fails.
-    int position = find_child_position(handle, name.bytes);
+    int position = find_child_position(handle, name);
     if (position < 0)
-        position = find_child_position(handle, name.bytes);
+        position = find_child_position(handle, name);
     if (position < 0)
         return -2;
     AbstractRegKey* renamed = laid_out()[static_cast<size_t>(index)];

@@ -138,7 +138,11 @@ private:
     bool slots_agree(RegistryKey* handle) const;
     // Whether the engine, asked anew, counts one subkey less than there are slots; not where it cannot be asked.
     bool lists_one_less() const;
+    // The name as the parent's list leads to it.
+    QString listed_name();
     int find_child_position(RegistryKey* handle, const QByteArray& name);
+    // Moves a slot to where the engine now finds its key by name; returns the new position, -2 when it finds none.
+    int move_slot(RegistryKey* handle, int index, const QByteArray& name);
     bool store_value(const QString& name, uint type, const QByteArray& data, int index);
 
     RegHive* hive_;  // not owned

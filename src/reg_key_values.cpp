@@ -15,7 +15,6 @@
 #include <cstring>
 #include <set>
 #include <stdexcept>
-#include <string>
 
 namespace {
 
@@ -47,22 +46,23 @@ EnumeratedName enumerate_name(RegistryKey* handle, int index) {
     return found;
 }
 
-constexpr char new_value_prefix[] = "New Value #";
-constexpr uint32_t prefix_length = sizeof new_value_prefix - 1;
+constexpr QLatin1String new_value_prefix("New Value #");
 
 // The numbers behind the prefix in the names of the first count values, as far as those can be read.
 std::set<int> new_value_numbers(RegistryKey* handle, int count) {
+    constexpr qsizetype most_digits = 10;
     std::set<int> numbers;
     for (int i = 0; i < count; i++) {
-        std::array<char, prefix_length + 10> name = {};
-        auto size = static_cast<uint32_t>(name.size());
-        if (REnumValueA(handle, static_cast<uint32_t>(i), name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS ||
-            size > name.size() || qstrnicmp(name.data(), new_value_prefix, prefix_length) != 0)
+        std::array<uint16_t, new_value_prefix.size() + most_digits + 1> buffer;
+        auto size = static_cast<uint32_t>(sizeof buffer);
+        if (REnumValueW(handle, static_cast<uint32_t>(i), buffer.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS)
+            continue;  // a longer name among others
+        const QStringView name(reinterpret_cast<const QChar*>(buffer.data()), static_cast<qsizetype>(size / 2));
+        if (!name.startsWith(new_value_prefix, Qt::CaseInsensitive))
             continue;
         int number = 0;
-        const char* const digits = name.data() + prefix_length;
-        const char* const end = name.data() + size;
-        if (std::from_chars(digits, end, number).ptr == end && *digits != '0')
+        const QByteArray digits = name.mid(new_value_prefix.size()).toLatin1();
+        if (std::from_chars(digits.begin(), digits.end(), number).ptr == digits.end() && !digits.startsWith('0'))
             numbers.insert(number);
     }
     return numbers;
@@ -296,7 +296,7 @@ bool RegKey::rename_value(int index, const QString& new_name) {
 }
 
 // Names of the form that new ones get are read in one go, since to ask the engine for each takes a walk over all names.
-// It is asked for the first that was not met: one stored in UTF-16, say, may have the name.
+// It is asked for the first that was not met: a record that cannot be read, say, may have the name.
 QString RegKey::new_value_name() {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
@@ -304,10 +304,10 @@ QString RegKey::new_value_name() {
     for (int i = 1;; i++) {
         if (taken.count(i) != 0)
             continue;
-        const std::string name = new_value_prefix + std::to_string(i);
-        const int32_t status = RQueryValueExA(handle, name.c_str(), nullptr, nullptr, nullptr);
+        QString name = new_value_prefix + QString::number(i);
+        const int32_t status = RQueryValueExA(handle, name.toLatin1().constData(), nullptr, nullptr, nullptr);
         if (status == R_FILE_NOT_FOUND)
-            return QString::fromStdString(name);
+            return name;
         if (status != R_SUCCESS)
             return QString();
     }

@@ -25,7 +25,6 @@ namespace {
 
 constexpr uint type_string = 1;
 constexpr uint type_binary = 3;
-constexpr int dword_order = 4;
 
 testkit::HiveLayout some_keys() {
     testkit::HiveLayout layout;
@@ -98,7 +97,7 @@ bool change_once(const Opened& open, int step) {
     const QString key = text_of("key ", round);
     switch (step % steps_of_a_round) {
     case 0:
-        return alpha->set_dword_value(text_of("value ", round), static_cast<uint>(round), dword_order);
+        return alpha->set_dword_value(text_of("value ", round), static_cast<uint>(round), little_endian_order);
     case 1:
         return alpha->rename_value(alpha->value_count() - 1, text_of("renamed ", round));
     case 2:
@@ -230,7 +229,7 @@ private slots:
         const HiveOnDisk file(some_keys());
         Opened open(file.path());
         const std::vector<std::function<bool()>> changes = {
-            [&] { return open.alpha()->set_dword_value(QStringLiteral("number"), 77, dword_order); },
+            [&] { return open.alpha()->set_dword_value(QStringLiteral("number"), 77, little_endian_order); },
             [&] {
                 return open.alpha()->set_string_value(QStringLiteral("text"), QStringLiteral("longer than it was"),
                                                       type_string);
@@ -300,7 +299,7 @@ private slots:
             QCOMPARE(file.stored("Parent\\beta", "bytes").size(), 900);
             Opened again(file.path());
             QVERIFY(browse(again.hive.root_key()).isEmpty());
-            QVERIFY(again.alpha()->set_dword_value(QStringLiteral("after"), 1, dword_order));
+            QVERIFY(again.alpha()->set_dword_value(QStringLiteral("after"), 1, little_endian_order));
         }
     }
 
@@ -314,7 +313,8 @@ private slots:
                 const SizeLimit limit(whole + room);
                 QVERIFY(!open.alpha()->set_binary_value(QStringLiteral("new"), QByteArray(50000, 'n'), type_binary));
                 // What finds room in the bins that are there is stored all the same.
-                QVERIFY(open.alpha()->set_dword_value(QStringLiteral("number"), static_cast<uint>(room), dword_order));
+                QVERIFY(open.alpha()->set_dword_value(QStringLiteral("number"), static_cast<uint>(room),
+                                                      little_endian_order));
             }
             QVERIFY2(file.faults().empty(), file.faults().c_str());
             QCOMPARE(file.stored("Parent\\alpha", "new"), QByteArrayLiteral("?"));

@@ -11,6 +11,7 @@
 #include <QTest>
 
 #include <sys/file.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include <stdexcept>
@@ -70,10 +71,13 @@ private slots:
         QVERIFY(!QFile::exists(path));
     }
 
-    void a_directory_or_a_pipe_cannot_be_opened() {
+    void what_is_no_regular_file_cannot_be_opened() {
         const QTemporaryDir directory;
         QCOMPARE(failure(directory.path()), QStringLiteral("Cannot open file"));
         QCOMPARE(failure(QStringLiteral("/dev/null")), QStringLiteral("Cannot open file"));
+        const QString pipe = directory.filePath(QStringLiteral("pipe"));
+        QCOMPARE(mkfifo(QFile::encodeName(pipe).constData(), 0600), 0);
+        QCOMPARE(failure(pipe), QStringLiteral("Cannot open file"));
     }
 
     void a_file_without_permission_cannot_be_opened_data() {
@@ -209,7 +213,7 @@ private slots:
         DummyRegKey top(QStringLiteral("TOP"));
         RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
         auto* key = static_cast<RegKey*>(hive.root_key()->child(0));
-        QVERIFY(key->set_dword_value(QStringLiteral("now"), 7, 1234));
+        QVERIFY(key->set_dword_value(QStringLiteral("now"), 7, little_endian_order));
         QCOMPARE(file.stored("Parent", "now"), QByteArray("\7\0\0\0", 4));
         QVERIFY(key->new_key() >= 0);
         QVERIFY(file.read().find("Parent\\New Key #1") != nullptr);

@@ -113,7 +113,8 @@ private slots:
         QCOMPARE(shown->name(), QStringLiteral("Zulu"));
         QVERIFY(inner->new_key() >= 0);
         hive.clear_handle_cache();
-        QCOMPARE(thrown<std::runtime_error>([&] { shown->set_dword_value(QStringLiteral("v"), 99, 4, 0); }),
+        QCOMPARE(thrown<std::runtime_error>(
+                     [&] { shown->set_dword_value(QStringLiteral("v"), 99, little_endian_order, 0); }),
                  QStringLiteral("ROpenSubKey failed"));
         QVERIFY(!outer->can_delete_tree(3));
         QVERIFY(testkit::diff(before, file.read()).size() == 1);  // the key that was made
@@ -152,7 +153,7 @@ private slots:
         QCOMPARE(row, 0);
         QCOMPARE(shown->child(row), renamed);
         QCOMPARE(renamed->name(), QStringLiteral("abc"));
-        QVERIFY(renamed->set_dword_value(QStringLiteral("v"), 99, 4, 0));
+        QVERIFY(renamed->set_dword_value(QStringLiteral("v"), 99, little_endian_order, 0));
         QCOMPARE(file.stored("Parent\\abc", "v"), QByteArray("\x63\0\0\0", 4));
     }
 
@@ -165,6 +166,66 @@ private slots:
         DummyRegKey top(QStringLiteral("TOP"));
         RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
         QCOMPARE(Opened::names(hive.root_key()), QStringList({QStringLiteral("Narrow"), QStringLiteral("Wide")}));
+    }
+
+    void a_link_is_named_as_any_other_key_is_data() {
+        QTest::addColumn<QString>("name");
+        QTest::addColumn<bool>("wide");
+        for (const bool wide : {false, true}) {
+            const char* const storage = wide ? "UTF-16" : "8 bits";
+            QTest::addRow("the longest that is shown, in %s", storage) << QString(512, u'n') << wide;
+            QTest::addRow("a longer one, in %s", storage) << QString(513, u'n') << wide;
+            QTest::addRow("twice the longest, in %s", storage) << QString(1024, u'n') << wide;
+            QTest::addRow("more than twice the longest, in %s", storage) << QString(1100, u'n') << wide;
+            QTest::addRow("a zero inside, in %s", storage) << QStringLiteral("one\0two") << wide;
+        }
+    }
+
+    void a_link_is_named_as_any_other_key_is() {
+        QFETCH(const QString, name);
+        QFETCH(const bool, wide);
+        testkit::HiveLayout odd;
+        for (const uint16_t flags : {uint16_t{0}, uint16_t{0x10}}) {
+            testkit::KeyLayout& key = odd.root.add("Key").add("");
+            key.name = name.toStdU16String();
+            key.wide_name = wide;
+            key.flags = flags;
+            odd.root.children.back().name.push_back(u'0' + static_cast<char16_t>(odd.root.children.size()));
+        }
+        const HiveOnDisk file(odd);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        for (int i = 0; i < 2; i++) {
+            AbstractRegKey* const key = hive.root_key()->child(i)->child(0);
+            if (name.size() <= 512)
+                QCOMPARE(key->name(), name);
+            else
+                QVERIFY_THROWS_EXCEPTION(std::runtime_error, key->name());
+        }
+    }
+
+    // "Loop" lists itself and a link: a key that is made through the inner one moves the link in the list of both.
+    void a_link_does_not_take_the_name_of_the_key_that_stands_in_its_place() {
+        testkit::HiveLayout odd;
+        testkit::KeyLayout& layout = odd.root.add("Loop");
+        layout.add("A");
+        layout.add("Symbolic").flags = 0x10;
+        testkit::LaidHive laid = testkit::lay_out(odd);
+        laid.put32(laid.at("Loop").index, 4, laid.at("Loop").record);
+        laid.put32(laid.at("Loop").record, 16, laid.at("Loop").record);
+        const HiveOnDisk file(laid.bytes);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+        auto* const loop = static_cast<RegKey*>(hive.root_key()->child(0));
+        auto* const inner = static_cast<RegKey*>(loop->child(0));
+        AbstractRegKey* const link_key = loop->child(1);
+        QCOMPARE(link_key->name(), QStringLiteral("Symbolic"));
+        QVERIFY(inner->new_key() >= 0);
+        try {
+            QCOMPARE(link_key->name(), QStringLiteral("Symbolic"));
+        } catch (const std::runtime_error&) {
+            // told
+        }
     }
 
     void a_value_whose_name_is_half_a_character_is_the_default_value() {
@@ -189,7 +250,7 @@ private slots:
         RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
         auto* deleted = static_cast<RegKey*>(hive.root_key()->child(0));
         auto* renamed = static_cast<RegKey*>(hive.root_key()->child(1));
-        QVERIFY(!renamed->set_dword_value(renamed->read_value_name(0).name, 99, 4, 0));
+        QVERIFY(!renamed->set_dword_value(renamed->read_value_name(0).name, 99, little_endian_order, 0));
         QVERIFY(renamed->rename_value(0, QStringLiteral("plain")));
         QCOMPARE(file.stored("Renamed", "plain").size(), 4);
         QCOMPARE(renamed->value_count(), 1);

@@ -137,6 +137,56 @@ private slots:
         }
     }
 
+    // "Loop" lists "Within", which lists "Loop" and is what its record names as its parent: renaming the inner one
+    // leaves the cell that the hive's root leads to.
+    void a_key_that_is_renamed_below_itself_is_no_other_key_above_data() {
+        QTest::addColumn<int>("action");
+        for (int i = 0; i < static_cast<int>(std::size(actions)); i++)
+            QTest::newRow(actions[i].name) << i;
+    }
+
+    void a_key_that_is_renamed_below_itself_is_no_other_key_above() {
+        QFETCH(const int, action);
+        int taken = 0;
+        for (int made_before = 0; made_before < 6; made_before++) {
+            testkit::HiveLayout layout;
+            layout.root.add("Loop key #1").set("old", 4, testkit::pattern(4));
+            layout.root.children[0].add("Within").add("not listed");
+            layout.root.add("Third");
+            testkit::LaidHive laid = testkit::lay_out(layout);
+            const uint32_t loop = laid.at("Loop key #1").record;
+            laid.put32(laid.at("Loop key #1\\Within").index, 4, loop);
+            constexpr uint32_t parent = 16;  // where a key's record says what it belongs to
+            laid.put32(loop, parent, laid.at("Loop key #1\\Within").record);
+            const HiveOnDisk file(laid.bytes);
+            DummyRegKey top(QStringLiteral("TOP"));
+            RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
+            RegKey* const outer = Opened::child(hive.root_key(), 0);
+            RegKey* const middle = Opened::child(outer, 0);
+            QCOMPARE(Opened::child(middle, 0)->name(), QStringLiteral("Loop key #1"));
+            RegKey* const third = Opened::child(hive.root_key(), 1);
+            for (int i = 0; i < made_before; i++)
+                third->new_key();
+            middle->rename_key(0, QStringLiteral("a name that makes another cell of it"));
+            for (int i = 0; i < 10; i++)
+                third->new_key();
+            const testkit::Bytes before = file.bytes();
+            const size_t record = testkit::LaidHive::position(loop);
+            if (before[record] != 'n' || testkit::get32(before, record + parent) != laid.at("Third").record)
+                continue;
+            taken++;
+            bool done = false;
+            try {
+                done = actions[action].run(outer);
+            } catch (const std::exception& failure) {
+                QCOMPARE(failure.what(), "ROpenSubKey failed");
+            }
+            QVERIFY(!done);
+            QVERIFY(file.bytes() == before);
+        }
+        QVERIFY(taken > 0);
+    }
+
     void values_count_in_both_places() {
         Opened opened;
         RegKey* const one = Opened::child(opened.first, 0);

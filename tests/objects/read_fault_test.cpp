@@ -254,6 +254,36 @@ private slots:
         QVERIFY(total > 10);
     }
 
+    // The engine names it by what its parent's list leads to, for which it goes to the file.
+    void a_link_whose_name_cannot_be_read_is_not_shown_without_one() {
+        testkit::HiveLayout hive;
+        hive.root.add("Link").flags = 0x10;
+        testkit::KeyLayout& other = hive.root.add("Other");
+        for (int i = 0; i < 10; i++)
+            other.set("v" + std::to_string(i), 3, testkit::pattern(3000));
+        const HiveOnDisk file(hive);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        AbstractRegKey* const link = opened.root_key()->child(0);
+        const auto read_elsewhere = [&] { static_cast<RegKey*>(opened.root_key()->child(1))->read_value(9); };
+        QCOMPARE(link->name(), QStringLiteral("Link"));
+        int thrown = 0;
+        bool failed = true;
+        for (int nth = 1; failed; nth++) {
+            read_elsewhere();
+            const testkit::ReadFaults faults(nth);
+            try {
+                QCOMPARE(link->name(), QStringLiteral("Link"));
+            } catch (const std::runtime_error& failure) {
+                QCOMPARE(failure.what(), "RQueryInfoKeyW failed");
+                thrown++;
+            }
+            failed = faults.failed();
+        }
+        QVERIFY(thrown > 0);
+        QCOMPARE(link->name(), QStringLiteral("Link"));
+    }
+
     void no_value_but_the_one_named_changes_data() {
         QTest::addColumn<int>("operation");
         QTest::addColumn<int>("place");

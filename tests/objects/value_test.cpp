@@ -91,7 +91,7 @@ private slots:
         const auto value = opened.read(QStringLiteral("reversed"));
         QCOMPARE(value->data, QVariant(258U));
         QCOMPARE(value->type, 5U);
-        QVERIFY(opened.key()->set_dword_value(value->name, value->data.toUInt(), 4321));
+        QVERIFY(opened.key()->set_dword_value(value->name, value->data.toUInt(), big_endian_order));
         QCOMPARE(opened.file.stored("Key", "reversed"), QByteArray("\0\0\1\2", 4));
         QCOMPARE(opened.file.stored_type("Key", "reversed"), 5);
     }
@@ -177,6 +177,22 @@ private slots:
         QCOMPARE(opened.read(QStringLiteral("text"))->data.toString(), text);
     }
 
+    void a_name_in_utf_16_is_a_new_value_s_by_its_text_and_not_by_its_bytes() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& layout = hive.root.add("Key");
+        layout.set("New Value #2", 4, testkit::pattern(4)).wide_name = true;
+        testkit::ValueLayout& bytes = layout.set("", 4, testkit::pattern(4));
+        bytes.name = u"\u654e\u2077\u6156\u756c\u2065\u3123";  // "New Value #1", two letters a unit
+        bytes.wide_name = true;
+        const HiveOnDisk file(hive);
+        DummyRegKey top(QStringLiteral("TOP"));
+        RegHive opened(QStringLiteral("HIVE"), file.path(), &top);
+        auto* const key = static_cast<RegKey*>(opened.root_key()->child(0));
+        QCOMPARE(key->new_value_name(), QStringLiteral("New Value #1"));
+        QVERIFY(key->set_qword_value(QStringLiteral("New Value #1"), 1, RegKey::new_value));
+        QCOMPARE(key->new_value_name(), QStringLiteral("New Value #3"));
+    }
+
     void new_value_names_count_up() {
         Opened opened;
         QCOMPARE(opened.empty()->new_value_name(), QStringLiteral("New Value #1"));
@@ -239,8 +255,8 @@ private slots:
         Opened opened;
         const int ab = Opened::row(opened.wide(), QStringLiteral("Ab"));
         const int a = Opened::row(opened.wide(), QStringLiteral("A"));
-        QVERIFY(opened.wide()->set_dword_value(QStringLiteral("A"), 5, 1234, a));
-        QVERIFY(!opened.wide()->set_dword_value(QStringLiteral("A"), 6, 1234, ab));
+        QVERIFY(opened.wide()->set_dword_value(QStringLiteral("A"), 5, little_endian_order, a));
+        QVERIFY(!opened.wide()->set_dword_value(QStringLiteral("A"), 6, little_endian_order, ab));
         const testkit::Bytes pattern = testkit::pattern(4);
         QCOMPARE(opened.file.stored("Wide", "Ab"), QByteArray(reinterpret_cast<const char*>(pattern.data()), 4));
         QVERIFY(opened.wide()->delete_value(ab));
