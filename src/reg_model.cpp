@@ -7,6 +7,7 @@
 #include "value_text.h"
 
 #include <QIcon>
+#include <QScopeGuard>
 #include <QStringList>
 
 #include <algorithm>
@@ -196,17 +197,30 @@ bool RegModel::removeRows(int row, int count, const QModelIndex& parent) {
     return remove_key(row, parent);
 }
 
+// Deletes a key that has no subkeys any more. Where that fails, a search goes on with it as before.
+bool RegModel::remove_leaf(int row, const QModelIndex& parent) {
+    std::vector<Frame> frames = search_;
+    std::set<const AbstractRegKey*> passed_over = passed_over_;
+    auto put_back = qScopeGuard([&] {
+        search_.swap(frames);
+        passed_over_.swap(passed_over);
+    });
+    forget_frames_below(key_of(index(row, 0, parent)));
+    if (!editable_key(parent)->delete_key(row))
+        return false;
+    put_back.dismiss();
+    return true;
+}
+
 bool RegModel::remove_key(int row, const QModelIndex& parent) {
-    RegKey* const key = editable_key(parent);
     // Found before the signals, since what cannot be opened throws.
     const QModelIndex child = index(row, 0, parent);
-    forget_frames_below(key_of(child));
     beginRemoveRows(parent, row, row);
     bool removed = true;
     try {
         for (int i = rowCount(child) - 1; i >= 0 && removed; i--)
             removed = remove_key(i, child);
-        removed = removed && key->delete_key(row);
+        removed = removed && remove_leaf(row, parent);
     } catch (...) {
         endRemoveRows();
         beginInsertRows(parent, row, row);

@@ -86,6 +86,7 @@ private:
     QVariant spoken_name(const QModelIndex& index) const;
     int key_depth(const QModelIndex& index) const;
     bool remove_key(int row, const QModelIndex& parent);
+    bool remove_leaf(int row, const QModelIndex& parent);
     void move_persistent_indexes(const QModelIndex& renamed, const QModelIndex& moved);
 
     void push_next_sibling(const QModelIndex& key);

@@ -82,14 +82,19 @@ std::vector<int> rows_by_name(const std::vector<QString>& names, const QString& 
 
 std::optional<std::vector<QString>> shown_value_names(RegKey& key, const QString& default_name,
                                                       const std::function<bool()>& is_stopped) {
+    int unnamed = -1;
     const auto name_of = [&](int row) {
-        const std::optional<QString> name = key.value_name(row);
-        return name.has_value() && name->isEmpty() ? default_name : name.value_or(QString());
+        std::optional<QString> name = key.value_name(row);
+        if (!name.has_value())  // a failed read that passes must not move the rows
+            name = key.value_name(row);
+        if (!name.has_value() || !name->isEmpty())
+            return name.value_or(QString());
+        unnamed = unnamed < 0 ? row : unnamed;
+        return default_name;
     };
     const auto names = names_of_rows(key.value_count(), name_of, is_stopped);
     if (!names.has_value())
         return std::nullopt;
-    const int unnamed = key.default_value_position();
     std::vector<QString> shown;
     if (unnamed < 0)
         shown.push_back(default_name);

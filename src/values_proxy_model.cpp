@@ -23,7 +23,8 @@ RegKey* ValuesProxyModel::key() const {
 
 bool ValuesProxyModel::has_key() const { return key() != nullptr; }
 
-// Asked of the key after each change: what happened to a row does not say whether an unnamed value is left.
+// Asked of the key after it got a value or lost one: what happened to a row does not say whether an unnamed value is
+// left.
 void ValuesProxyModel::ask_for_default() {
     RegKey* const shown = key();
     unnamed_ = shown != nullptr ? shown->default_value_position() : -1;
@@ -156,15 +157,13 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
         // A rename that failed may have moved the value to the end of its list, beside the one of the new name or
         // alone.
         if (is_rename && (rowCount() != rows || data(index, Qt::DisplayRole) != name)) {
-            ask_for_default();
+            find_default_again();
             arrange([&] { move_held_rows(held, index.row(), value.toString()); });
         }
         return false;
     }
-    if (is_rename) {
-        move_to_end(index.row());
-        ask_for_default();
-    }
+    if (is_rename)
+        note_moved_to_end(index.row());
     emit dataChanged(index, index);
     return true;
 }
@@ -220,6 +219,8 @@ bool ValuesProxyModel::change_source(const std::function<bool()>& change) {
         const int now = rows_now(rows);
         if (now > rows) {
             beginInsertRows(QModelIndex(), rows, now - 1);
+            for (int row = rows - offset(); !mapping_.empty() && row < now - offset(); row++)
+                mapping_.push_back(row);
             endInsertRows();
         }
     };
@@ -236,13 +237,20 @@ bool ValuesProxyModel::change_source(const std::function<bool()>& change) {
     return changed;
 }
 
+// After a rename by half: an unnamed value is there if it was, whatever a failed read makes of the answer.
+void ValuesProxyModel::find_default_again() {
+    const int position = synthetic_default_ || !has_key() ? -1 : key()->default_value_position();
+    unnamed_ = position >= 0 ? position : unnamed_;
+}
+
 // After a rename: the source has the value at its end now, and those behind it one row higher. The shown row stays
 // where the user sees it until the next sort.
-void ValuesProxyModel::move_to_end(int row) {
+void ValuesProxyModel::note_moved_to_end(int row) {
+    const int moved = source_row(row);
+    unnamed_ -= unnamed_ > moved ? 1 : 0;
     const auto position = static_cast<size_t>(row - offset());
     if (position >= mapping_.size())
         return;
-    const int moved = mapping_[position];
     int lowered = 0;
     for (int& source : mapping_) {
         if (source > moved) {
@@ -324,6 +332,10 @@ void ValuesProxyModel::announce_layout() {
 
 void ValuesProxyModel::sort(int, Qt::SortOrder) {
     arrange([] {});
+    if (has_default_twice_) {
+        give_way_to_default();
+        arrange([] {});
+    }
 }
 
 void ValuesProxyModel::arrange(const std::function<void()>& move_indexes) {
@@ -353,6 +365,8 @@ void ValuesProxyModel::order_rows() {
         throw;
     }
     mapping_ = rows_by_name(names, default_name_, unnamed_);
+    has_default_twice_ =
+        synthetic_default_ && !names.empty() && names[static_cast<size_t>(mapping_.front())] == default_name_;
 }
 
 // What the rows are called that somebody has an index of.

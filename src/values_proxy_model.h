@@ -36,7 +36,7 @@ public:
     // The data of the made-up row creates the unnamed value.
     bool setData(const QModelIndex& index, const QVariant& value, int role) override;
     bool removeRows(int row, int count, const QModelIndex& parent = QModelIndex()) override;
-    // Always by name, ascending, whatever is asked for.
+    // Reads every row anew and orders them by name, ascending, whatever is asked for.
     void sort(int column, Qt::SortOrder order) override;
 
     // Creates a value of a type; it is the last row until the next sort.
@@ -53,6 +53,7 @@ private:
     bool is_synthetic(int row) const { return synthetic_default_ && row == 0; }
     int source_row(int row) const;
     void ask_for_default();
+    void find_default_again();
     QVariant spoken_data(const QModelIndex& index) const;
     bool change_source(const std::function<bool()>& change);
     bool make_default(const QModelIndex& index, const QVariant& value);
@@ -63,13 +64,15 @@ private:
     void order_rows();
     QHash<int, QString> names_of_held_rows() const;
     void move_held_rows(const QHash<int, QString>& names_before, int renamed, const QString& new_name);
-    void move_to_end(int row);
+    void note_moved_to_end(int row);
     bool remove_from_source(int row, int source_row);
     void end_removal(int row, int source_row, int rows_before);
 
     std::vector<int> mapping_;  // source row by position; empty until the first sort
     bool synthetic_default_ = false;
     int unnamed_ = -1;  // source row of the unnamed value
+    // Beside the made-up row a value reads like it. The unnamed value may not have been readable when it was asked for.
+    bool has_default_twice_ = false;
     QString default_name_;
     bool is_source_quiet_ = false;  // what the source says of its rows is not passed on
 };

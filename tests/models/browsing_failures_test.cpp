@@ -7,6 +7,8 @@
 #include "searched.h"
 
 #include "reg_key.h"
+#include "values_model.h"
+#include "values_proxy_model.h"
 
 #include <QTest>
 
@@ -22,6 +24,8 @@ testkit::HiveLayout layout() {
         testkit::KeyLayout& key = parent.add("p" + std::to_string(100 + i));
         key.set("v", 3, testkit::pattern(3000));
         key.add("sub");
+        if (i % 4 == 0)
+            key.flags = 0x10;  // a symbolic link, which its parent's list names
     }
     return hive;
 }
@@ -88,6 +92,46 @@ private slots:
             QCOMPARE(hits, 40 - unreadable_here);
         }
         QVERIFY(unreadable > 0);
+    }
+
+    void a_hit_is_the_row_that_the_table_shows() {
+        testkit::HiveLayout hive;
+        testkit::KeyLayout& wide = hive.root.add("Wide");
+        for (int i = 0; i < 60; i++)
+            wide.set("value " + std::to_string(i), 3, testkit::pattern(3000)).wide_name = true;
+        wide.set("", 1, testkit::text_data("is set"));
+        const testkit::Bytes bytes = testkit::lay_out(hive).bytes;
+        for (const char* name : {"value 0", "value 59", "(Default)"}) {
+            const QString term = QString::fromLatin1(name);
+            int hits = 0;
+            bool failed = true;
+            for (int nth = 1; failed; nth++) {
+                Searched searched(bytes);
+                RegKey* const key = RegModel::editable_key(searched.at(QStringLiteral("Wide")));
+                for (int i = 0; i < key->value_count(); i++)
+                    key->read_value(i);  // the engine's window is elsewhere then
+                searched.begin();
+                RegModel::FindResult hit;
+                {
+                    const testkit::ReadFaults faults(nth);
+                    try {
+                        hit = searched.model.find(term, RegModel::FindValues, Qt::MatchFixedString);
+                    } catch (const std::runtime_error&) {
+                        // told
+                    }
+                    failed = faults.failed();
+                }
+                if (!hit.key.isValid())
+                    continue;
+                hits++;
+                ValuesModel source(key);
+                ValuesProxyModel table;
+                table.setSourceModel(&source);
+                table.sort(0, Qt::AscendingOrder);
+                QCOMPARE(table.index(hit.value_row, 0).data().toString(), term);
+            }
+            QVERIFY(hits > 2);
+        }
     }
 };
 

@@ -388,9 +388,12 @@ private slots:
 
     void a_real_hive_gives_every_name_once_and_in_order() {
         int searched_hives = 0;
+        int left_out = 0;
         for (const testkit::RealHive& hive : testkit::real_hives()) {
-            if (hive.keys > 3000 || hive.name == "software-nt4")
+            if (hive.keys > 3000 || hive.name == "software-nt4") {
+                left_out++;
                 continue;
+            }
             const testkit::Bytes bytes = testkit::read_file(hive.path);
             Searched searched(bytes);
             for (const char* term : {"e", "", "no such name"}) {
@@ -406,7 +409,7 @@ private slots:
             }
             searched_hives++;
         }
-        qInfo("searched %d real hives", searched_hives);
+        qInfo("searched %d real hives, left out %d", searched_hives, left_out);
     }
 };
 

@@ -405,6 +405,43 @@ private slots:
                                                    "Parent\\branch"};
         QCOMPARE(gone, in_order);
     }
+
+    // A search waits in the branch when its removal stops halfway: what is left of the branch is still searched.
+    void a_search_goes_on_with_what_a_failed_removal_leaves() {
+        const QStringList order = {QStringLiteral("branch/one"),
+                                   QStringLiteral("branch/one/deep 1"),
+                                   QStringLiteral("branch/one/deep 2"),
+                                   QStringLiteral("branch/two"),
+                                   QStringLiteral("middle"),
+                                   QStringLiteral("zulu")};
+        const testkit::Bytes bytes = testkit::lay_out(layout(false)).bytes;
+        const QString parent = QStringLiteral("Parent/");
+        int left = 0;
+        for (const Fails way : {Fails::one_write, Fails::writes_from_there_on, Fails::one_request}) {
+            for (qsizetype visited = 0; visited < 4; visited++) {
+                bool has_failed = true;
+                for (int nth = 1; has_failed; nth++) {
+                    Searched searched(bytes);
+                    searched.model.begin_find(searched.at(parent + QStringLiteral("branch")));
+                    for (qsizetype i = 0; i <= visited; i++)
+                        searched.model.find(QString(), RegModel::FindKeys, Qt::MatchContains);
+                    {
+                        const Failing failing(way, nth);
+                        removal_of_a_tree.make(searched.model);
+                        has_failed = failing.failed();
+                    }
+                    QStringList wanted;
+                    for (const QString& key : order.mid(visited)) {
+                        if (searched.at(parent + key).isValid())
+                            wanted.append(QStringLiteral("TOP/HIVE/") + parent + key);
+                    }
+                    left += wanted.size() > 2 ? 1 : 0;
+                    QCOMPARE(searched.rest(QString(), RegModel::FindKeys), wanted);
+                }
+            }
+        }
+        QVERIFY(left > 0);
+    }
 };
 
 QTEST_MAIN(TreeFailuresTest)

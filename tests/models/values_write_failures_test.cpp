@@ -294,6 +294,37 @@ private slots:
         QVERIFY(tally.done_again > 0);
     }
 
+    // Of the write that counts the new value half arrives, and no other then: the value is there though it was refused.
+    // The table has it in its last row from then on.
+    void a_rename_after_a_new_value_that_was_refused_and_stayed() {
+        const auto add_text = [](ValuesProxyModel& model, int) { return model.add_value(REG_SZ); };
+        const Change addition = {QStringLiteral("a new text"), Full, QString(), add_text, true};
+        const QStringList wanted = {default_name, QStringLiteral("zeta"), QStringLiteral("delta"),
+                                    QStringLiteral("gamma"), QStringLiteral("New Value #1")};
+        HiveOnDisk file(testkit::Bytes{});
+        const WholeChange whole = undisturbed(addition, file, false);
+        int stayed = 0;
+        bool has_failed = true;
+        for (int nth = 1; has_failed; nth++) {
+            file.put(whole.bytes);
+            Shown shown(file, Full);
+            const int rows = shown.source.rowCount();
+            Outcome outcome = Outcome::refused;
+            {
+                const testkit::WriteFaults faults(nth, true, ENOSPC, true);
+                outcome = addition.make(shown.proxy);
+                has_failed = faults.failed();
+            }
+            if (outcome != Outcome::refused || shown.source.rowCount() == rows)
+                continue;
+            stayed++;
+            const QModelIndex renamed = shown.proxy.index(1, ValuesModel::NameColumn);
+            QVERIFY(shown.proxy.setData(renamed, QStringLiteral("zeta"), Qt::EditRole));
+            QCOMPARE(shown.names(), wanted);
+        }
+        QVERIFY(stayed > 0);
+    }
+
     // A stop after each write: the value is there under the old name, then under both, then under the new one.
     void a_renamed_value_is_made_before_the_old_one_goes() {
         const Change& rename = changes()[0];
