@@ -8,6 +8,7 @@
 
 #include <QItemEditorFactory>
 #include <QKeyEvent>
+#include <QLineEdit>
 #include <QMetaProperty>
 #include <QPointer>
 #include <QScopedValueRollback>
@@ -33,6 +34,15 @@ void say_unreadable(QStyleOptionViewItem& option) {
 NameDelegate::NameDelegate(QWidget* main_window) : main_window_(main_window) {
     until_told_.setSingleShot(true);
     connect(&until_told_, &QTimer::timeout, this, &NameDelegate::tell_refused_names);
+}
+
+QWidget* NameDelegate::createEditor(QWidget* parent, const QStyleOptionViewItem& option,
+                                    const QModelIndex& index) const {
+    QWidget* const editor = QStyledItemDelegate::createEditor(parent, option, index);
+    if (auto* line = qobject_cast<QLineEdit*>(editor)) {
+        line->setMaxLength(std::numeric_limits<int>::max());
+    }
+    return editor;
 }
 
 void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,

@@ -22,6 +22,9 @@ public:
     // `main_window` is the parent of the message box and is not owned.
     explicit NameDelegate(QWidget* main_window);
 
+    // Names are longer than the toolkit's editor takes by default; one that it cut would pass for a new name.
+    QWidget* createEditor(QWidget* parent, const QStyleOptionViewItem& option, const QModelIndex& index) const override;
+
     // Tells each name that was refused and not told yet, and returns when the user has seen it. Comes from the event
     // loop by itself.
     void tell_refused_names() const;

@@ -3,6 +3,7 @@
 #include "edit_dialogs.h"
 
 #include "compact_dialog.h"
+#include "validators.h"
 
 #include <QAbstractItemModel>
 #include <QCoreApplication>
@@ -20,6 +21,16 @@
 
 namespace {
 
+// Return held down, which has opened the editor, does not answer it.
+class EditorDialog : public QDialog {
+protected:
+    void keyPressEvent(QKeyEvent* event) override {
+        if (!event->isAutoRepeat()) {
+            QDialog::keyPressEvent(event);
+        }
+    }
+};
+
 // Takes the caller's widget out of the dialog again, whatever way the dialog is left: the caller owns it, and still
 // reads it.
 class Loan {
@@ -35,7 +46,7 @@ private:
 
 // Lays out an editor around its data widget and runs it; true for Ok.
 bool run_editor(const QString& title, const QString& value_name, QWidget* data_widget) {
-    QDialog dialog;
+    EditorDialog dialog;
     const Loan loan(data_widget);
     dialog.setWindowTitle(title);
     auto* name_edit = new QLineEdit(value_name);
@@ -98,7 +109,9 @@ bool edit_string(QAbstractItemModel& model, const QString& value_name, const QSt
     if (!run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit)) {
         return true;
     }
-    return model.setData(data_index, edit.isModified() ? without_zeros(edit.text()) : data, Qt::DisplayRole);
+    // Compared, since the line edit's own mark of a change misses text that an assistive program has put in.
+    const QString text = edit.text();
+    return model.setData(data_index, text == data ? data : without_zeros(text), Qt::DisplayRole);
 }
 
 bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QByteArray& data,
@@ -109,6 +122,7 @@ bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QBy
     // One class of characters and no alternatives: these take a step per digit on the matcher's stack, which runs out
     // at some ten thousand digits.
     edit.setValidator(new QRegularExpressionValidator(QRegularExpression(QStringLiteral("[a-fA-F0-9]*")), &edit));
+    take_back_invalid_text(edit);
     if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Binary Value", "dialog title"), value_name,
                     &edit)) {
         return true;

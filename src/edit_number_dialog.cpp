@@ -44,6 +44,7 @@ EditNumberDialog::EditNumberDialog(const QString& value_name, int bits)
     hex_button->setChecked(true);
     connect(hex_button, &QRadioButton::toggled, this, &EditNumberDialog::mode_changed);
     data_edit->setValidator(hex_validator);
+    take_back_invalid_text(*data_edit);
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, Qt::Horizontal);
     connect(buttons, &QDialogButtonBox::accepted, this, &EditNumberDialog::accept);
     connect(buttons, &QDialogButtonBox::rejected, this, &EditNumberDialog::reject);

@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 #include "validators.h"
 
+#include <QLineEdit>
+
 #include <algorithm>
 
 namespace {
@@ -27,6 +29,18 @@ QValidator::State judge(const QString& input, Number bottom, Number top, Parse p
 }
 
 }  // namespace
+
+void take_back_invalid_text(QLineEdit& edit) {
+    QObject::connect(&edit, &QLineEdit::textChanged, &edit, [&edit, valid = edit.text()](const QString& text) mutable {
+        QString judged = text;
+        int position = edit.cursorPosition();
+        if (edit.validator()->validate(judged, position) == QValidator::Invalid) {
+            edit.setText(valid);
+        } else {
+            valid = text;
+        }
+    });
+}
 
 UintValidator::UintValidator(quint32 bottom, quint32 top, QObject* parent)
     : QValidator(parent), bottom_(bottom), top_(top) {}

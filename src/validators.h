@@ -6,6 +6,12 @@
 
 #include <QValidator>
 
+class QLineEdit;
+
+// From now on a text that the line edit's validator calls invalid gives way to the one before it. Typed text never gets
+// that far, but what an assistive program puts in is set, which no validator is asked about.
+void take_back_invalid_text(QLineEdit& edit);
+
 class UintValidator : public QValidator {
     Q_OBJECT
 

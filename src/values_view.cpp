@@ -162,7 +162,9 @@ bool ValuesView::edit_qword(const QString& value_name, quint64 number, const QPe
 
 void ValuesView::keyPressEvent(QKeyEvent* event) {
     if (event->key() == Qt::Key_Return && state() != QAbstractItemView::EditingState) {
-        value_double_clicked(currentIndex());
+        if (!event->isAutoRepeat()) {
+            value_double_clicked(currentIndex());
+        }
     } else if (event->matches(QKeySequence::Copy) && currentIndex().isValid()) {
         // As it is shown: the toolkit would take bytes for text, and a list of strings for nothing.
         event->accept();

@@ -99,12 +99,13 @@ private slots:
     void the_text_of_a_megabyte_is_whole();
     void a_type_without_a_rule_prints_the_fallback_line();
     void an_unchanged_name_is_not_written();
+    void a_name_is_edited_whole_however_long();
     void a_changed_name_is_written_under_the_edit_role();
     void a_refused_name_is_told_data();
     void a_refused_name_is_told();
     void a_lost_name_is_told_with_its_key_data();
     void a_lost_name_is_told_with_its_key();
-    void an_editor_without_user_property_is_read_by_the_type_s();
+    void an_editor_without_user_property_is_read_by_the_default_property_of_the_type();
     void a_damaged_cell_is_told_once_and_not_through_the_paint();
     void a_megabyte_paints_like_a_kilobyte_data();
     void a_megabyte_paints_like_a_kilobyte();
@@ -169,6 +170,16 @@ void DelegatesTest::an_unchanged_name_is_not_written() {
     QLineEdit editor(QStringLiteral("name"));
     ValueDelegate(nullptr).setModelData(&editor, &model, model.index(0, 0));
     KeyDelegate(nullptr).setModelData(&editor, &model, model.index(0, 0));
+    QVERIFY(model.written.isEmpty());
+}
+
+void DelegatesTest::a_name_is_edited_whole_however_long() {
+    NotingModel model(QString(65535, QLatin1Char('n')));
+    const ValueDelegate delegate(nullptr);
+    QWidget parent;
+    QWidget* const editor = delegate.createEditor(&parent, QStyleOptionViewItem(), model.index(0, 0));
+    delegate.setEditorData(editor, model.index(0, 0));
+    delegate.setModelData(editor, &model, model.index(0, 0));
     QVERIFY(model.written.isEmpty());
 }
 
@@ -246,7 +257,7 @@ void DelegatesTest::a_lost_name_is_told_with_its_key() {
     }
 }
 
-void DelegatesTest::an_editor_without_user_property_is_read_by_the_type_s() {
+void DelegatesTest::an_editor_without_user_property_is_read_by_the_default_property_of_the_type() {
     NotingModel model(QStringLiteral("name"));
     QWidget editor;
     editor.setProperty("text", QStringLiteral("other"));

@@ -7,6 +7,7 @@
 #include "ui_test.h"
 
 #include <QAbstractButton>
+#include <QAccessible>
 #include <QDialogButtonBox>
 #include <QLabel>
 #include <QLineEdit>
@@ -83,7 +84,7 @@ void set_text(const QWidget& dialog, const QString& text) {
         edit->insertPlainText(text);
         return;
     }
-    // Typed, as far as the validator and the mark of a modified text are concerned.
+    // Typed, as far as the validator is concerned.
     auto* edit = qobject_cast<QLineEdit*>(data_field(dialog));
     edit->selectAll();
     edit->insert(text);
@@ -134,6 +135,9 @@ private slots:
     void a_megabyte_in_hexadecimal();
     void the_base_switch_converts_data();
     void the_base_switch_converts();
+    void what_an_assistive_program_puts_in_is_stored_as_it_is_shown_data();
+    void what_an_assistive_program_puts_in_is_stored_as_it_is_shown();
+    void return_held_down_does_not_answer();
     void an_empty_number_is_zero();
     void a_line_made_by_shift_return_is_a_line();
     void a_line_beside_a_separator_is_a_line();
@@ -390,6 +394,66 @@ void EditorsTest::the_base_switch_converts() {
         QCOMPARE(dword.value(), static_cast<quint32>(number));
         check(dword);
     }
+}
+
+void EditorsTest::what_an_assistive_program_puts_in_is_stored_as_it_is_shown_data() {
+    QTest::addColumn<int>("editor");
+    QTest::addColumn<QVariant>("data");
+    QTest::addColumn<bool>("in_decimal");
+    QTest::addColumn<QString>("put_in");
+    QTest::addColumn<QVariant>("stored");
+    QTest::newRow("text") << int(StringEditor) << QVariant(QStringLiteral("old")) << false << "new "
+                          << QVariant(QStringLiteral("new old"));
+    QTest::newRow("texts") << int(MultiStringEditor) << QVariant(lines({"a", "b"})) << false << "new\n"
+                           << QVariant(lines({"new", "a", "b"}));
+    QTest::newRow("bytes") << int(BinaryEditor) << QVariant(QByteArray("\x01")) << false << "0a"
+                           << QVariant(QByteArray("\x0a\x01"));
+    QTest::newRow("no hexadecimal digits")
+        << int(BinaryEditor) << QVariant(QByteArray("\x12")) << false << "0x" << QVariant(QByteArray("\x12"));
+    QTest::newRow("an eighth digit") << int(DwordEditor) << QVariant(0xfffffffU) << false << "1"
+                                     << QVariant(0x1fffffffU);
+    QTest::newRow("a ninth digit") << int(DwordEditor) << QVariant(0xffffffffU) << false << "1"
+                                   << QVariant(0xffffffffU);
+    QTest::newRow("a seventeenth digit") << int(QwordEditor) << QVariant(0xffffffffffffffffULL) << false << "1"
+                                         << QVariant(0xffffffffffffffffULL);
+    QTest::newRow("more than 32 bits") << int(DwordEditor) << QVariant(4000000000U) << true << "1"
+                                       << QVariant(4000000000U);
+    QTest::newRow("a decimal digit") << int(QwordEditor) << QVariant(4000000000ULL) << true << "1"
+                                     << QVariant(14000000000ULL);
+}
+
+void EditorsTest::what_an_assistive_program_puts_in_is_stored_as_it_is_shown() {
+    QFETCH(int, editor);
+    QFETCH(QVariant, data);
+    QFETCH(bool, in_decimal);
+    QFETCH(QString, put_in);
+    QFETCH(QVariant, stored);
+    NotingModel model;
+    DialogHand hand;
+    hand.then([&](QWidget* dialog) {
+        if (in_decimal) {
+            find_by_text<QRadioButton>(*dialog, QStringLiteral("Decimal"))->setChecked(true);
+        }
+        QAccessible::queryAccessibleInterface(data_field(*dialog))->editableTextInterface()->insertText(0, put_in);
+        press(*dialog, QDialogButtonBox::Ok);
+    });
+    run(static_cast<Editor>(editor), model, data);
+    QVERIFY(hand.is_done());
+    QCOMPARE(model.written, QVariantList{stored});
+}
+
+void EditorsTest::return_held_down_does_not_answer() {
+    NotingModel model;
+    DialogHand hand;
+    hand.then([&](QWidget* dialog) {
+        QKeyEvent repeated(QEvent::KeyPress, Qt::Key_Return, Qt::NoModifier, QStringLiteral("\r"), true);
+        QApplication::sendEvent(data_field(*dialog), &repeated);
+        QVERIFY(dialog->isVisible());
+        press(*dialog, QDialogButtonBox::Cancel);
+    });
+    edit_string(model, QStringLiteral("n"), QString(), model.index(0, 2));
+    QVERIFY(hand.is_done());
+    QVERIFY(model.written.isEmpty());
 }
 
 void EditorsTest::an_empty_number_is_zero() {

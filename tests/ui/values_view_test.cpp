@@ -45,7 +45,7 @@ class ValuesViewTest : public QObject {
 private slots:
     void the_editor_follows_the_data_data();
     void the_editor_follows_the_data();
-    void a_cancelled_number_is_not_written();
+    void what_is_cancelled_is_not_written();
     void data_goes_to_no_other_key_s_value_data();
     void data_goes_to_no_other_key_s_value();
     void data_that_cannot_be_edited_is_told();
@@ -136,7 +136,7 @@ void ValuesViewTest::the_editor_follows_the_data() {
     QCOMPARE(value->type, type);
 }
 
-void ValuesViewTest::a_cancelled_number_is_not_written() {
+void ValuesViewTest::what_is_cancelled_is_not_written() {
     const Scene scene;
     Stage stage(scene);
     stage.select_key(alpha);
@@ -221,6 +221,9 @@ void ValuesViewTest::return_opens_the_editor_and_enter_does_not() {
     DialogHand hand;
     stage.select_value(alpha, QStringLiteral("dword"));
     QTest::keyClick(stage.values, Qt::Key_Enter);
+    QVERIFY(hand.nothing_comes());
+    QKeyEvent held_down(QEvent::KeyPress, Qt::Key_Return, Qt::NoModifier, QStringLiteral("\r"), true);
+    QApplication::sendEvent(stage.values, &held_down);
     QVERIFY(hand.nothing_comes());
     QString title;
     hand.then([&](QWidget* dialog) {
