@@ -66,11 +66,11 @@ TEST_F(Changing, a_null_key_is_refused_by_every_call) {
     EXPECT_EQ(RCreateKey(nullptr, "New", &made, nullptr), R_FAILED);
     EXPECT_EQ(made, nullptr);
     EXPECT_EQ(RCloseHive(scene.root()), R_DEVICE_IN_USE) << "a handle that stood in the output was closed";
-    EXPECT_NE(RCreateKey(scene.root(), "New", nullptr, nullptr), 0);
+    EXPECT_EQ(RCreateKey(scene.root(), "New", nullptr, nullptr), R_INVALID_PARAMETER);
     EXPECT_EQ(RSetValueExW(nullptr, "v", 1, "ab", 2), R_INVALID_HANDLE);
     EXPECT_EQ(RSetValueExA(nullptr, "v", 1, "ab", 2), R_INVALID_HANDLE);
     EXPECT_EQ(RDeleteValue(nullptr, "v"), R_INVALID_HANDLE);
-    EXPECT_NE(RRenameKey(nullptr, 0, "x"), 0);
+    EXPECT_EQ(RRenameKey(nullptr, 0, "x"), R_INVALID_HANDLE);
     EXPECT_EQ(RDeleteKey(nullptr, "x"), R_INVALID_HANDLE);
     EXPECT_EQ(RCheckDeleteTree(nullptr, 0), R_INVALID_HANDLE);
     EXPECT_TRUE(scene.Untouched());

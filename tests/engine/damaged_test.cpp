@@ -262,7 +262,7 @@ TEST(Damaged, a_key_made_in_the_list_of_the_root_leaves_the_root_its_list) {
     Scene scene(hive.bytes);
     ASSERT_TRUE(scene.is_open());
     for (const char* name : {"a", "b", "c"})
-        scene.Create(std::string("Loop\\") + name);
+        EXPECT_EQ(scene.Create(std::string("Loop\\") + name), 0);
     EXPECT_TRUE(scene.Reopen());
     EXPECT_TRUE(scene.OpenKey("Loop"));
 }
@@ -532,7 +532,7 @@ TEST(Damaged, deleting_a_key_whose_list_of_values_is_another_key_leaves_that_key
     hive.put32(hive.at("Gamma\\leaf").record, 36, 1);
     hive.put32(hive.at("Gamma\\leaf").record, 40, hive.at("Beta").record);
     Scene scene(hive.bytes);
-    scene.Delete("Gamma\\leaf");
+    EXPECT_EQ(scene.Delete("Gamma\\leaf"), 0);
     EXPECT_TRUE(scene.OpenKey("Beta"));
     const Hive now = scene.Read();
     EXPECT_EQ(find_value(*now.find("Beta"), "v")->data, pattern(40));

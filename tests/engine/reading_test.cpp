@@ -217,8 +217,7 @@ TEST_F(Reading, without_a_data_buffer_the_stored_size_comes_back) {
     EXPECT_EQ(size, 12U);
 }
 
-TEST_F(Reading, a_dword_needs_no_data_cell) {
-    scene.file().arm({});
+TEST_F(Reading, a_dword_is_in_its_record) {
     uint32_t dword = 0;
     uint32_t size = 4;
     uint32_t type = 0;

@@ -153,8 +153,11 @@ TEST_F(AllocatorRow, a_cell_freed_between_two_free_ones_joins_both) {
 }
 
 TEST_F(AllocatorRow, of_two_fitting_cells_the_smaller_is_taken) {
-    free_cell(row.cell[1]);
-    EXPECT_EQ(raw(engine::allocate(store_of(scene), 4)), row.cell[1]);
+    engine::allocate(store_of(scene), 20);
+    for (const uint32_t cell : {row.cell[0], row.cell[1], row.cell[3]})
+        free_cell(cell);
+    EXPECT_EQ(sizes()[0], 48);
+    EXPECT_EQ(raw(engine::allocate(store_of(scene), 4)), row.cell[3]);
 }
 
 TEST_F(AllocatorRow, what_is_no_cell_in_use_is_not_freed) {

@@ -1,8 +1,8 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// Breaks fields of records and mends what the gate looks at, so that an input gets past it: signature, size, bin
-// headers and checksum.
+// Breaks fields of records and mends what an input is turned away for: signature, size and bin headers, which the
+// engine wants, and the checksum, which the checker does.
 #include <cstddef>
 #include <cstdint>
 #include <cstdlib>

@@ -1,7 +1,7 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
 //
-// Checks a hive's bytes against the format's rules, without the engine: run after every change in every test.
+// Checks a hive's bytes against the format's rules, without the engine: for after a change.
 #pragma once
 
 #include "bytes.h"

@@ -27,7 +27,7 @@ std::vector<RealHive> real_hives() {
         hives.push_back({fields[0], directory + "/" + fields[0], std::stoul(fields[3]), std::stoul(fields[4])});
     }
     if (hives.empty())
-        printf("[ LEFT OUT ] every real hive: TALLOWFEN_HIVES names no directory with them\n");
+        printf("[ LEFT OUT ] 1 check of real hives: TALLOWFEN_HIVES names no directory with them\n");
     return hives;
 }
 

@@ -61,9 +61,17 @@ extern const char* const left_alone;
 void add_left_alone(HiveLayout& layout);
 
 // The hive that most entries damage, of some 8 KB:
-//   Alpha: "", Text, Number, Raw, Same; class "Klass"; subkeys Inner (Deep, Deeper), Other (security of its
-//   own), Third Beta: an "ri" over leaves of two; subkeys b1 to b5, b3 with a value Gamma: List (a
-//   multi-string), Eight (8 bytes in a cell); subkeys leaf, moon (security of its own), _under Zeta: nothing
+//   Alpha      values "", Text, Number, Raw, Same; class "Klass"
+//     Inner    value Deep; subkey Deeper, with a value
+//     Other    security of its own
+//     Third
+//   Beta       an "ri" over leaves of two: b1 to b5, b3 with a value
+//   Gamma      values List (a multi-string), Eight (8 bytes in a cell)
+//     _under
+//     leaf
+//     moon     security of its own
+//   Zeta
+//   left_alone
 HiveLayout stage();
 
 // The same without free space, and with the data of Alpha's Raw in the last cell: a hive opens where that one alone is
