@@ -22,3 +22,17 @@ target_compile_definitions(tallowfen_qt INTERFACE
 
 add_library(tallowfen_common INTERFACE)
 target_link_libraries(tallowfen_common INTERFACE tallowfen_warnings tallowfen_sanitizers)
+
+# tallowfen_share_headers(TARGETS... HEADERS headers...): with TALLOWFEN_PCH the first target compiles the headers ahead,
+# and the others take them from it. All must be built with the same options.
+function(tallowfen_share_headers)
+    cmake_parse_arguments(S "" "" "HEADERS" ${ARGN})
+    if(NOT TALLOWFEN_PCH)
+        return()
+    endif()
+    list(POP_FRONT S_UNPARSED_ARGUMENTS first)
+    target_precompile_headers(${first} PRIVATE ${S_HEADERS})
+    foreach(target IN LISTS S_UNPARSED_ARGUMENTS)
+        target_precompile_headers(${target} REUSE_FROM ${first})
+    endforeach()
+endfunction()

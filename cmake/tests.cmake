@@ -25,3 +25,11 @@ function(tallowfen_add_test)
         endforeach()
     endforeach()
 endfunction()
+
+# tallowfen_add_moc(TARGET): makes the file TARGET.moc that TARGET.cpp includes at its end. CMake's own way costs each
+# program three steps more of the build.
+function(tallowfen_add_moc target)
+    qt6_generate_moc(${target}.cpp ${target}.moc TARGET ${target})
+    target_sources(${target} PRIVATE ${CMAKE_CURRENT_BINARY_DIR}/${target}.moc)
+    target_include_directories(${target} PRIVATE ${CMAKE_CURRENT_BINARY_DIR})
+endfunction()

@@ -4,9 +4,12 @@
 // Every key and value of real hives, read through the engine, is what the independent reader finds; and a
 // change to a copy changes what it names and nothing else.
 #include "real_hives.h"
+#include "sanitized.h"
 #include "scene.h"
 
 #include <gtest/gtest.h>
+
+#include <cstdio>
 
 using namespace testkit;
 
@@ -88,9 +91,12 @@ TEST(RealHives, every_key_and_value_reads_as_the_independent_reader_has_it) {
 }
 
 TEST(RealHives, every_key_named_in_8_bits_is_found_by_its_path) {
+    size_t left_out = 0;
     for (const RealHive& real : real_hives()) {
-        if (real.keys > 30000)
-            continue;  // one of each size is enough for look-ups by path
+        if (real.keys > 30000) {  // the smaller ones are enough for look-ups by path
+            left_out++;
+            continue;
+        }
         SCOPED_TRACE(real.name);
         Scene scene(read_file(real.path));
         ASSERT_TRUE(scene.is_open());
@@ -110,10 +116,16 @@ TEST(RealHives, every_key_named_in_8_bits_is_found_by_its_path) {
         }
         EXPECT_EQ(missed, 0U);
     }
+    if (left_out > 0)
+        printf("[ LEFT OUT ] %zu real hives of more than 30,000 keys\n", left_out);
 }
 
 TEST(RealHives, a_key_and_a_value_made_and_removed_leave_all_else_as_it_was) {
     for (const RealHive& real : real_hives()) {
+        if (is_sanitized && real.keys > 12000) {  // the checker reads the whole hive after each change
+            printf("[ LEFT OUT ] %s, %zu keys\n", real.name.c_str(), real.keys);
+            continue;
+        }
         SCOPED_TRACE(real.name);
         Scene scene(read_file(real.path));
         ASSERT_TRUE(scene.is_open());

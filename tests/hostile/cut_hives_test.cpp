@@ -5,6 +5,7 @@
 // the whole hive, and they are changed where they open.
 #include "changes.h"
 #include "real_hives.h"
+#include "sanitized.h"
 #include "scene.h"
 
 #include <gtest/gtest.h>
@@ -134,7 +135,8 @@ void compare_with_whole(const Whole& whole, const Snapshot& found, size_t length
                         std::back_inserter(missing));
     EXPECT_TRUE(missing.empty()) << "cut at " << length << ": " << missing.front().place;
     for (const Item& item : found.items) {
-        EXPECT_TRUE(item.what.find("status ") != std::string::npos || item.place.back() == '?' ||
+        const bool is_unread = !item.place.empty() && item.place.back() == '?';
+        EXPECT_TRUE(item.what.find("status ") != std::string::npos || is_unread ||
                     std::binary_search(whole.snapshot.items.begin(), whole.snapshot.items.end(), item))
             << "cut at " << length << ": " << item.place;
     }
@@ -168,6 +170,9 @@ void survive(const Whole& whole, size_t length, Tally& tally) {
     EXPECT_TRUE(file.bytes == hive.bytes);
 }
 
+// Under a sanitizer the last bin is cut at every fifth byte, which comes by each of a word's.
+constexpr size_t bytes_between_cuts = testkit::is_sanitized ? 5 : 1;
+
 // A stride is for hives that take long to read; with TALLOWFEN_HOSTILE_ALL there is none.
 void cut_everywhere(const std::string& name, const Bytes& bytes, size_t stride = 1) {
     SCOPED_TRACE(name);
@@ -180,12 +185,12 @@ void cut_everywhere(const std::string& name, const Bytes& bytes, size_t stride =
     size_t last_bin = 4096;
     while (last_bin + testkit::get32(bytes, last_bin + 8) < end)
         last_bin += testkit::get32(bytes, last_bin + 8);
-    for (size_t length = last_bin; length < end; length++)
+    for (size_t length = last_bin; length < end; length += bytes_between_cuts)
         survive(hive, length, tally);
     std::printf("%s: cut %zu times, opens at %zu of them\n", name.c_str(), tally.cuts, tally.open);
     if (tally.changes < tally.open)
         std::printf("[ LEFT OUT ] a change at %zu of these\n", tally.open - tally.changes);
-    EXPECT_GT(tally.cuts, 4000U);
+    EXPECT_GT(tally.cuts, 4000U / bytes_between_cuts);
     EXPECT_GE(tally.compared, tally.open / compared_stride);  // the root key alone where its list is cut
 }
 

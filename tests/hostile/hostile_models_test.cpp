@@ -453,4 +453,4 @@ private:
 };
 
 QTEST_MAIN(HostileModelsTest)
-#include "models_test.moc"
+#include "hostile_models_test.moc"
