@@ -7,6 +7,6 @@
 class QDialog;
 class QWidget;
 
-// Makes a dialog that has its layout 360 pixels wide and just as high as its contents need, a height that stays, and
-// gives the keyboard to one of its widgets.
+// Makes a dialog whose layout is set 360 pixels wide, and as high as its contents need and no higher, and gives the
+// keyboard to one of its widgets.
 void make_compact(QDialog& dialog, QWidget& focused);

@@ -32,8 +32,8 @@ void say_unreadable(QStyleOptionViewItem& option) {
 }  // namespace
 
 NameDelegate::NameDelegate(QWidget* main_window) : main_window_(main_window) {
-    until_told_.setSingleShot(true);
-    connect(&until_told_, &QTimer::timeout, this, &NameDelegate::tell_refused_names);
+    tell_timer_.setSingleShot(true);
+    connect(&tell_timer_, &QTimer::timeout, this, &NameDelegate::tell_refused_names);
 }
 
 QWidget* NameDelegate::createEditor(QWidget* parent, const QStyleOptionViewItem& option,
@@ -54,7 +54,7 @@ void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, cons
     } catch (const std::exception& failure) {
         // Told each time: the user has typed a name that is not there now.
         const QString reason = QString::fromLocal8Bit(failure.what());
-        tell_later(FailureReport::instance().told_elsewhere(key_path_for(index), reason));
+        tell_later(FailureReport::instance().mark_told(key_path_for(index), reason));
     }
 }
 
@@ -90,13 +90,13 @@ bool NameDelegate::write_back(const QWidget& editor, QAbstractItemModel& model, 
 }
 
 void NameDelegate::tell_later(const QString& text) const {
-    untold_.append(text);
-    until_told_.start(0);
+    pending_refusals_.append(text);
+    tell_timer_.start(0);
 }
 
 void NameDelegate::tell_refused_names() const {
-    while (!untold_.isEmpty()) {
-        tell_failure(main_window_, untold_.takeFirst());
+    while (!pending_refusals_.isEmpty()) {
+        tell_failure(main_window_, pending_refusals_.takeFirst());
     }
 }
 

@@ -45,8 +45,8 @@ private:
     void tell_later(const QString& text) const;
 
     QWidget* main_window_;
-    mutable QStringList untold_;
-    mutable QTimer until_told_;
+    mutable QStringList pending_refusals_;
+    mutable QTimer tell_timer_;
 };
 
 class ValueDelegate : public NameDelegate {

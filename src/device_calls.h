@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: MIT
 //
 // The engine's callbacks over a QIODevice, which is what device points to. They return bytes moved, or the position
-// reached; -1 for a failure, and for what 31 bits cannot say.
+// reached; -1 for a failure, and for a number that int32_t does not hold.
 #pragma once
 
 #include <cstdint>

@@ -14,7 +14,6 @@
 #include <QRegularExpressionValidator>
 #include <QVBoxLayout>
 
-#include <cstdio>
 #include <limits>
 
 namespace {
@@ -89,46 +88,24 @@ void EditNumberDialog::mode_changed(bool hex) {
 
 EditDwordDialog::EditDwordDialog(const QString& value_name) : EditNumberDialog(value_name, 32) {}
 
-void EditDwordDialog::set_value(quint32 number) {
-    char text[16];
-    std::snprintf(text, sizeof text, "%x", number);
-    data_edit->setText(QString::fromLatin1(text));
-}
+void EditDwordDialog::set_value(quint32 number) { data_edit->setText(QString::number(number, 16)); }
 
 quint32 EditDwordDialog::value() const { return data_edit->text().toUInt(nullptr, base()); }
 
 void EditDwordDialog::convert_text(int from_base, int to_base) {
-    const quint32 number = data_edit->text().toUInt(nullptr, from_base);
-    char text[16];
-    if (to_base == 16) {
-        std::snprintf(text, sizeof text, "%x", number);
-    } else if (to_base == 10) {
-        std::snprintf(text, sizeof text, "%u", number);
-    } else {
-        return;
+    if (to_base == 16 || to_base == 10) {
+        data_edit->setText(QString::number(data_edit->text().toUInt(nullptr, from_base), to_base));
     }
-    data_edit->setText(QString::fromLatin1(text));
 }
 
 EditQwordDialog::EditQwordDialog(const QString& value_name) : EditNumberDialog(value_name, 64) {}
 
-void EditQwordDialog::set_value(quint64 number) {
-    char text[32];
-    std::snprintf(text, sizeof text, "%llx", number);
-    data_edit->setText(QString::fromLatin1(text));
-}
+void EditQwordDialog::set_value(quint64 number) { data_edit->setText(QString::number(number, 16)); }
 
 quint64 EditQwordDialog::value() const { return data_edit->text().toULongLong(nullptr, base()); }
 
 void EditQwordDialog::convert_text(int from_base, int to_base) {
-    const quint64 number = data_edit->text().toULongLong(nullptr, from_base);
-    char text[32];
-    if (to_base == 16) {
-        std::snprintf(text, sizeof text, "%llx", number);
-    } else if (to_base == 10) {
-        std::snprintf(text, sizeof text, "%llu", number);
-    } else {
-        return;
+    if (to_base == 16 || to_base == 10) {
+        data_edit->setText(QString::number(data_edit->text().toULongLong(nullptr, from_base), to_base));
     }
-    data_edit->setText(QString::fromLatin1(text));
 }

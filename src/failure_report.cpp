@@ -34,6 +34,7 @@ void FailureReport::report(const QString& key_path, const std::exception& failur
 void FailureReport::report_row(const QString& key_path, const std::exception& failure) {
     const QString reason = reason_of(failure);
     int& told = rows_told_[{key_path.left(key_path.lastIndexOf(QLatin1Char('\\'))), reason}];
+    // Rows that join a box still to come are counted in its last line.
     if (told_.contains({key_path, reason}) || (told >= max_lines && pending_.isEmpty())) {
         return;
     }
@@ -45,14 +46,14 @@ void FailureReport::tell_once(const QString& key_path, const QString& reason) {
     if (told_.contains({key_path, reason})) {
         return;
     }
-    pending_.append(told_elsewhere(key_path, reason));
+    pending_.append(mark_told(key_path, reason));
     if (!scheduled_) {
         scheduled_ = true;
         QMetaObject::invokeMethod(this, &FailureReport::show_pending, Qt::QueuedConnection);
     }
 }
 
-QString FailureReport::told_elsewhere(const QString& key_path, const QString& reason) {
+QString FailureReport::mark_told(const QString& key_path, const QString& reason) {
     told_.insert({key_path, reason});
     return key_path.isEmpty() ? tr("The registry cannot be read: %1").arg(reason)
                               : tr("The key \"%1\" cannot be read: %2").arg(key_path, reason);
@@ -100,7 +101,7 @@ void meet_failures(QWidget* parent, const QString& key_path, const std::function
     try {
         gesture();
     } catch (const std::exception& failure) {
-        tell_failure(parent, FailureReport::instance().told_elsewhere(key_path, reason_of(failure)));
+        tell_failure(parent, FailureReport::instance().mark_told(key_path, reason_of(failure)));
     }
 }
 

@@ -40,8 +40,8 @@ public:
     // is about no key below theirs.
     void report_at_shown(const std::exception& failure);
 
-    // The line for a key that the caller tells about itself, in a box of its own; it is not told here again.
-    QString told_elsewhere(const QString& key_path, const QString& reason);
+    // Marks a cause as told and gives its line, for a caller that tells it in a box of its own.
+    QString mark_told(const QString& key_path, const QString& reason);
 
     // What a key throws from here on is told again.
     void forget(const QString& key_path);

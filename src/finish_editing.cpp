@@ -56,7 +56,7 @@ void finish_editing(const QWidget& part) {
     }
 }
 
-bool may_change_rows(const QWidget& part) {
+bool end_editing_before_change(const QWidget& part) {
     if (QApplication::activeModalWidget()) {
         return false;
     }

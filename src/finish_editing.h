@@ -17,4 +17,4 @@ void finish_editing(const QWidget& part);
 // What a command that changes rows asks first: false while a dialog is open, which a screen reader can press menu
 // items behind; else the editors in the whole window of `part` are finished, and false when the window was left
 // meanwhile.
-bool may_change_rows(const QWidget& part);
+bool end_editing_before_change(const QWidget& part);

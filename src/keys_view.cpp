@@ -83,7 +83,7 @@ bool KeysView::event(QEvent* event) {
     if (!is_menu_key(*event) || !currentIndex().isValid()) {
         return QTreeView::event(event);
     }
-    if (may_change_rows(*this)) {
+    if (end_editing_before_change(*this)) {
         meet_failures(this, key_path_of(currentIndex()), [this] {
             show_current();
             ask_for_menu_over_current(*this);
@@ -98,7 +98,7 @@ QItemSelectionModel::SelectionFlags KeysView::selectionCommand(const QModelIndex
 
 void KeysView::show_keys_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
-    if (std::exchange(menu_is_stale_, false) || !may_change_rows(*this)) {
+    if (std::exchange(menu_is_stale_, false) || !end_editing_before_change(*this)) {
         return;
     }
     const QModelIndex index = indexAt(point);
@@ -115,7 +115,7 @@ void KeysView::show_keys_context_menu(QPoint point) {
 
 void KeysView::run_new_key_action(bool /*checked*/) {
     auto* keys = qobject_cast<RegModel*>(model());
-    if (keys && may_change_rows(*this) && currentIndex().isValid()) {
+    if (keys && end_editing_before_change(*this) && currentIndex().isValid()) {
         meet_failures(this, key_path_of(currentIndex()), [&] { make_key(*keys); });
     }
 }
@@ -135,7 +135,7 @@ void KeysView::make_key(RegModel& keys) {
 
 void KeysView::run_delete_key_action(bool /*checked*/) {
     // The values table answers the same action.
-    if (hasFocus() && model() && may_change_rows(*this)) {
+    if (hasFocus() && model() && end_editing_before_change(*this)) {
         meet_failures(this, key_path_of(currentIndex()), [this] { delete_key(); });
     }
 }
@@ -184,7 +184,7 @@ bool KeysView::confirm_remove() {
 }
 
 void KeysView::run_rename_key_action(bool /*checked*/) {
-    if (!hasFocus() || !may_change_rows(*this)) {
+    if (!hasFocus() || !end_editing_before_change(*this)) {
         return;
     }
     const QModelIndex current = currentIndex();

@@ -62,7 +62,7 @@ MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
     connect(qApp, &QCoreApplication::aboutToQuit, this, &MainWindow::end_search);
     connect(qApp, &QCoreApplication::aboutToQuit, this, [this] { finish_editing(*this); });
     // Later: the table is told of other rows when it has done asking for these.
-    connect(values_table, &ValuesView::asked_in_vain, this, &MainWindow::let_go_of_lost_key, Qt::QueuedConnection);
+    connect(values_table, &ValuesView::row_count_failed, this, &MainWindow::let_go_of_lost_key, Qt::QueuedConnection);
     make_menus();
     menuBar()->installEventFilter(this);
     statusBar()->installEventFilter(this);
@@ -105,14 +105,7 @@ void MainWindow::make_menus() {
     connect(exit_action, &QAction::triggered, qApp, &QCoreApplication::quit);
 
     QMenu* edit_menu = menuBar()->addMenu(tr("&Edit", "menu title"));
-    QMenu* new_menu = edit_menu->addMenu(tr("&New", "menu title"));
-    new_menu->addAction(actions.new_key_action);
-    new_menu->addSeparator();
-    for (QAction* action :
-         {actions.new_string_action, actions.new_binary_action, actions.new_dword_action, actions.new_qword_action,
-          actions.new_multi_string_action, actions.new_expand_string_action}) {
-        new_menu->addAction(action);
-    }
+    add_new_actions(*edit_menu->addMenu(tr("&New", "menu title")));
     edit_menu->addSeparator();
     edit_menu->addAction(actions.delete_action);
     edit_menu->addAction(actions.rename_action);
@@ -261,7 +254,7 @@ void MainWindow::value_selected(const QModelIndex& current, const QModelIndex& /
 }
 
 void MainWindow::refresh_views() {
-    if (!may_change_rows(*this)) {
+    if (!end_editing_before_change(*this)) {
         return;
     }
     if (!values_proxy->has_key() && keys_tree->currentIndex().isValid()) {

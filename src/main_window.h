@@ -62,7 +62,7 @@ private:
     void set_values_source(RegKey* key);
     void let_go_of_lost_key();
     void set_key_actions(const QModelIndex& key);
-    void start_search(const QModelIndex& start, const QString& term);
+    void start_search(const QModelIndex& start);
     void show_hit(const RegModel::FindResult& hit);
     void end_search();
 

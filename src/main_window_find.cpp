@@ -38,7 +38,7 @@ QString failure_of(QFuture<RegModel::FindResult> future) {
 }  // namespace
 
 void MainWindow::show_find_dialog() {
-    if (!may_change_rows(*this)) {
+    if (!end_editing_before_change(*this)) {
         return;
     }
     FindRequest request{find_term, find_mode, find_flags};
@@ -48,29 +48,29 @@ void MainWindow::show_find_dialog() {
     find_flags = request.flags;
     find_mode = request.mode;
     find_term = request.term;
-    start_search(key_model ? key_model->index(0, 0) : QModelIndex(), find_term);
+    start_search(key_model ? key_model->index(0, 0) : QModelIndex());
 }
 
 void MainWindow::find_next() {
     if (can_find_next) {
-        start_search(QModelIndex(), find_term);
+        start_search(QModelIndex());
     } else {
         show_find_dialog();
     }
 }
 
-// An invalid start goes on where the model's last search stopped.
-void MainWindow::start_search(const QModelIndex& start, const QString& term) {
+// Searches as was asked for last. An invalid start goes on where the model's last search stopped.
+void MainWindow::start_search(const QModelIndex& start) {
     // First of all: the search's dialog would take the keyboard from an open editor, and its commit would change the
     // tree under the worker's feet.
-    if (!key_model || !may_change_rows(*this)) {
+    if (!key_model || !end_editing_before_change(*this)) {
         return;
     }
     if (start.isValid()) {
         key_model->begin_find(start);
         can_find_next = true;
     }
-    find_future = QtConcurrent::run(&RegModel::find, key_model.data(), QVariant(term), find_mode, find_flags);
+    find_future = QtConcurrent::run(&RegModel::find, key_model.data(), QVariant(find_term), find_mode, find_flags);
     find_watcher.setFuture(find_future);
     search_dialog = make_searching_dialog(this);
     // Once it has run, the dialog is gone.
@@ -106,7 +106,7 @@ void MainWindow::show_find_result() {
     if (!failure.isEmpty()) {
         // "Find next" goes on behind the key that threw.
         const QString key_path = key_model ? key_path_of(key_model->searched_key()) : QString();
-        const QString line = FailureReport::instance().told_elsewhere(key_path, failure);
+        const QString line = FailureReport::instance().mark_told(key_path, failure);
         tell_failure(this, tr("The search could not go on: %1").arg(line));
         return;
     }

@@ -56,7 +56,7 @@ RegHive::Dialogue::~Dialogue() {
 }
 
 RegHive::RegHive(const QString& name, const QString& path, AbstractRegKey* parent)
-    : name_(name), file_(path), handle_cache_(most_handles), io_(std::make_unique<RegistryIo>()) {
+    : name_(name), file_(path), handle_cache_(most_handles) {
     open_file();
     try {
         load();
@@ -107,8 +107,8 @@ void RegHive::warn_if_dirty() {
 }
 
 void RegHive::load() {
-    *io_ = {static_cast<QIODevice*>(&file_), seek_device, read_device, write_device};
-    root_handle_ = ROpenHive(io_.get());
+    const RegistryIo io = {static_cast<QIODevice*>(&file_), seek_device, read_device, write_device};
+    root_handle_ = ROpenHive(&io);
     if (root_handle_ == nullptr)
         throw std::runtime_error("Cannot load hive");
 }

@@ -15,7 +15,6 @@
 class AbstractRegKey;
 class RegHive;
 class RegKey;
-struct RegistryIo;
 struct RegistryKey;
 
 // Owns one engine handle; closes it under the hive's lock.
@@ -93,9 +92,9 @@ private:
     std::recursive_mutex api_mutex_;    // around every call into the engine for this hive
     std::recursive_mutex cache_mutex_;  // around every use of handle_cache_
     QCache<const RegKey*, KeyHandleHolder> handle_cache_;
-    std::map<uint32_t, int> freed_;  // cells that keys have left, each with how often one had by then
+    std::map<uint32_t, int>
+        freed_;  // by cell offset (bytes, as RKeyOffset): times_freed_ when a key left the cell last
     int times_freed_ = 0;
-    std::unique_ptr<RegistryIo> io_;
     std::unique_ptr<RegKey> root_;
     RegistryKey* root_handle_ = nullptr;
 };

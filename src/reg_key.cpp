@@ -135,7 +135,7 @@ AbstractRegKey* RegKey::child(int i) {
     AbstractRegKey*& slot = laid_out()[static_cast<size_t>(i)];
     if (slot == nullptr) {
         auto made = std::make_unique<RegKey>(hive_, this, i);
-        made->number_hint(static_cast<size_t>(i));
+        made->set_number_hint(static_cast<size_t>(i));
         slot = made.release();
     }
     return slot;
@@ -147,7 +147,7 @@ AbstractRegKey* RegKey::shown_child(int i) {
         return child(i);
     } catch (const std::runtime_error&) {
         auto unopened = std::make_unique<RegKey>(hive_, this);
-        unopened->number_hint(static_cast<size_t>(i));
+        unopened->set_number_hint(static_cast<size_t>(i));
         unopened->stands_in_ = true;
         return children_[static_cast<size_t>(i)] = unopened.release();
     }
@@ -253,6 +253,8 @@ int RegKey::default_value_position() {
     }
 }
 
+// The position of the subkey of that name, one that has no slot yet included. Where neither this search nor the
+// engine's finds it: -1 if the search came upon what is no name, -2 if it ended.
 int RegKey::find_child_position(RegistryKey* handle, const QByteArray& name) {
     int result = -2;
     size_t low = 0;

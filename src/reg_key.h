@@ -41,7 +41,7 @@ public:
     // Appends a slot. The key's own link to its parent is left as it is.
     void add_child(AbstractRegKey* key);
     // Says where the parent lists this key, to spare child_number() the first search.
-    void number_hint(size_t number) { number_hint_ = number; }
+    void set_number_hint(size_t number) { number_hint_ = number; }
 
 protected:
     explicit AbstractRegKey(AbstractRegKey* parent) : parent_(parent) {}
@@ -81,7 +81,8 @@ public:
     AbstractRegKey* shown_child(int i) override;
     bool is_below_itself() const override;
 
-    // Brings the number of slots up to the engine's count. Surplus objects are dropped from the list, not deleted.
+    // Brings the number of slots up to the engine's count. Surplus objects are dropped from the list, not deleted:
+    // views may still have indexes to them, and nothing frees them any more.
     void reload();
     int value_count();
     // The position of the unnamed value, -1 when there is none.
@@ -114,14 +115,18 @@ public:
     bool set_dword_value(const QString& name, uint value, int order, int index = any_value);
     bool set_qword_value(const QString& name, qulonglong value, int index = any_value);
     bool set_multi_string_value(const QString& name, const QStringList& list, int index = any_value);
+    // false: no name leads to this value alone, or the engine refused.
     bool delete_value(int index);
     // Whether its name leads to the value at the index, so that it can be deleted. Changes nothing.
     bool can_delete_value(int index);
+    // Stores the value under the new name, at the end of the list, and deletes the old one. false: refused (an empty or
+    // used name, one above 16,383 characters or that 8 bits cannot carry, data that cannot be read), or a step failed:
+    // the value may then stand under both names.
     bool rename_value(int index, const QString& new_name);
     // "New Value #%i" with the lowest number that no value has; null when the engine cannot say.
     QString new_value_name();
 
-    static constexpr int any_value = -1;
+    static constexpr int any_value = -1;  // whichever has the name, or a new one
     static constexpr int new_value = -2;
 
     RegHive* hive() const { return hive_; }
@@ -150,7 +155,7 @@ private:
     // lists at this object's place is only taken for its key when it lies there.
     uint32_t offset_ = UINT32_MAX;
     bool stands_in_ = false;  // for a key that could not be opened when its row was shown, see shown_child
-    int freed_before_ = 0;    // how many cells keys had left when the offset was learnt
+    int freed_before_ = 0;  // the hive's times_freed_ when the offset was learnt: a later one of its cell means it left
 };
 
 // A named group with no hive behind it: the first part of a mount name.

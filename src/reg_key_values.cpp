@@ -150,7 +150,7 @@ QByteArray name_leading_to(RegistryKey* handle, int index) {
     return text.fits && RFindValueA(handle, text.bytes.constData()) == index ? text.bytes : QByteArray();
 }
 
-// Whether no value of the key has a name, and every record could be asked for its own.
+// Whether no value of the key has this name, and every record could be asked for its own.
 bool is_surely_free(RegistryKey* handle, const char* name) {
     if (RQueryValueExA(handle, name, nullptr, nullptr, nullptr) == R_FILE_NOT_FOUND)
         return true;

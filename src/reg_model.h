@@ -18,6 +18,8 @@ class RegKey;
 
 // Every index carries its key object as internal pointer, in column 0. Depths are fixed: groups, hive roots below them,
 // keys below those. Keys are renamed and deleted from depth 4 on, and get new subkeys and show values from depth 3 on.
+// data(), the changes and the search throw std::runtime_error where a key cannot be opened. Who meets that:
+// docs/architecture.md.
 class RegModel : public QAbstractItemModel {
     Q_OBJECT
 
@@ -55,7 +57,7 @@ public:
     // Makes a subkey; returns its row. -1: no parent; -2: not under this one; -3: refused.
     int new_key(const QModelIndex& parent);
 
-    // The key behind an index at depth 3 or more, else null.
+    // The key behind an index at depth 3 or more, else null. One more level than those that flags() lets rename.
     static RegKey* editable_key(const QModelIndex& index);
 
     // How many keys the hives have room for. More are met only where a damaged hive lists some again and again.
@@ -113,12 +115,12 @@ private:
     bool stop_ = false;
     // How far the search may still go in a hive. A damaged one can list keys and values more often than the file has
     // room for them; what its size allows bounds the walk.
-    struct WayLeft {
+    struct Budget {
         qint64 keys;     // to visit
         qint64 subkeys;  // of the keys that are gone down into
         qint64 values;   // of the keys whose values are visited
     };
-    std::map<const RegHive*, WayLeft> way_left_;
+    std::map<const RegHive*, Budget> budgets_;
 };
 
 Q_DECLARE_OPERATORS_FOR_FLAGS(RegModel::FindMode)

@@ -45,7 +45,7 @@ bool take(std::multiset<QString>& names, const QString& name) {
     return true;
 }
 
-// Passes a lock where one thread leaves data to another.
+// Takes the lock for a moment at either end of a call, so that each thread sees what the other one wrote before.
 class HandOver {
 public:
     explicit HandOver(QMutex* mutex) : mutex_(mutex) { const QMutexLocker locker(mutex_); }
@@ -70,10 +70,10 @@ void RegModel::begin_find(const QModelIndex& start) {
     value_names_.clear();
     if (start.isValid())
         search_.push_back({start, with_siblings});
-    way_left_.clear();
+    budgets_.clear();
     for (const auto& hive : hives_) {
         const qint64 most = most_keys_in(*hive);
-        way_left_[hive.get()] = {2 * most, most, 2 * hive->file_size() / smallest_value};
+        budgets_[hive.get()] = {2 * most, most, 2 * hive->file_size() / smallest_value};
     }
     // Last, so that the lock hands the stack over to the worker as well.
     const QMutexLocker locker(&mutex_);
@@ -104,8 +104,8 @@ bool RegModel::push_key_frames(const Frame& frame, FindMode mode) {
     const auto* const in_hive = dynamic_cast<const RegKey*>(visited);
     bool goes_on = true;
     bool goes_down = !visited->is_below_itself();
-    WayLeft* const left = in_hive != nullptr ? &way_left_[in_hive->hive()] : nullptr;
-    const WayLeft left_before = left != nullptr ? *left : WayLeft();
+    Budget* const left = in_hive != nullptr ? &budgets_[in_hive->hive()] : nullptr;
+    const Budget left_before = left != nullptr ? *left : Budget();
     if (left != nullptr) {
         left->keys--;
         left->subkeys -= in_hive->child_count();
@@ -127,7 +127,7 @@ bool RegModel::push_key_frames(const Frame& frame, FindMode mode) {
     // Read and sorted once for all of the key's values.
     auto names = shown_value_names(*key, ValuesModel::default_name(), [this] { return is_stopped(); });
     if (!names.has_value()) {
-        search_.resize(frames_before, frame);
+        search_.erase(search_.begin() + static_cast<std::ptrdiff_t>(frames_before), search_.end());
         search_.push_back(frame);
         *left = left_before;
         return false;
@@ -231,7 +231,7 @@ RegModel::FindResult RegModel::find(const QVariant& term, RegModel::FindMode mod
 }
 
 QModelIndex RegModel::searched_key() {
-    const HandOver hand_over(&mutex_);
+    const QMutexLocker locker(&mutex_);
     return searched_;
 }
 

@@ -6,6 +6,7 @@
 #include <QActionGroup>
 #include <QCoreApplication>
 #include <QKeySequence>
+#include <QMenu>
 
 namespace {
 
@@ -39,4 +40,15 @@ SharedActions make_actions() {
 const SharedActions& shared_actions() {
     static const SharedActions the_actions = make_actions();
     return the_actions;
+}
+
+void add_new_actions(QMenu& menu) {
+    const SharedActions& actions = shared_actions();
+    menu.addAction(actions.new_key_action);
+    menu.addSeparator();
+    for (QAction* action :
+         {actions.new_string_action, actions.new_binary_action, actions.new_dword_action, actions.new_qword_action,
+          actions.new_multi_string_action, actions.new_expand_string_action}) {
+        menu.addAction(action);
+    }
 }

@@ -6,6 +6,7 @@
 
 class QAction;
 class QActionGroup;
+class QMenu;
 
 struct SharedActions {
     QAction* new_key_action;
@@ -23,3 +24,6 @@ struct SharedActions {
 // The process's set, made by the first call, in the language of that moment, and never freed. Nothing is selected
 // then, so all of it starts disabled.
 const SharedActions& shared_actions();
+
+// Puts the actions that make a key or value into a menu, in the order that both menus have.
+void add_new_actions(QMenu& menu);

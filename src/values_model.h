@@ -15,6 +15,8 @@
 
 class RegKey;
 
+// Whatever asks the key throws, rowCount() too: std::runtime_error where the key cannot be opened,
+// std::invalid_argument("index") where a value's record cannot be read. Who meets that: docs/architecture.md.
 class ValuesModel : public QAbstractTableModel {
     Q_OBJECT
 

@@ -14,6 +14,7 @@ class RegKey;
 
 // When the key has no unnamed value, row 0 is made up for it; every other row maps to a source row. Positions behind
 // the sorted ones (values added since) map to themselves, which keeps a new value at the bottom until the next sort.
+// Throws what its source and the key throw, setSourceModel() and rowCount() too.
 class ValuesProxyModel : public QAbstractProxyModel {
     Q_OBJECT
 

@@ -101,7 +101,7 @@ void ValuesView::size_columns(int old_count, int new_count) {
 }
 
 void ValuesView::value_double_clicked(QModelIndex index) {
-    if (!index.isValid() || !model() || index.column() != name_column || !may_change_rows(*this)) {
+    if (!index.isValid() || !model() || index.column() != name_column || !end_editing_before_change(*this)) {
         return;
     }
     meet_failures(this, FailureReport::instance().shown_key(), [&] { edit_value(index); });
@@ -209,7 +209,7 @@ bool ValuesView::event(QEvent* event) {
     if (!is_menu_key(*event) || !currentIndex().isValid()) {
         return QTableView::event(event);
     }
-    if (may_change_rows(*this)) {
+    if (end_editing_before_change(*this)) {
         meet_failures(this, FailureReport::instance().shown_key(), [this] {
             show_current();
             ask_for_menu_over_current(*this);
@@ -224,7 +224,7 @@ QItemSelectionModel::SelectionFlags ValuesView::selectionCommand(const QModelInd
 
 void ValuesView::show_values_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
-    if (!may_change_rows(*this)) {
+    if (!end_editing_before_change(*this)) {
         return;
     }
     const SharedActions& actions = shared_actions();
@@ -240,21 +240,14 @@ void ValuesView::show_values_context_menu(QPoint point) {
         }
         return;
     }
-    QMenu* new_menu = menu.addMenu(tr("New", "menu title"));
-    new_menu->addAction(actions.new_key_action);
-    new_menu->addSeparator();
-    for (QAction* action :
-         {actions.new_string_action, actions.new_binary_action, actions.new_dword_action, actions.new_qword_action,
-          actions.new_multi_string_action, actions.new_expand_string_action}) {
-        new_menu->addAction(action);
-    }
+    add_new_actions(*menu.addMenu(tr("New", "menu title")));
     menu.exec(viewport()->mapToGlobal(point));
 }
 
 void ValuesView::run_new_value_action(QAction* action) {
     auto* values = qobject_cast<ValuesProxyModel*>(model());
     const int type = type_created_by(action);
-    if (values && type >= 0 && values->has_key() && may_change_rows(*this)) {
+    if (values && type >= 0 && values->has_key() && end_editing_before_change(*this)) {
         meet_failures(this, FailureReport::instance().shown_key(), [&] { make_value(*values, type); });
     }
 }
@@ -278,7 +271,7 @@ void ValuesView::make_current(const QModelIndex& index) {
 
 void ValuesView::run_delete_value_action(bool /*checked*/) {
     // The key tree answers the same action.
-    if (hasFocus() && model() && may_change_rows(*this)) {
+    if (hasFocus() && model() && end_editing_before_change(*this)) {
         meet_failures(this, FailureReport::instance().shown_key(), [this] { delete_value(); });
     }
 }
@@ -336,7 +329,7 @@ void ValuesView::delete_value() {
 }
 
 void ValuesView::run_rename_value_action(bool /*checked*/) {
-    if (!hasFocus() || !may_change_rows(*this)) {
+    if (!hasFocus() || !end_editing_before_change(*this)) {
         return;
     }
     const QModelIndex current = currentIndex();
@@ -350,8 +343,9 @@ void ValuesView::run_rename_value_action(bool /*checked*/) {
     });
 }
 
-// Asked before a paint, which asks for rows and flags where an exception would leave its painter open.
-bool ValuesView::can_ask() {
+// Before a paint, which asks for rows and flags where an exception would leave its painter open. false: the key does
+// not say how many values it has, which is reported.
+bool ValuesView::check_key() {
     try {
         if (model()) {
             model()->rowCount();
@@ -359,13 +353,13 @@ bool ValuesView::can_ask() {
         return true;
     } catch (const std::exception& failure) {
         FailureReport::instance().report_at_shown(failure);
-        emit asked_in_vain();
+        emit row_count_failed();
         return false;
     }
 }
 
 void ValuesView::paintEvent(QPaintEvent* event) {
-    if (!can_ask()) {
+    if (!check_key()) {
         return;
     }
     // Last net, should a read fail that has just gone well.
@@ -377,7 +371,7 @@ void ValuesView::paintEvent(QPaintEvent* event) {
 }
 
 bool ValuesView::eventFilter(QObject* watched, QEvent* event) {
-    if (watched == horizontalHeader()->viewport() && event->type() == QEvent::Paint && !can_ask()) {
+    if (watched == horizontalHeader()->viewport() && event->type() == QEvent::Paint && !check_key()) {
         return true;
     }
     return QTableView::eventFilter(watched, event);

@@ -22,7 +22,7 @@ public:
 
 signals:
     // The key whose values are shown does not say how many it has: nothing was painted.
-    void asked_in_vain();
+    void row_count_failed();
 
 public slots:
     void value_double_clicked(QModelIndex index);
@@ -45,7 +45,7 @@ private:
     void make_current(const QModelIndex& index);
     void show_current();
     int row_of(const QString& name, int row) const;
-    bool can_ask();
+    bool check_key();
     void make_value(ValuesProxyModel& values, int type);
     void delete_value();
     QString cut_text(const QModelIndex& index) const;

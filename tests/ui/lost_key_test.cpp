@@ -62,7 +62,7 @@ void forget_everything(const Stage& stage) {
 
 // The key cannot be read any more. What its row in the tree throws has been told.
 void lose_alpha(const Stage& stage, Scene& scene) {
-    FailureReport::instance().told_elsewhere(row_of_alpha, QStringLiteral("ROpenSubKey failed"));
+    FailureReport::instance().mark_told(row_of_alpha, QStringLiteral("ROpenSubKey failed"));
     scene.damage_key("Alpha");
     forget_everything(stage);
 }
@@ -195,7 +195,7 @@ private slots:
         for (QWidget* part : {header, stage.values->viewport()}) {
             lose_alpha(stage, scene);
             // No box: what one covers is painted again for it.
-            FailureReport::instance().told_elsewhere(alpha, QStringLiteral("ROpenSubKey failed"));
+            FailureReport::instance().mark_told(alpha, QStringLiteral("ROpenSubKey failed"));
             part->repaint();
             put_back(scene, sound);
             forget_everything(stage);
