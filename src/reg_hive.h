@@ -92,8 +92,8 @@ private:
     std::recursive_mutex api_mutex_;    // around every call into the engine for this hive
     std::recursive_mutex cache_mutex_;  // around every use of handle_cache_
     QCache<const RegKey*, KeyHandleHolder> handle_cache_;
-    std::map<uint32_t, int>
-        freed_;  // by cell offset (bytes, as RKeyOffset): times_freed_ when a key left the cell last
+    // By cell offset (bytes, as RKeyOffset): times_freed_ when a key left that cell last.
+    std::map<uint32_t, int> freed_;
     int times_freed_ = 0;
     std::unique_ptr<RegKey> root_;
     RegistryKey* root_handle_ = nullptr;
