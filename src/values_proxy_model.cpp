@@ -191,16 +191,15 @@ bool ValuesProxyModel::make_default(const QModelIndex& index, const QVariant& va
 
 // A key that could not be read whole when it was asked for its unnamed value may have one all the same: the made-up row
 // goes then.
-void ValuesProxyModel::give_way_to_default() {
-    if (!synthetic_default_)
-        return;
-    const int position = key()->default_value_position();
+bool ValuesProxyModel::give_way_to_default() {
+    const int position = synthetic_default_ ? key()->default_value_position() : -1;
     if (position < 0)
-        return;
+        return false;
     beginRemoveRows(QModelIndex(), 0, 0);
     synthetic_default_ = false;
     unnamed_ = position;
     endRemoveRows();
+    return true;
 }
 
 int ValuesProxyModel::rows_now(int otherwise) const {
@@ -219,6 +218,7 @@ bool ValuesProxyModel::change_source(const std::function<bool()>& change) {
         const int now = rows_now(rows);
         if (now > rows) {
             beginInsertRows(QModelIndex(), rows, now - 1);
+            // A later rename counts with them: they are not sorted, and are in their own places so far.
             for (int row = rows - offset(); !mapping_.empty() && row < now - offset(); row++)
                 mapping_.push_back(row);
             endInsertRows();
@@ -331,26 +331,27 @@ void ValuesProxyModel::announce_layout() {
 }
 
 void ValuesProxyModel::sort(int, Qt::SortOrder) {
-    arrange([] {});
-    if (has_default_twice_) {
-        give_way_to_default();
+    const bool has_default_twice = arrange([] {});
+    if (has_default_twice && give_way_to_default())
         arrange([] {});
-    }
 }
 
-void ValuesProxyModel::arrange(const std::function<void()>& move_indexes) {
+bool ValuesProxyModel::arrange(const std::function<void()>& move_indexes) {
     emit layoutAboutToBeChanged();
+    bool has_default_twice = false;
     try {
-        order_rows();
+        has_default_twice = order_rows();
         move_indexes();
     } catch (...) {
         emit layoutChanged();
         throw;
     }
     emit layoutChanged();
+    return has_default_twice;
 }
 
-void ValuesProxyModel::order_rows() {
+// Whether a value reads like the made-up row: the unnamed one may not have been readable when it was asked for.
+bool ValuesProxyModel::order_rows() {
     if (auto* values = qobject_cast<ValuesModel*>(sourceModel()))
         values->forget_rows();
     const int rows = sourceModel() != nullptr ? sourceModel()->rowCount() : 0;
@@ -365,8 +366,7 @@ void ValuesProxyModel::order_rows() {
         throw;
     }
     mapping_ = rows_by_name(names, default_name_, unnamed_);
-    has_default_twice_ =
-        synthetic_default_ && !names.empty() && names[static_cast<size_t>(mapping_.front())] == default_name_;
+    return synthetic_default_ && !names.empty() && names[static_cast<size_t>(mapping_.front())] == default_name_;
 }
 
 // What the rows are called that somebody has an index of.

@@ -58,11 +58,11 @@ private:
     QVariant spoken_data(const QModelIndex& index) const;
     bool change_source(const std::function<bool()>& change);
     bool make_default(const QModelIndex& index, const QVariant& value);
-    void give_way_to_default();
+    bool give_way_to_default();
     int rows_now(int otherwise) const;  // otherwise: where the key cannot say
     void announce_layout();
-    void arrange(const std::function<void()>& move_indexes);
-    void order_rows();
+    bool arrange(const std::function<void()>& move_indexes);
+    bool order_rows();
     QHash<int, QString> names_of_held_rows() const;
     void move_held_rows(const QHash<int, QString>& names_before, int renamed, const QString& new_name);
     void note_moved_to_end(int row);
@@ -72,8 +72,6 @@ private:
     std::vector<int> mapping_;  // source row by position; empty until the first sort
     bool synthetic_default_ = false;
     int unnamed_ = -1;  // source row of the unnamed value
-    // Beside the made-up row a value reads like it. The unnamed value may not have been readable when it was asked for.
-    bool has_default_twice_ = false;
     QString default_name_;
     bool is_source_quiet_ = false;  // what the source says of its rows is not passed on
 };
