@@ -136,7 +136,8 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
         // The base class asks displayText for the text, and takes font, icon and colours from the same index.
         const QScopedValueRollback<qsizetype> cut(limit_, most + 1);
         QStyledItemDelegate::initStyleOption(option, index);
-        // Letters that take no room, line feeds among them, would hide that more follow.
+        option->text = with_visible_controls(option->text);
+        // Letters that take no room would hide that more follow.
         if (option->text.size() > most) {
             option->text = option->text.left(most) + QChar(0x2026);
         }
@@ -148,6 +149,10 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
         say_unreadable(*option);
         report_value_failure(failure);
     }
+}
+
+QString KeyDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
+    return with_visible_controls(value.toString());
 }
 
 void KeyDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {

@@ -66,7 +66,8 @@ public:
     QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override;
 
 protected:
-    // Lays out only as much of a long datum as a cell can show: painting a megabyte costs what a line costs.
+    // Lays out only as much of a long datum as a cell can show: painting a megabyte costs what a line costs. Control
+    // characters are made visible.
     void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
     QString key_path_for(const QModelIndex& index) const override;
 
@@ -81,6 +82,8 @@ class KeyDelegate : public NameDelegate {
 public:
     using NameDelegate::NameDelegate;
 
+    // The name on one line, its control characters made visible.
+    QString displayText(const QVariant& value, const QLocale& locale) const override;
     void setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const override;
 
     void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override;

@@ -3,11 +3,11 @@
 #include "edit_dialogs.h"
 
 #include "compact_dialog.h"
+#include "editor_dialog.h"
 #include "validators.h"
 
 #include <QAbstractItemModel>
 #include <QCoreApplication>
-#include <QDialog>
 #include <QDialogButtonBox>
 #include <QKeyEvent>
 #include <QLabel>
@@ -20,16 +20,6 @@
 #include <limits>
 
 namespace {
-
-// Return held down, which has opened the editor, does not answer it.
-class EditorDialog : public QDialog {
-protected:
-    void keyPressEvent(QKeyEvent* event) override {
-        if (!event->isAutoRepeat()) {
-            QDialog::keyPressEvent(event);
-        }
-    }
-};
 
 // Takes the caller's widget out of the dialog again, whatever way the dialog is left: the caller owns it, and still
 // reads it.
@@ -72,10 +62,15 @@ bool run_editor(const QString& title, const QString& value_name, QWidget* data_w
 // Registry text is longer than a line edit takes by default.
 void take_any_length(QLineEdit& edit) { edit.setMaxLength(std::numeric_limits<int>::max()); }
 
-// Shift+Return is a new line as Return is, and not a separator inside of one.
+// Shift+Return is a new line as Return is, and not a separator inside of one. A key that was held down before, as the
+// Return that has opened the editor, types nothing.
 class LinesEdit : public QTextEdit {
 protected:
     void keyPressEvent(QKeyEvent* event) override {
+        was_pressed_ = was_pressed_ || !event->isAutoRepeat();
+        if (!was_pressed_) {
+            return;
+        }
         if (event->matches(QKeySequence::InsertLineSeparator)) {
             textCursor().insertBlock();
             ensureCursorVisible();
@@ -83,6 +78,9 @@ protected:
             QTextEdit::keyPressEvent(event);
         }
     }
+
+private:
+    bool was_pressed_ = false;
 };
 
 // A text ends at its first zero, and what is behind one would never be seen again; a clipboard can hold some.
@@ -97,6 +95,34 @@ QString text_of(const QTextDocument& document, bool had_line_separators) {
         text.replace(QChar::LineSeparator, QLatin1Char('\n'));
     }
     return without_zeros(text);
+}
+
+// The lines that each string takes in the editing widget: one, or more where it has line ends inside.
+QList<QStringList> lines_of(const QStringList& strings) {
+    QTextDocument document;
+    QList<QStringList> all;
+    for (const QString& string : strings) {
+        document.setPlainText(string);
+        all.append(text_of(document, true).split(QLatin1Char('\n')));
+    }
+    return all;
+}
+
+// A string for each line. At the head and at the tail, as far as the lines stand there as they were shown, the strings
+// that they were shown for: not all characters survive the widget.
+QStringList strings_of(const QStringList& lines, const QStringList& data, const QList<QStringList>& shown) {
+    qsizetype head = 0;
+    qsizetype first = 0;
+    while (head < data.size() && lines.mid(first, shown[head].size()) == shown[head]) {
+        first += shown[head++].size();
+    }
+    qsizetype tail = data.size();
+    qsizetype end = lines.size();
+    while (tail > head && end - shown[tail - 1].size() >= first &&
+           lines.mid(end - shown[tail - 1].size(), shown[tail - 1].size()) == shown[tail - 1]) {
+        end -= shown[--tail].size();
+    }
+    return data.mid(0, head) + lines.mid(first, end - first) + data.mid(tail);
 }
 
 }  // namespace
@@ -135,15 +161,20 @@ bool edit_multi_string(QAbstractItemModel& model, const QString& value_name, con
     LinesEdit edit;
     edit.setAcceptRichText(false);
     edit.setTabChangesFocus(true);
+    // A line that is seen is a line.
+    edit.setLineWrapMode(QTextEdit::NoWrap);
     // Plain text, and not line by line: what looks like markup is data, and so is an empty first line.
-    const QString given = data.join(QLatin1Char('\n'));
+    const QList<QStringList> shown = lines_of(data);
+    QStringList lines;
+    for (const QStringList& of_one : shown) {
+        lines += of_one;
+    }
+    const QString given = lines.join(QLatin1Char('\n'));
     edit.setPlainText(given);
-    edit.document()->setModified(false);
     if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Multi-String", "dialog title"), value_name,
                     &edit)) {
         return true;
     }
     const QString text = text_of(*edit.document(), given.contains(QChar::LineSeparator));
-    const bool untouched = !edit.document()->isModified() && !data.isEmpty();
-    return model.setData(data_index, untouched ? data : text.split(QLatin1Char('\n')), Qt::DisplayRole);
+    return model.setData(data_index, strings_of(text.split(QLatin1Char('\n')), data, shown), Qt::DisplayRole);
 }

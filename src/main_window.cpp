@@ -6,6 +6,7 @@
 #include "finish_editing.h"
 #include "keys_view.h"
 #include "shared_actions.h"
+#include "value_text.h"
 #include "values_model.h"
 #include "values_proxy_model.h"
 #include "values_view.h"
@@ -50,7 +51,7 @@ MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
     status_label->setMinimumWidth(1);
     // Key names are data: what looks like markup in one is shown as it is.
     status_label->setTextFormat(Qt::PlainText);
-    // Of a name with line feeds in it the first line shows.
+    // Whatever letters a name has, the bar keeps its height.
     status_label->setAlignment(Qt::AlignLeft | Qt::AlignTop);
     statusBar()->addWidget(status_label, 0);
     connect(values_table, &QAbstractItemView::activated, this,
@@ -155,7 +156,7 @@ void MainWindow::set_model(RegModel* model) {
 void MainWindow::show_status(const QModelIndex& key) {
     const QString path = key_path_of(key);
     status_label->setMaximumHeight(status_label->fontMetrics().height());
-    status_label->setText(path);
+    status_label->setText(with_visible_controls(path));
     // Made into a paragraph here, so that the tip takes no name for markup.
     status_label->setToolTip(path.isEmpty() ? path : Qt::convertFromPlainText(path));
     FailureReport::instance().set_shown_key(path);

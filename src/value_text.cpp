@@ -67,4 +67,17 @@ QString value_text(const QVariant& value, qsizetype limit) {
     return value.toString();
 }
 
+QString with_visible_controls(QString text) {
+    for (QChar& c : text) {
+        if (c == QChar::LineFeed || c == QChar::LineSeparator || c == QChar::ParagraphSeparator) {
+            c = QChar(0x21b5);
+        } else if (c == QChar::CarriageReturn) {
+            c = QChar(0x2190);
+        } else if (c != QChar::Tabulation && c.category() == QChar::Other_Control) {
+            c = QChar::ReplacementCharacter;
+        }
+    }
+    return text;
+}
+
 QString unreadable_text() { return QCoreApplication::translate("KeyDelegate", "(cannot be read)"); }

@@ -380,7 +380,10 @@ bool ValuesView::eventFilter(QObject* watched, QEvent* event) {
 // The text of a cell that cuts it; of a very long one, the beginning.
 QString ValuesView::cut_text(const QModelIndex& index) const {
     constexpr qsizetype longest = 1000;
-    const QString shown = shown_text(index, longest).left(longest);
+    QString shown = shown_text(index, longest + 1);
+    if (shown.size() > longest) {
+        shown = shown.left(longest) + QChar(0x2026);
+    }
     const bool is_cut =
         shown.size() > ValueDelegate::shortest_cut || sizeHintForIndex(index).width() > columnWidth(index.column());
     return is_cut ? shown : QString();

@@ -86,6 +86,14 @@ QByteArray standard_output_of(Act act) {
     return file.readAll();
 }
 
+// A delegate that can be asked what it lays out.
+template <typename Delegate>
+class Open : public Delegate {
+public:
+    using Delegate::Delegate;
+    using Delegate::initStyleOption;
+};
+
 QVariant value_not_set() { return QVariant::fromValue(ValueNotSet{}); }
 
 }  // namespace
@@ -111,6 +119,7 @@ private slots:
     void a_megabyte_paints_like_a_kilobyte();
     void what_a_cell_shows_is_the_beginning_of_the_text_data();
     void what_a_cell_shows_is_the_beginning_of_the_text();
+    void control_characters_are_seen();
     void a_text_that_is_cut_ends_in_an_ellipsis_data();
     void a_text_that_is_cut_ends_in_an_ellipsis();
     void each_cell_has_its_own_icon();
@@ -158,10 +167,13 @@ void DelegatesTest::the_text_of_a_megabyte_is_whole() {
 
 void DelegatesTest::a_type_without_a_rule_prints_the_fallback_line() {
     const ValueDelegate delegate(nullptr);
-    QString shown;
-    QCOMPARE(standard_output_of([&] { shown = delegate.displayText(QVariant(1.5), QLocale()); }),
-             QByteArray("fallback: rendering 'double' as string\n"));
-    QCOMPARE(shown, QStringLiteral("1.5"));
+    QStringList shown;
+    const auto show_twice = [&] {
+        for (const double number : {1.5, 2.5})
+            shown.append(delegate.displayText(QVariant(number), QLocale()));
+    };
+    QCOMPARE(standard_output_of(show_twice), QByteArray("fallback: rendering 'double' as string\n").repeated(2));
+    QCOMPARE(shown, QStringList({QStringLiteral("1.5"), QStringLiteral("2.5")}));
 }
 
 void DelegatesTest::an_unchanged_name_is_not_written() {
@@ -379,6 +391,22 @@ void DelegatesTest::what_a_cell_shows_is_the_beginning_of_the_text() {
     QCOMPARE(painted(ValueDelegate(nullptr)), painted(PlainDelegate()));
 }
 
+// Two names that differ in them must not look the same.
+void DelegatesTest::control_characters_are_seen() {
+    const QString text =
+        QStringLiteral("a\nb\r\n\tc") + QChar(QChar::Null) + QStringLiteral("\u007f\u0085\u2028\u2029\u200b");
+    const QString seen = QStringLiteral("a\u21b5b\u2190\u21b5\tc\ufffd\ufffd\ufffd\u21b5\u21b5\u200b");
+    const OneDatumModel model(text);
+    QStyleOptionViewItem option;
+    option.rect = QRect(0, 0, 400, 20);
+    Open<ValueDelegate>(nullptr).initStyleOption(&option, model.index(0, 0));
+    QCOMPARE(option.text, seen);
+    Open<KeyDelegate>(nullptr).initStyleOption(&option, model.index(0, 0));
+    QCOMPARE(option.text, seen);
+    // What is copied and spoken is the text itself.
+    QCOMPARE(ValueDelegate(nullptr).displayText(text, QLocale()), text);
+}
+
 void DelegatesTest::a_text_that_is_cut_ends_in_an_ellipsis_data() {
     QTest::addColumn<QVariant>("datum");
     QTest::addColumn<qsizetype>("length");
@@ -394,15 +422,10 @@ void DelegatesTest::a_text_that_is_cut_ends_in_an_ellipsis_data() {
 void DelegatesTest::a_text_that_is_cut_ends_in_an_ellipsis() {
     QFETCH(QVariant, datum);
     QFETCH(qsizetype, length);
-    class OpenDelegate : public ValueDelegate {
-    public:
-        using ValueDelegate::initStyleOption;
-        using ValueDelegate::ValueDelegate;
-    };
     const OneDatumModel model(datum);
     QStyleOptionViewItem option;
     option.rect = QRect(0, 0, 400, 20);
-    OpenDelegate(nullptr).initStyleOption(&option, model.index(0, 0));
+    Open<ValueDelegate>(nullptr).initStyleOption(&option, model.index(0, 0));
     QCOMPARE(option.text.size(), length);
     QCOMPARE(option.text.endsWith(QChar(0x2026)), length > ValueDelegate::shortest_cut);
 }

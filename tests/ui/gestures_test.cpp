@@ -227,6 +227,7 @@ private slots:
         testkit::KeyLayout& run = layout.root.add("Run");
         run.set("feeds", 1, testkit::text_data(std::string(300, '\n') + "C:\\evil.exe"));
         run.set("short", 1, testkit::text_data("x"));
+        run.set("bytes", 3, testkit::Bytes(334, 0xab));
         const Scene scene(layout);
         Stage stage(scene);
         stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Run"));
@@ -241,6 +242,10 @@ private slots:
         QCOMPARE(tip_of("short"), QString());
         const QString tip = tip_of("feeds");
         QVERIFY2(tip.contains(QStringLiteral("C:\\evil.exe")), qPrintable(tip));
+        // One that is cut as well says so, and does not end in half a byte as if that were all.
+        QVERIFY(!tip.contains(QChar(0x2026)));
+        const QString bytes = tip_of("bytes");
+        QVERIFY2(bytes.contains(QStringLiteral("a\u2026")), qPrintable(bytes.right(30)));
     }
 
     // A tip that shows hangs below its view, as an editor does, and what leads away from the row closes editors.

@@ -45,7 +45,9 @@ class ValuesViewTest : public QObject {
 private slots:
     void the_editor_follows_the_data_data();
     void the_editor_follows_the_data();
+    void what_is_cancelled_is_not_written_data();
     void what_is_cancelled_is_not_written();
+    void an_emptied_number_is_written_as_zero();
     void data_goes_to_no_other_key_s_value_data();
     void data_goes_to_no_other_key_s_value();
     void data_that_cannot_be_edited_is_told();
@@ -136,7 +138,16 @@ void ValuesViewTest::the_editor_follows_the_data() {
     QCOMPARE(value->type, type);
 }
 
+void ValuesViewTest::what_is_cancelled_is_not_written_data() {
+    using Step = DialogHand::Step;
+    QTest::addColumn<Step>("leave");
+    QTest::newRow("Cancel") << Step([](QWidget* dialog) { press(*dialog, QDialogButtonBox::Cancel); });
+    QTest::newRow("Escape") << Step([](QWidget* dialog) { QTest::keyClick(dialog, Qt::Key_Escape); });
+    QTest::newRow("closed") << Step([](QWidget* dialog) { dialog->close(); });
+}
+
 void ValuesViewTest::what_is_cancelled_is_not_written() {
+    QFETCH(const DialogHand::Step, leave);
     const Scene scene;
     Stage stage(scene);
     stage.select_key(alpha);
@@ -145,12 +156,32 @@ void ValuesViewTest::what_is_cancelled_is_not_written() {
         DialogHand hand;
         hand.then([&](QWidget* dialog) {
             QTest::keyClicks(QApplication::focusWidget(), QStringLiteral("1"));
-            press(*dialog, QDialogButtonBox::Cancel);
+            leave(dialog);
         });
         double_click(stage, stage.value(QString::fromLatin1(name)));
         QVERIFY(hand.is_done());
     }
     QCOMPARE(scene.bytes(), before);
+}
+
+void ValuesViewTest::an_emptied_number_is_written_as_zero() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha);
+    for (const char* name : {"dword", "qword"}) {
+        DialogHand hand;
+        hand.then([&](QWidget* dialog) {
+            QTest::keyClick(QApplication::focusWidget(), Qt::Key_A, Qt::ControlModifier);
+            QTest::keyClick(QApplication::focusWidget(), Qt::Key_Delete);
+            QCOMPARE(shown_in(*dialog), QString());
+            press(*dialog, QDialogButtonBox::Ok);
+        });
+        double_click(stage, stage.value(QString::fromLatin1(name)));
+        QVERIFY(hand.is_done());
+        const auto value = stored(stage, QString::fromLatin1(name));
+        QVERIFY(value);
+        QCOMPARE(value->data.toULongLong(), 0ULL);
+    }
 }
 
 void ValuesViewTest::data_goes_to_no_other_key_s_value_data() {
