@@ -25,6 +25,7 @@ KeyRecord new_record(CellOffset parent_offset, const KeyRecord& parent, const Na
     record.volatile_index = raw(CellOffset::none);
     record.value_list = raw(CellOffset::none);
     record.security = parent.security;
+    // One cell for both keys: nothing in the engine changes or frees a class.
     record.class_name = parent.class_name;
     record.class_length = parent.class_length;
     record.work = new_key_work;

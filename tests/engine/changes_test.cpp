@@ -141,6 +141,8 @@ TEST_F(Changing, a_new_key_takes_time_class_and_security_from_its_parent) {
     ASSERT_NE(made, nullptr);
     EXPECT_EQ(made->time, 0x1122334455667788U);
     EXPECT_EQ(made->class_name, u"Klass");
+    const auto class_cell = [&](const Key& key) { return get32(other.bytes(), 4100 + uint64_t{key.offset} + 48); };
+    EXPECT_EQ(class_cell(*made), class_cell(*now.find("Alpha")));
     EXPECT_EQ(made->flags, 0x20);
     EXPECT_EQ(made->security, now.find("Alpha")->security);
     EXPECT_EQ(get32(other.bytes(), 4100 + uint64_t{made->offset} + 68), 0xB2B2B2B2U);

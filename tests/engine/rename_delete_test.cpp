@@ -223,13 +223,17 @@ TEST_F(Moving, the_last_key_of_a_security_record_takes_it_along) {
 // A count that is too low is believed only as long as the parent does not say otherwise.
 TEST_F(Moving, a_security_record_that_the_parent_still_refers_to_stays) {
     HiveLayout layout;
-    layout.root.add("Top").add("one");
+    layout.security_records = 2;
+    KeyLayout& top = layout.root.add("Top");
+    top.security = 1;
+    top.add("one").security = 1;
     LaidHive hive = lay_out(layout);
-    hive.put32(hive.security[0], 12, 1);
+    hive.put32(hive.security[1], 12, 1);
     Scene other(hive.bytes);
     EXPECT_EQ(other.Delete("Top\\one"), 0);
-    EXPECT_LT(hive.cell_size(hive.security[0]), 0);
-    EXPECT_EQ(get32(other.bytes(), LaidHive::position(hive.security[0], 12)), 1U);
+    EXPECT_EQ(get32(other.bytes(), 4096 + uint64_t{hive.security[1]}),
+              get32(hive.bytes, 4096 + uint64_t{hive.security[1]}));
+    EXPECT_EQ(get32(other.bytes(), LaidHive::position(hive.security[1], 12)), 1U);
     EXPECT_EQ(other.Create("Top\\two"), 0);
     EXPECT_EQ(other.Delete("Top\\two"), 0);
 }

@@ -251,12 +251,15 @@ TEST_F(Window, reads_inside_it_do_not_reach_the_file) {
 }
 
 TEST_F(Window, a_write_into_it_makes_the_next_read_come_from_the_file) {
-    read(40000, 4);
-    const uint8_t byte = 0x55;
-    EXPECT_EQ(engine::write_at(store_of(scene), engine::sig_none, 40004, &byte, 1), 1U);
-    scene.file().arm({});
-    EXPECT_EQ(read(40000, 8), 8U);
-    EXPECT_EQ(scene.file().counts().reads, 1U);
+    const int64_t place = 8192 + 108;  // near the bin's header, which a write looks at
+    for (const uint8_t byte : {uint8_t{0x55}, uint8_t{0x66}}) {
+        store_of(scene).window.valid = false;
+        read(place, 4);
+        EXPECT_EQ(store_of(scene).window.start, 8192);
+        EXPECT_EQ(engine::write_at(store_of(scene), engine::sig_none, place + 4, &byte, 1), 1U);
+        EXPECT_EQ(scene.bytes()[static_cast<size_t>(place) + 4], byte);
+        EXPECT_EQ(read(place, 8), 8U);  // holds what it reads against the file
+    }
 }
 
 TEST_F(Window, a_record_at_the_very_end_of_the_file_is_read_as_far_as_it_goes) {

@@ -331,11 +331,19 @@ def odd_value(session):
     session.unchanged("Ok alone")
     row = program.row_of(session.table, "DWORD")
     program.double_click(program.table_cell(session.table, row, 1))
+    # A click that is answered says that no dialog has opened before it.
+    program.click(session.value_cell("Link"))
+    until(lambda: has(session.value_cell("Link"), State.SELECTED), "the next row to be selected")
     equal(program.open_titles(), [TITLE], "windows after a double click on the type")
-    for value in ("Text, many scripts", "Text, markup", "List", "Binary, in segments", "Resource list"):
+    for value, title in (
+        ("Text, many scripts", "Edit String"),
+        ("Text, markup", "Edit String"),
+        ("List", "Edit Multi-String"),
+        ("Binary, in segments", "Edit Binary Value"),
+        ("Resource list", "Edit Binary Value"),
+    ):
         program.double_click(session.value_cell(value))
-        until(lambda: len(program.open_titles()) == 2, f"the editor of {value!r}")
-        dialog = program.dialog(next(title for title in program.open_titles() if title != TITLE))
+        dialog = program.dialog(title)
         program.click(program.button(dialog, "OK"))
         program.gone(dialog)
         session.unchanged(f"Ok alone on {value!r}")

@@ -415,6 +415,13 @@ std::string cost(const MemoryFile& file, const testkit::AllocationFaults& memory
 
 }  // namespace
 
+int32_t status_of(const Bytes& bytes, const Change& change) {
+    testkit::Scene scene(bytes);
+    Handle holder;
+    RegistryKey* key = scene.is_open() ? follow(scene.root(), change.way, holder) : nullptr;
+    return key != nullptr ? call(key, change) : int32_t{R_FAILED};
+}
+
 std::string try_change(const Case& hive, const Snapshot& before, const Change& change,
                        const MemoryFile::Failure& failure, bool* struck) {
     MemoryFile file(hive.bytes);

@@ -38,6 +38,9 @@ double most_seconds(uint64_t file_size);
 // All changes to what a snapshot shows.
 std::vector<Change> changes_to(const testkit::Snapshot& snapshot);
 
+// What the call of a change answers, made on a copy of the bytes.
+int32_t status_of(const Bytes& bytes, const Change& change);
+
 // Makes the change on a copy of the case's bytes. What was done to anything that the change does not name,
 // what was written where nothing may be, a success that is none; empty when all is well.
 // A call of the file that fails meanwhile may be given; struck then tells whether it was reached.

@@ -152,10 +152,26 @@ TEST(FreeSpace, in_cells_of_8_bytes_is_no_room_for_a_record) {
     EXPECT_EQ(scene.Check(), "");
 }
 
-TEST(FreeSpace, side_by_side_becomes_one_when_a_neighbour_is_freed) {
+// The size words of the cells from a position to the end of the file.
+std::vector<int32_t> sizes_from(const Bytes& bytes, uint64_t position) {
+    std::vector<int32_t> sizes;
+    while (position < bytes.size()) {
+        sizes.push_back(static_cast<int32_t>(get32(bytes, position)));
+        position += static_cast<uint64_t>(std::abs(sizes.back()));
+    }
+    return sizes;
+}
+
+TEST(FreeSpace, side_by_side_becomes_one_when_a_cell_of_its_bin_is_freed) {
+    Damage work;
+    work.hive = lay_out(stage());
+    const uint64_t first = 4096 + uint64_t{work.free_space()};
     Scene scene(case_of("free_cells_side_by_side").bytes);
-    EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(300)), R_SUCCESS);
-    EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(1000)), R_SUCCESS);
+    EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(2000)), R_SUCCESS);
+    EXPECT_EQ(sizes_from(scene.bytes(), first), (std::vector<int32_t>{8, 8, 16, 24, 8, 64, -2008, 1928}));
+    // The data keeps its cell, by way of a spare one behind it, which is freed again.
+    EXPECT_EQ(scene.Set("Alpha", "Raw", 3, pattern(1900)), R_SUCCESS);
+    EXPECT_EQ(sizes_from(scene.bytes(), first), (std::vector<int32_t>{8 + 8 + 16 + 24 + 8 + 64, -2008, 1928}));
     EXPECT_EQ(scene.Check(), "");
 }
 

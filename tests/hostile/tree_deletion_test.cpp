@@ -53,7 +53,21 @@ Handle follow(Scene& scene, const std::vector<uint32_t>& way) {
     return key;
 }
 
-class Trees : public testing::TestWithParam<size_t> {};
+uint32_t subkey_count(RegistryKey* key) {
+    uint32_t count = 0;
+    EXPECT_EQ(RQueryInfoKeyW(key, nullptr, nullptr, nullptr, nullptr, &count, nullptr, nullptr, nullptr, nullptr,
+                             nullptr, nullptr, nullptr),
+              R_SUCCESS);
+    return count;
+}
+
+class Trees : public testing::TestWithParam<size_t> {
+protected:
+    static void TearDownTestSuite() { EXPECT_GT(deleted, refused); }
+
+    static inline size_t deleted = 0;
+    static inline size_t refused = 0;
+};
 
 TEST_P(Trees, that_may_be_deleted_are_deleted_whole) {
     const Entry& entry = catalogue()[GetParam()];
@@ -76,11 +90,21 @@ TEST_P(Trees, that_may_be_deleted_are_deleted_whole) {
             ASSERT_TRUE(parent) << found.place;
             if (RCheckDeleteTree(parent.get(), position) != R_SUCCESS) {
                 EXPECT_TRUE(scene.Untouched());
+                refused++;
                 continue;
             }
+            const uint32_t subkeys = subkey_count(parent.get());
             EXPECT_EQ(delete_tree(parent.get(), position), R_SUCCESS) << found.place;
+            EXPECT_EQ(subkey_count(parent.get()), subkeys - 1) << found.place;
+            deleted++;
         }
-        EXPECT_TRUE(scene.Reopen()) << found.place;
+        ASSERT_TRUE(scene.Reopen()) << found.place;
+        const Snapshot after = take_snapshot(scene.root(), judged_limits(bytes.size()));
+        const auto times = [&](const Snapshot& snapshot) {
+            return std::count_if(snapshot.keys.begin(), snapshot.keys.end(),
+                                 [&](const FoundKey& key) { return key.place == found.place; });
+        };
+        EXPECT_LT(times(after), times(before)) << found.place;
     }
 }
 

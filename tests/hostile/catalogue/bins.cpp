@@ -68,6 +68,7 @@ void add_bins(List& list) {
             const auto cell = static_cast<int32_t>(size - 32);
             testkit::set32(d.hive.bytes, base_block_bytes + uint64_t{bin} + 8, size);
             d.hive.set_cell_size(bin + 32, in_use == 0 ? cell : -cell);
+            d.result.lies = in_use == 1;  // no bin goes behind it
             d.hive.put_base(40, bin + size);
             d.hive.fix_checksum();
         });

@@ -43,6 +43,8 @@ struct Case {
     std::vector<Flow> shows_in;
     // Places that lead to where the file has nothing yet: what a change puts there may show in them.
     std::vector<std::string> unsettled;
+    // A count or a size lies: nothing is missing for it, but changes that go by it are refused.
+    bool lies = false;
     // The file ends too early: what is behind its end may be read once a change has made it longer.
     bool cut_short = false;
     // The damaged structures, which no change may write to.

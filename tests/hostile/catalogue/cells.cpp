@@ -170,6 +170,7 @@ void add_references_of_a_leaf(List& list) {
                      unseen ? List::Places{} : reference.affected, [=](Damage& d) {
                          const uint64_t field = reference.field(d);
                          d.result.unsettled = reference.affected;
+                         d.result.lies = no_values;
                          testkit::set32(d.hive.bytes, field, offset(d));
                      });
         };

@@ -123,10 +123,12 @@ void add_counts(List& list) {
     for (const auto& [name, count] : std::vector<std::pair<std::string, uint32_t>>{
              {"one_above_its_list", 4}, {"of_7FFFFFFF", 0x7FFFFFFF}, {"all_ones", none}}) {
         list.add("subkey_count_" + name, Readable::whole, {}, [count = count](Damage& d) {
+            d.result.lies = true;
             d.keep(d.at("Alpha").index);
             d.hive.put32(d.at("Alpha").record, count_field, count);
         });
         list.add("subkey_count_" + name + "_over_an_index_root", Readable::whole, {}, [count = count](Damage& d) {
+            d.result.lies = true;
             d.keep(d.at("Beta").index);
             d.hive.put32(d.at("Beta").record, count_field, count == none ? none : count + 2);
         });
@@ -137,11 +139,13 @@ void add_counts(List& list) {
     for (const uint32_t count : {1U, 3U, 0x7FFFFFFFU, none}) {
         list.add("subkey_count_of_" + std::to_string(count) + "_without_a_list", Readable::whole, {},
                  [count](Damage& d) {
+                     d.result.lies = true;
                      d.hive.put32(d.at("Zeta").record, count_field, count);
                      d.hive.put32(d.at("Zeta").record, index_field, none);
                  });
     }
     list.add("root_with_a_count_above_its_list", Readable::whole, {}, [](Damage& d) {
+        d.result.lies = true;
         d.keep(d.at("").index);
         d.hive.put32(d.at("").record, count_field, 0x10000);
     });

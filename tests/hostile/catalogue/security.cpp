@@ -61,7 +61,10 @@ void add_security(List& list) {
     });
     in_record("count_0", [](Damage& d, uint32_t own) { d.hive.put32(own, count_field, 0); });
     in_record("count_too_high", [](Damage& d, uint32_t own) { d.hive.put32(own, count_field, 9); });
-    in_record("count_all_ones", [](Damage& d, uint32_t own) { d.hive.put32(own, count_field, none); });
+    in_record("count_all_ones", [](Damage& d, uint32_t own) {
+        d.result.lies = true;
+        d.hive.put32(own, count_field, none);
+    });
     list.add("security_count_too_low", Readable::whole, {},
              [](Damage& d) { d.hive.put32(d.hive.security[0], count_field, 1); });
 }

@@ -17,6 +17,7 @@ constexpr uint16_t root_of_leaves = 0x6972;
 void add_counts(List& list) {
     const auto counted = [&](const std::string& name, Readable readable, uint16_t count) {
         list.add("index_count_" + name, readable, {"Alpha\\"}, [count](Damage& d) {
+            d.result.lies = true;
             d.keep(d.at("Alpha").index);
             d.hive.put16(d.at("Alpha").index, 2, count);
         });
@@ -34,10 +35,12 @@ void add_counts(List& list) {
         d.cut_cell(d.at("Alpha").index, 8);
     });
     list.add("root_of_leaves_with_count_65535", Readable::whole, {"Beta\\"}, [](Damage& d) {
+        d.result.lies = true;
         d.keep(d.at("Beta").index);
         d.hive.put16(d.at("Beta").index, 2, 65535);
     });
     list.add("leaf_below_a_root_with_count_65535", Readable::whole, {"Beta\\"}, [](Damage& d) {
+        d.result.lies = true;
         d.keep(d.at("Beta").leaves[0]);
         d.hive.put16(d.at("Beta").leaves[0], 2, 65535);
     });

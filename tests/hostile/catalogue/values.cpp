@@ -20,13 +20,18 @@ void add_lists(List& list) {
     for (const uint32_t count : {6U, 100U, 0x3FFFFFFFU, 0x40000000U, 0x7FFFFFFFU, 0xFFFFFFFFU}) {
         list.add("value_list_shorter_than_a_count_of_" + std::to_string(count), Readable::whole, {},
                  [count](Damage& d) {
+                     d.result.lies = true;
                      d.keep(d.at("Alpha").value_list);
                      d.hive.put32(d.at("Alpha").record, count_field, count);
                  });
         list.add("value_count_of_" + std::to_string(count) + "_without_a_list", Readable::whole, {},
-                 [count](Damage& d) { d.hive.put32(d.at("Zeta").record, count_field, count); });
+                 [count](Damage& d) {
+                     d.result.lies = true;
+                     d.hive.put32(d.at("Zeta").record, count_field, count);
+                 });
         list.add("value_count_of_" + std::to_string(count) + "_with_a_list_at_0", Readable::whole, {},
                  [count](Damage& d) {
+                     d.result.lies = true;
                      d.hive.put32(d.at("Zeta").record, count_field, count);
                      d.hive.put32(d.at("Zeta").record, list_field, 0);
                  });
