@@ -1,5 +1,5 @@
 # tallowfen_add_test(NAME name LABEL label... [TIMEOUT seconds] [COST seconds] COMMAND ...): one CTest entry with the
-# environment that every test gets. COST is for one that takes long: it starts ahead of the others, which run beside it.
+# environment that every test gets, which is no user's language. COST is for one that takes long: it starts ahead of the others, which run beside it.
 # The target tests_LABEL builds what the tests of that label start.
 function(tallowfen_add_test)
     cmake_parse_arguments(T "" "NAME;TIMEOUT;COST" "LABEL;COMMAND" ${ARGN})
@@ -9,7 +9,7 @@ function(tallowfen_add_test)
     endif()
     set_tests_properties(${T_NAME} PROPERTIES
         LABELS "${T_LABEL}" TIMEOUT ${T_TIMEOUT}
-        ENVIRONMENT "TALLOWFEN_HIVES=${TALLOWFEN_HIVES};QT_QPA_PLATFORM=offscreen;TSAN_OPTIONS=ignore_noninstrumented_modules=1 halt_on_error=1;ASAN_OPTIONS=detect_leaks=1:exitcode=99")
+        ENVIRONMENT "TALLOWFEN_HIVES=${TALLOWFEN_HIVES};QT_QPA_PLATFORM=offscreen;LANGUAGE=;LC_ALL=C.UTF-8;TSAN_OPTIONS=ignore_noninstrumented_modules=1 halt_on_error=1;ASAN_OPTIONS=detect_leaks=1:exitcode=99")
     if(T_COST)
         set_tests_properties(${T_NAME} PROPERTIES COST ${T_COST})
     endif()
