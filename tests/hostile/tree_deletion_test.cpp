@@ -61,19 +61,15 @@ uint32_t subkey_count(RegistryKey* key) {
     return count;
 }
 
-class Trees : public testing::TestWithParam<size_t> {
-protected:
-    static void TearDownTestSuite() { EXPECT_GT(deleted, refused); }
-
-    static inline size_t deleted = 0;
-    static inline size_t refused = 0;
-};
+class Trees : public testing::TestWithParam<size_t> {};
 
 TEST_P(Trees, that_may_be_deleted_are_deleted_whole) {
     const Entry& entry = catalogue()[GetParam()];
     if (entry.readable == Readable::no || entry.large)
         return;
-    const Bytes bytes = entry.make().bytes;
+    const Case hive = entry.make();
+    const Bytes& bytes = hive.bytes;
+    size_t deleted = 0;
     Scene first(bytes);
     ASSERT_TRUE(first.is_open());
     const Snapshot before = take_snapshot(first.root(), judged_limits(bytes.size()));
@@ -90,7 +86,6 @@ TEST_P(Trees, that_may_be_deleted_are_deleted_whole) {
             ASSERT_TRUE(parent) << found.place;
             if (RCheckDeleteTree(parent.get(), position) != R_SUCCESS) {
                 EXPECT_TRUE(scene.Untouched());
-                refused++;
                 continue;
             }
             const uint32_t subkeys = subkey_count(parent.get());
@@ -106,6 +101,7 @@ TEST_P(Trees, that_may_be_deleted_are_deleted_whole) {
         };
         EXPECT_LT(times(after), times(before)) << found.place;
     }
+    EXPECT_TRUE(deleted > 0 || entry.readable == Readable::partly || hive.lies);
 }
 
 std::string name_of(const testing::TestParamInfo<size_t>& row) {
