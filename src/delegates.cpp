@@ -151,10 +151,6 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
     }
 }
 
-QString KeyDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
-    return with_visible_controls(value.toString());
-}
-
 void KeyDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const {
     commit(*editor, *model, index, tr("The specified key name already exists."));
 }
@@ -181,6 +177,7 @@ QSize KeyDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelInde
 void KeyDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
     try {
         QStyledItemDelegate::initStyleOption(option, index);
+        option->text = with_visible_controls(option->text);
     } catch (const std::exception& failure) {
         say_unreadable(*option);
         report_key_failure(index, failure);

@@ -82,14 +82,13 @@ class KeyDelegate : public NameDelegate {
 public:
     using NameDelegate::NameDelegate;
 
-    // The name on one line, its control characters made visible.
-    QString displayText(const QVariant& value, const QLocale& locale) const override;
     void setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const override;
 
     void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override;
     QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override;
 
 protected:
+    // The name on one line, its control characters made visible.
     void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
     QString key_path_for(const QModelIndex& index) const override;
 };

@@ -4,6 +4,7 @@
 
 #include "compact_dialog.h"
 #include "editor_dialog.h"
+#include "string_lines.h"
 #include "validators.h"
 
 #include <QAbstractItemModel>
@@ -13,7 +14,6 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QRegularExpressionValidator>
-#include <QTextDocument>
 #include <QTextEdit>
 #include <QVBoxLayout>
 
@@ -83,48 +83,6 @@ private:
     bool was_pressed_ = false;
 };
 
-// A text ends at its first zero, and what is behind one would never be seen again; a clipboard can hold some.
-QString without_zeros(QString text) { return text.remove(QChar::Null); }
-
-// The document's text with its lines parted by "\n". Not toPlainText: that turns a non-breaking space into a blank.
-QString text_of(const QTextDocument& document, bool had_line_separators) {
-    QString text = document.toRawText();
-    text.replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
-    if (!had_line_separators) {
-        // Pasted; the user means a line.
-        text.replace(QChar::LineSeparator, QLatin1Char('\n'));
-    }
-    return without_zeros(text);
-}
-
-// The lines that each string takes in the editing widget: one, or more where it has line ends inside.
-QList<QStringList> lines_of(const QStringList& strings) {
-    QTextDocument document;
-    QList<QStringList> all;
-    for (const QString& string : strings) {
-        document.setPlainText(string);
-        all.append(text_of(document, true).split(QLatin1Char('\n')));
-    }
-    return all;
-}
-
-// A string for each line. At the head and at the tail, as far as the lines stand there as they were shown, the strings
-// that they were shown for: not all characters survive the widget.
-QStringList strings_of(const QStringList& lines, const QStringList& data, const QList<QStringList>& shown) {
-    qsizetype head = 0;
-    qsizetype first = 0;
-    while (head < data.size() && lines.mid(first, shown[head].size()) == shown[head]) {
-        first += shown[head++].size();
-    }
-    qsizetype tail = data.size();
-    qsizetype end = lines.size();
-    while (tail > head && end - shown[tail - 1].size() >= first &&
-           lines.mid(end - shown[tail - 1].size(), shown[tail - 1].size()) == shown[tail - 1]) {
-        end -= shown[--tail].size();
-    }
-    return data.mid(0, head) + lines.mid(first, end - first) + data.mid(tail);
-}
-
 }  // namespace
 
 bool edit_string(QAbstractItemModel& model, const QString& value_name, const QString& data,
@@ -161,20 +119,14 @@ bool edit_multi_string(QAbstractItemModel& model, const QString& value_name, con
     LinesEdit edit;
     edit.setAcceptRichText(false);
     edit.setTabChangesFocus(true);
-    // A line that is seen is a line.
+    // A long line stays one.
     edit.setLineWrapMode(QTextEdit::NoWrap);
     // Plain text, and not line by line: what looks like markup is data, and so is an empty first line.
-    const QList<QStringList> shown = lines_of(data);
-    QStringList lines;
-    for (const QStringList& of_one : shown) {
-        lines += of_one;
-    }
-    const QString given = lines.join(QLatin1Char('\n'));
-    edit.setPlainText(given);
+    const StringLines lines(data);
+    lines.fill(edit);
     if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Multi-String", "dialog title"), value_name,
                     &edit)) {
         return true;
     }
-    const QString text = text_of(*edit.document(), given.contains(QChar::LineSeparator));
-    return model.setData(data_index, strings_of(text.split(QLatin1Char('\n')), data, shown), Qt::DisplayRole);
+    return model.setData(data_index, lines.strings_in(*edit.document()), Qt::DisplayRole);
 }

@@ -157,6 +157,7 @@ void MainWindow::show_status(const QModelIndex& key) {
     const QString path = key_path_of(key);
     status_label->setMaximumHeight(status_label->fontMetrics().height());
     status_label->setText(with_visible_controls(path));
+    status_label->setAccessibleName(path);
     // Made into a paragraph here, so that the tip takes no name for markup.
     status_label->setToolTip(path.isEmpty() ? path : Qt::convertFromPlainText(path));
     FailureReport::instance().set_shown_key(path);

@@ -68,6 +68,7 @@ QString value_text(const QVariant& value, qsizetype limit) {
 }
 
 QString with_visible_controls(QString text) {
+    // Arrows and U+FFFD: most fonts have them, few the pictures of control characters.
     for (QChar& c : text) {
         if (c == QChar::LineFeed || c == QChar::LineSeparator || c == QChar::ParagraphSeparator) {
             c = QChar(0x21b5);

@@ -14,8 +14,7 @@ class QVariant;
 QString value_text(const QVariant& value, qsizetype limit = std::numeric_limits<qsizetype>::max());
 
 // The text with a sign in place of each control character and of U+2028 and U+2029, which take no room or end the line:
-// in what is painted it shows that they are there. Arrows, which every font has, for line ends; character for
-// character; a tab, which is a gap, stays.
+// in what is painted it shows that they are there. Character for character; a tab, which is a gap, stays.
 QString with_visible_controls(QString text);
 
 // What stands, and is spoken, in place of a name or datum that cannot be read.

@@ -391,7 +391,7 @@ void DelegatesTest::what_a_cell_shows_is_the_beginning_of_the_text() {
     QCOMPARE(painted(ValueDelegate(nullptr)), painted(PlainDelegate()));
 }
 
-// Two names that differ in them must not look the same.
+// A name must not look like the one without them.
 void DelegatesTest::control_characters_are_seen() {
     const QString text =
         QStringLiteral("a\nb\r\n\tc") + QChar(QChar::Null) + QStringLiteral("\u007f\u0085\u2028\u2029\u200b");

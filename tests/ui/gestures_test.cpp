@@ -225,7 +225,12 @@ private slots:
     void a_text_that_a_cell_cuts_is_whole_in_its_tip_whatever_room_its_letters_take() {
         testkit::HiveLayout layout;
         testkit::KeyLayout& run = layout.root.add("Run");
-        run.set("feeds", 1, testkit::text_data(std::string(300, '\n') + "C:\\evil.exe"));
+        testkit::Bytes narrow;
+        for (int i = 0; i < 300; i++)
+            narrow.insert(narrow.end(), {0x0b, 0x20});  // U+200B
+        const testkit::Bytes behind = testkit::text_data("C:\\evil.exe");
+        narrow.insert(narrow.end(), behind.begin(), behind.end());
+        run.set("narrow", 1, narrow);
         run.set("short", 1, testkit::text_data("x"));
         run.set("bytes", 3, testkit::Bytes(334, 0xab));
         const Scene scene(layout);
@@ -240,7 +245,7 @@ private slots:
             return QToolTip::isVisible() ? QToolTip::text() : QString();
         };
         QCOMPARE(tip_of("short"), QString());
-        const QString tip = tip_of("feeds");
+        const QString tip = tip_of("narrow");
         QVERIFY2(tip.contains(QStringLiteral("C:\\evil.exe")), qPrintable(tip));
         // One that is cut as well says so, and does not end in half a byte as if that were all.
         QVERIFY(!tip.contains(QChar(0x2026)));

@@ -1,0 +1,97 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+#include "string_lines.h"
+
+#include <QTextBlock>
+#include <QTextDocument>
+#include <QTextEdit>
+
+namespace {
+
+// Not toPlainText of the document: that turns a non-breaking space into a blank.
+QStringList lines_of(const QTextBlock& block, bool had_line_separators) {
+    const QString text = without_zeros(block.text());
+    // A pasted one; the user means a line.
+    return had_line_separators ? QStringList{text} : text.split(QChar::LineSeparator);
+}
+
+}  // namespace
+
+QString without_zeros(QString text) { return text.remove(QChar::Null); }
+
+StringLines::StringLines(const QStringList& strings) : strings_(strings) {
+    QTextDocument document;
+    for (const QString& string : strings) {
+        document.setPlainText(string);
+        lines_.append(QStringList());
+        for (QTextBlock block = document.begin(); block.isValid(); block = block.next()) {
+            lines_.last() += lines_of(block, true);
+        }
+    }
+}
+
+void StringLines::fill(QTextEdit& edit) const {
+    edit.setPlainText(all_lines().join(QLatin1Char('\n')));
+    QTextBlock block = edit.document()->begin();
+    for (int i = 0; i < lines_.size(); ++i) {
+        for (qsizetype line = 0; line < lines_[i].size(); ++line, block = block.next()) {
+            block.setUserState(i);
+        }
+    }
+}
+
+QStringList StringLines::strings_in(const QTextDocument& document) const {
+    const bool had_line_separators = all_lines().join(QString()).contains(QChar::LineSeparator);
+    QStringList strings;
+    QStringList changed;  // lines since the last string that stands
+    int next = 0;         // behind that string
+    for (QTextBlock block = document.begin(); block.isValid();) {
+        const int shown_for = block.userState();  // -1 for a line that the user has made
+        QStringList run;
+        do {
+            run += lines_of(block, had_line_separators);
+            block = block.next();
+        } while (block.isValid() && block.userState() == shown_for && shown_for >= 0);
+        if (shown_for >= next && run == lines_[shown_for]) {
+            strings += strings_between(next, shown_for, changed) + QStringList{strings_[shown_for]};
+            changed.clear();
+            next = shown_for + 1;
+        } else {
+            changed += run;
+        }
+    }
+    return strings + strings_between(next, lines_.size(), changed);
+}
+
+// Of the strings from first up to end those whose lines stand at the head or the tail of some lines, and the rest
+// of the lines between. Return at the beginning of a line makes of the line, not of the new one, another block.
+QStringList StringLines::strings_between(qsizetype first, qsizetype end, const QStringList& lines) const {
+    const auto stands_at = [&](qsizetype place, const QStringList& shown) {
+        return lines.mid(place, shown.size()) == shown;
+    };
+    QStringList head;
+    qsizetype from = 0;
+    for (; first < end && stands_at(from, lines_[first]); ++first) {
+        head.append(strings_[first]);
+        from += lines_[first].size();
+    }
+    QStringList tail;
+    qsizetype to = lines.size();
+    for (; first < end; --end) {
+        const qsizetype place = to - lines_[end - 1].size();
+        if (place < from || !stands_at(place, lines_[end - 1])) {
+            break;
+        }
+        tail.prepend(strings_[end - 1]);
+        to = place;
+    }
+    return head + lines.mid(from, to - from) + tail;
+}
+
+QStringList StringLines::all_lines() const {
+    QStringList all;
+    for (const QStringList& lines : lines_) {
+        all += lines;
+    }
+    return all;
+}

@@ -1,0 +1,34 @@
+// SPDX-FileCopyrightText: 2026 The tallowfen developers
+// SPDX-License-Identifier: MIT
+//
+// A list of strings as the lines of a text: one line each, or more where a string has line ends inside. Not all
+// characters survive the text widget, so a string that the user leaves alone is known by its lines.
+#pragma once
+
+#include <QStringList>
+
+class QTextDocument;
+class QTextEdit;
+
+// A text of a value ends at its first zero, and what is behind one would never be seen again; a clipboard can hold
+// some.
+QString without_zeros(QString text);
+
+class StringLines {
+public:
+    explicit StringLines(const QStringList& strings);
+
+    // Shows the lines as plain text, each block marked with the string that it belongs to.
+    void fill(QTextEdit& edit) const;
+
+    // What the filled document says now: the string that was given where its lines stand together as they were shown,
+    // else a string for each line.
+    QStringList strings_in(const QTextDocument& document) const;
+
+private:
+    QStringList strings_between(qsizetype first, qsizetype end, const QStringList& lines) const;
+    QStringList all_lines() const;
+
+    QStringList strings_;
+    QList<QStringList> lines_;  // of each string
+};
