@@ -6,11 +6,13 @@
 #include "main_window.h"
 #include "reg_model.h"
 
+#include <QFile>
 #include <QMessageBox>
 #include <QTranslator>
 
 #include <cstdio>
 #include <cstring>
+#include <stdexcept>
 
 namespace {
 
@@ -61,6 +63,10 @@ int main(int argc, char** argv) {
     for (int i = 1; i < argc; i += 2) {
         const QString file = QString::fromLocal8Bit(argv[i + 1]);
         set_file_being_opened(file);
+        // A path is text here: one that is none would come to name another file.
+        if (QFile::encodeName(file) != argv[i + 1]) {
+            throw std::runtime_error("Cannot open file");
+        }
         model.add_hive(QString::fromLocal8Bit(argv[i]), file);
     }
     set_file_being_opened(QString());

@@ -91,7 +91,9 @@ void RegHive::open_file() {
         !file_.open(QIODevice::ReadWrite | QIODevice::Unbuffered | QIODevice::ExistingOnly))
         throw std::runtime_error("Cannot open file");
     const FileIdentity file = identity(file_);
-    const bool locked_elsewhere = flock(file_.handle(), LOCK_EX | LOCK_NB) != 0 && errno == EWOULDBLOCK;
+    // Network file systems that make byte ranges of the lock may answer EACCES.
+    const bool locked_elsewhere =
+        flock(file_.handle(), LOCK_EX | LOCK_NB) != 0 && (errno == EWOULDBLOCK || errno == EACCES);
     if (locked_elsewhere || !open_files().insert(file).second)
         throw std::runtime_error("Cannot open file");
 }

@@ -164,6 +164,15 @@ private slots:
         QCOMPARE(failure(hive.path()), QString());
     }
 
+    void a_lock_that_is_refused_in_either_way_is_another_program_s() {
+        for (const int error : {EWOULDBLOCK, EACCES}) {
+            const testkit::LockFaults locked(error);
+            const HiveOnDisk hive(many_keys(1));
+            QCOMPARE(failure(hive.path()), QStringLiteral("Cannot open file"));
+            QCOMPARE(locked.tried(), 1);
+        }
+    }
+
     void opening_and_closing_changes_no_byte() {
         const HiveOnDisk hive(many_keys(3));
         const testkit::Bytes before = hive.bytes();

@@ -31,7 +31,7 @@ struct Ended {
 // Runs the program until it ends. The first line of standard error is the debug line of the translations,
 // which comes whatever the arguments are.
 Ended run(const QStringList& arguments, const QMap<QString, QString>& variables = {},
-          const std::function<void()>& in_child = {}) {
+          const std::function<void()>& in_child = {}, const QString& program = QStringLiteral(TALLOWFEN_PROGRAM)) {
     QProcess process;
     process.setChildProcessModifier(in_child);
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
@@ -42,7 +42,7 @@ Ended run(const QStringList& arguments, const QMap<QString, QString>& variables 
         environment.insert(it.key(), it.value());
     }
     process.setProcessEnvironment(environment);
-    process.start(QStringLiteral(TALLOWFEN_PROGRAM), arguments);
+    process.start(program, arguments);
     Ended ended;
     if (!process.waitForFinished(30000)) {
         process.kill();
@@ -95,6 +95,7 @@ private slots:
     void the_translation_line();
     void a_file_that_is_no_hive_ends_the_program_data();
     void a_file_that_is_no_hive_ends_the_program();
+    void a_path_that_is_no_text_names_no_other_file();
 };
 
 void EntryTest::wrong_arguments_give_the_usage_line_data() {
@@ -287,6 +288,20 @@ void EntryTest::a_file_that_is_no_hive_ends_the_program() {
     QCOMPARE(told(ended), QStringLiteral("tallowfen: %1: %2\n").arg(shown, reason));
     QCOMPARE(ended.out, QString());
     QCOMPARE(sound.bytes(), before);
+}
+
+void EntryTest::a_path_that_is_no_text_names_no_other_file() {
+    const Scene scene;
+    const QTemporaryDir directory;
+    // What the path becomes where the byte that is no character is replaced.
+    const QString other = directory.filePath(QStringLiteral("J\ufffdrg"));
+    QVERIFY(QFile::copy(scene.file(), other));
+    const Ended ended = run({QStringLiteral("-c"), QStringLiteral("exec \"$0\" A/B \"$1/J$(printf '\\366')rg\""),
+                             QStringLiteral(TALLOWFEN_PROGRAM), directory.path()},
+                            {{QStringLiteral("PRESSER_EXIT"), QStringLiteral("0")}}, {}, QStringLiteral("/bin/sh"));
+    QVERIFY(ended.crashed);
+    QCOMPARE(ended.status, SIGABRT);
+    QCOMPARE(told(ended), QStringLiteral("tallowfen: %1: Cannot open file\n").arg(other));
 }
 
 QTEST_GUILESS_MAIN(EntryTest)
