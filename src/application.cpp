@@ -9,6 +9,7 @@
 #include <QDebug>
 #include <QFile>
 #include <QIcon>
+#include <QKeyEvent>
 #include <QLibraryInfo>
 #include <QLocale>
 #include <QMouseEvent>
@@ -76,10 +77,24 @@ Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
     QIcon::setFallbackSearchPaths(QIcon::fallbackSearchPaths() << share_directory);
 }
 
+bool Application::is_held_from_elsewhere(const QWidget& receiver, const QKeyEvent& key) {
+    if (key.key() != Qt::Key_Return && key.key() != Qt::Key_Enter) {
+        return false;
+    }
+    if (!key.isAutoRepeat()) {
+        return_pressed_in_ = receiver.window();
+    }
+    return return_pressed_in_ != receiver.window();
+}
+
 bool Application::notify(QObject* receiver, QEvent* event) {
     // Asked first: afterwards the receiver may be gone.
     const bool is_gesture = receiver->isWidgetType() || event->type() == QEvent::Shortcut;
     const bool is_in_table = is_in_values_table(receiver);
+    if (event->type() == QEvent::KeyPress && receiver->isWidgetType() &&
+        is_held_from_elsewhere(*static_cast<QWidget*>(receiver), *static_cast<QKeyEvent*>(event))) {
+        return true;
+    }
     try {
         // Here, since the toolkit moves the keyboard, which ends a naming, before any filter sees the press.
         if (is_of_the_mouse(event->type()) && receiver->isWidgetType()) {

@@ -5,11 +5,14 @@
 #pragma once
 
 #include <QApplication>
+#include <QPointer>
 #include <QString>
 
+class QKeyEvent;
 class QTranslator;
 
-// An exception that leaves an event handler is told to the user and ends there; the program goes on.
+// An exception that leaves an event handler is told to the user and ends there; the program goes on. Return held down
+// answers only the window that it was pressed in, and not the question or editor that it has opened.
 class Application : public QApplication {
     Q_OBJECT
 
@@ -17,6 +20,11 @@ public:
     Application(int& argc, char** argv);
 
     bool notify(QObject* receiver, QEvent* event) override;
+
+private:
+    bool is_held_from_elsewhere(const QWidget& receiver, const QKeyEvent& key);
+
+    QPointer<QWidget> return_pressed_in_;
 };
 
 // Loads the program's translation from the share directory and the toolkit's own for the same locale: the system's

@@ -3,12 +3,12 @@
 #include "edit_dialogs.h"
 
 #include "compact_dialog.h"
-#include "editor_dialog.h"
 #include "string_lines.h"
 #include "validators.h"
 
 #include <QAbstractItemModel>
 #include <QCoreApplication>
+#include <QDialog>
 #include <QDialogButtonBox>
 #include <QKeyEvent>
 #include <QLabel>
@@ -36,7 +36,7 @@ private:
 
 // Lays out an editor around its data widget and runs it; true for Ok.
 bool run_editor(const QString& title, const QString& value_name, QWidget* data_widget) {
-    EditorDialog dialog;
+    QDialog dialog;
     const Loan loan(data_widget);
     dialog.setWindowTitle(title);
     auto* name_edit = new QLineEdit(value_name);
@@ -62,15 +62,10 @@ bool run_editor(const QString& title, const QString& value_name, QWidget* data_w
 // Registry text is longer than a line edit takes by default.
 void take_any_length(QLineEdit& edit) { edit.setMaxLength(std::numeric_limits<int>::max()); }
 
-// Shift+Return is a new line as Return is, and not a separator inside of one. A key that was held down before, as the
-// Return that has opened the editor, types nothing.
+// Shift+Return is a new line as Return is, and not a separator inside of one.
 class LinesEdit : public QTextEdit {
 protected:
     void keyPressEvent(QKeyEvent* event) override {
-        was_pressed_ = was_pressed_ || !event->isAutoRepeat();
-        if (!was_pressed_) {
-            return;
-        }
         if (event->matches(QKeySequence::InsertLineSeparator)) {
             textCursor().insertBlock();
             ensureCursorVisible();
@@ -78,9 +73,6 @@ protected:
             QTextEdit::keyPressEvent(event);
         }
     }
-
-private:
-    bool was_pressed_ = false;
 };
 
 }  // namespace

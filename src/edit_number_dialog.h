@@ -4,13 +4,13 @@
 // The modal editors for 32-bit and 64-bit numbers, in hexadecimal or decimal.
 #pragma once
 
-#include "editor_dialog.h"
+#include <QDialog>
 
 class QLineEdit;
 class QRadioButton;
 class QValidator;
 
-class EditNumberDialog : public EditorDialog {
+class EditNumberDialog : public QDialog {
     Q_OBJECT
     Q_PROPERTY(bool is_hexadecimal READ is_hexadecimal)
 

@@ -58,8 +58,8 @@ QModelIndex KeysView::in_place(const QModelIndex& key) {
     return {};
 }
 
-// What a command is about is seen before it asks for a name or an answer: also where its branch was closed, or the
-// tree was scrolled.
+// What a command is about is seen before it asks for a name or an answer, and so is what a search has found: also where
+// its branch was closed, or the tree was scrolled.
 void KeysView::show_current() {
     const QModelIndex current = currentIndex();
     if (!current.isValid()) {

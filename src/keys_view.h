@@ -26,6 +26,9 @@ public:
     // same is said then of the moves with the button held, of its release, and of a double click that follows.
     bool take_mouse_from_naming(const QMouseEvent& event);
 
+    // Highlights the current row, opens what it stands in and brings its name into sight.
+    void show_current();
+
     // Moves to the next shown key whose name begins with what is being typed; passes over those without a name.
     void keyboardSearch(const QString& typed) override;
 
@@ -44,7 +47,6 @@ protected:
 
 private:
     bool take_press_from_naming(const QMouseEvent& press);
-    void show_current();
     void make_key(RegModel& keys);
     void delete_key();
     bool confirm_remove();

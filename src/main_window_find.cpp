@@ -125,6 +125,7 @@ void MainWindow::show_hit(const RegModel::FindResult& hit) {
         keys_tree->setExpanded(step, true);
     }
     keys_tree->setCurrentIndex(key);
+    keys_tree->show_current();
     if (!values_proxy->has_key()) {
         // Where the key was current already, and had been let go of.
         reload_values(key);
@@ -133,6 +134,7 @@ void MainWindow::show_hit(const RegModel::FindResult& hit) {
         // The row is one of the sorted table, which a value added or renamed since has left unsorted.
         values_proxy->sort(0, Qt::AscendingOrder);
         values_table->setCurrentIndex(values_proxy->index(hit.value_row, 0));
+        values_table->show_current();
     }
     // What is pressed next is about the hit.
     (hit.value_row >= 0 ? static_cast<QWidget*>(values_table) : keys_tree)->setFocus();

@@ -17,6 +17,9 @@ class ValuesView : public QTableView {
 public:
     explicit ValuesView(QWidget* parent);
 
+    // Highlights the current row and brings it into sight.
+    void show_current();
+
     // Moves to the next value whose name begins with what is being typed.
     void keyboardSearch(const QString& typed) override;
 
@@ -43,7 +46,6 @@ protected:
 private:
     void size_columns(int old_count, int new_count);
     void make_current(const QModelIndex& index);
-    void show_current();
     int row_of(const QString& name, int row) const;
     bool check_key();
     void make_value(ValuesProxyModel& values, int type);

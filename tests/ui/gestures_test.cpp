@@ -253,6 +253,26 @@ private slots:
         QVERIFY2(bytes.contains(QStringLiteral("a\u2026")), qPrintable(bytes.right(30)));
     }
 
+    // It may have chosen Delete in a menu.
+    void return_held_down_does_not_answer_the_question_that_it_has_opened() {
+        const Scene scene;
+        Stage stage(scene);
+        stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Deep"));
+        const QByteArray before = scene.bytes();
+        QTest::keyClick(stage.keys, Qt::Key_Return);
+        DialogHand hand;
+        hand.then([](QWidget* dialog) {
+            QAbstractButton* yes = qobject_cast<QMessageBox*>(dialog)->button(QMessageBox::Yes);
+            QKeyEvent repeated(QEvent::KeyPress, Qt::Key_Return, Qt::NoModifier, QStringLiteral("\r"), true);
+            QApplication::sendEvent(yes, &repeated);
+            QVERIFY(dialog->isVisible());
+            QTest::keyClick(dialog, Qt::Key_Escape);
+        });
+        shared_actions().delete_action->trigger();
+        QVERIFY(hand.is_done());
+        QCOMPARE(scene.bytes(), before);
+    }
+
     // A tip that shows hangs below its view, as an editor does, and what leads away from the row closes editors.
     void a_tip_is_taken_for_no_editor() {
         testkit::HiveLayout layout;

@@ -99,6 +99,9 @@ private slots:
     void hits_data();
     void hits();
     void a_hit_is_opened_and_selected();
+    void a_hit_is_seen_though_it_was_current();
+    void a_hit_far_down_is_seen();
+    void return_held_down_answers_no_dialog_that_it_has_opened();
     void the_end_is_told_and_find_next_asks_again();
     void an_empty_tree_is_searched_to_its_end();
     void the_searching_dialog();
@@ -243,6 +246,83 @@ void SearchTest::a_hit_is_opened_and_selected() {
     QCOMPARE(stage.value_names().join(QLatin1Char(' ')), QStringLiteral("(Default) A b"));
     QVERIFY(!stage.values->currentIndex().isValid());
     QVERIFY(stage.keys->viewport()->rect().intersects(stage.keys->visualRect(deep)));
+}
+
+void SearchTest::a_hit_is_seen_though_it_was_current() {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout& key = hive.root.add("Key").add("found");
+    for (int i = 0; i < 200; ++i) {
+        key.set("v" + std::to_string(i), 4, testkit::pattern(4));
+    }
+    const Scene scene(hive);
+    Stage stage(scene);
+    const QString branch = QStringLiteral("MACHINE\\SYSTEM\\Key");
+    const auto is_in_sight = [](const QAbstractItemView& view) {
+        return view.viewport()->rect().contains(view.visualRect(view.currentIndex()).center());
+    };
+    for (const Search& search : {Search{QStringLiteral("found")}, Search{QStringLiteral("v99"), false, true}}) {
+        stage.select_key(branch);
+        DialogHand hand;
+        hand.then(ask(search));
+        stage.window.show_find_dialog();
+        const QModelIndex hit = stage.keys->currentIndex();
+        QCOMPARE(stage.status(), branch + QStringLiteral("\\found"));
+        stage.keys->collapse(stage.key(branch));
+        stage.values->scrollToTop();
+        stage.keys->setCurrentIndex(hit);
+        stage.keys->collapse(stage.key(branch));
+        hand.then(ask(search));
+        stage.window.show_find_dialog();
+        QVERIFY(hand.is_done());
+        QCOMPARE(stage.keys->currentIndex(), hit);
+        QVERIFY(stage.keys->isExpanded(stage.key(branch)));
+        QVERIFY(is_in_sight(*stage.keys));
+        QCOMPARE(stage.values->currentIndex().isValid(), search.values);
+        QVERIFY(!search.values || is_in_sight(*stage.values));
+    }
+}
+
+void SearchTest::a_hit_far_down_is_seen() {
+    testkit::HiveLayout hive;
+    testkit::KeyLayout* key = &hive.root;
+    for (int level = 0; level < 30; ++level) {
+        key = &key->add("k");
+    }
+    key->add("found");
+    const Scene scene(hive);
+    Stage stage(scene);
+    DialogHand hand;
+    hand.then(ask({QStringLiteral("found")}));
+    stage.window.show_find_dialog();
+    QVERIFY(stage.status().endsWith(QStringLiteral("\\found")));
+    const QRect row = stage.keys->visualRect(stage.keys->currentIndex());
+    QVERIFY(stage.keys->viewport()->rect().contains(QRect(row.topLeft(), QSize(40, row.height()))));
+}
+
+void SearchTest::return_held_down_answers_no_dialog_that_it_has_opened() {
+    const Scene scene;
+    Stage stage(scene);
+    QTest::keyClick(stage.keys, Qt::Key_Return);
+    const auto hold = [](QWidget* widget) {
+        QKeyEvent repeated(QEvent::KeyPress, Qt::Key_Return, Qt::NoModifier, QStringLiteral("\r"), true);
+        QApplication::sendEvent(widget, &repeated);
+    };
+    DialogHand hand;
+    hand.then([&](QWidget* dialog) {
+        hold(dialog->findChild<QLineEdit*>());
+        QVERIFY(dialog->isVisible());
+        dialog->findChild<QLineEdit*>()->setText(QStringLiteral("not there"));
+        QTest::keyClick(dialog->findChild<QLineEdit*>(), Qt::Key_Return);
+    });
+    hand.then([&](QWidget* dialog) {
+        auto* box = qobject_cast<QMessageBox*>(dialog);
+        QVERIFY(box);
+        hold(box->button(QMessageBox::Ok));
+        QVERIFY(dialog->isVisible());
+        QTest::keyClick(box->button(QMessageBox::Ok), Qt::Key_Return);
+    });
+    stage.window.show_find_dialog();
+    QVERIFY(hand.is_done());
 }
 
 void SearchTest::the_end_is_told_and_find_next_asks_again() {
