@@ -68,6 +68,8 @@ void KeysView::show_current() {
     QScrollBar& sideways = *horizontalScrollBar();
     const int before = sideways.value();
     setCurrentIndex(current);
+    // What was opened for it may need the bar to scroll sideways, which takes the room of a row.
+    updateGeometries();
     scrollTo(current);
     // The tree's own scrolling goes to its edge, and the name of a deep key can begin beyond the other.
     sideways.setValue(before);
