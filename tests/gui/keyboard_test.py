@@ -255,8 +255,7 @@ def whole_session(scratch):
         for scene in (keys_session, values_session, commands_in_a_name, menu_key, number_base, deleting, finding):
             step(scene.__doc__)
             scene(session)
-        session.program.keys("alt+f")
-        session.program.menu_open("File")
+        session.program.menu_by_keys("alt+f", "File")
         session.program.keys("Return")
         session.program.ended()
         session.unchanged("the end")
