@@ -1,6 +1,6 @@
 # tallowfen_add_test(NAME name LABEL label... [TIMEOUT seconds] [COST seconds] COMMAND ...): one CTest entry with the
-# environment that every test gets, which is no user's language. COST is for one that takes long: it starts ahead of the others, which run beside it.
-# The target tests_LABEL builds what the tests of that label start.
+# environment that every test gets, which is no user's language. COST is for one that takes long: it starts ahead of the
+# others, which run beside it. The target tests_LABEL builds what the tests of that label start.
 function(tallowfen_add_test)
     cmake_parse_arguments(T "" "NAME;TIMEOUT;COST" "LABEL;COMMAND" ${ARGN})
     add_test(NAME ${T_NAME} COMMAND ${T_COMMAND})
