@@ -41,11 +41,10 @@ QByteArray& file_being_opened() {
             std::rethrow_exception(failure);
         } catch (const std::exception& known) {
             reason = known.what();
-            if (file_being_opened().isEmpty()) {
+            if (file_being_opened().isEmpty())
                 std::fprintf(stderr, "tallowfen: %s\n", reason);
-            } else {
+            else
                 std::fprintf(stderr, "tallowfen: %s: %s\n", file_being_opened().constData(), reason);
-            }
         } catch (...) {
             std::fprintf(stderr, "tallowfen: %s\n", reason);
         }
@@ -59,9 +58,8 @@ bool is_of_the_mouse(QEvent::Type type) {
 }
 
 bool is_in_values_table(const QObject* part) {
-    while (part && !qobject_cast<const ValuesView*>(part)) {
+    while (part && !qobject_cast<const ValuesView*>(part))
         part = part->parent();
-    }
     return part != nullptr;
 }
 
@@ -69,21 +67,18 @@ bool is_in_values_table(const QObject* part) {
 
 Application::Application(int& argc, char** argv) : QApplication(argc, argv) {
     // A bare X session names no icon theme that holds the folder icon of the key tree.
-    if (!QIcon::hasThemeIcon(QStringLiteral("folder"))) {
+    if (!QIcon::hasThemeIcon(QStringLiteral("folder")))
         QIcon::setThemeName(QStringLiteral("Adwaita"));
-    }
     // Where no theme is installed either, the share directory's own folder.png shows. Only from here on: with it the
     // question above would always be answered with yes.
     QIcon::setFallbackSearchPaths(QIcon::fallbackSearchPaths() << share_directory);
 }
 
 bool Application::is_held_from_elsewhere(const QWidget& receiver, const QKeyEvent& key) {
-    if (key.key() != Qt::Key_Return && key.key() != Qt::Key_Enter) {
+    if (key.key() != Qt::Key_Return && key.key() != Qt::Key_Enter)
         return false;
-    }
-    if (!key.isAutoRepeat()) {
+    if (!key.isAutoRepeat())
         return_pressed_in_ = receiver.window();
-    }
     return return_pressed_in_ != receiver.window();
 }
 
@@ -107,11 +102,10 @@ bool Application::notify(QObject* receiver, QEvent* event) {
         return QApplication::notify(receiver, event);
     } catch (const std::exception& failure) {
         FailureReport& report = FailureReport::instance();
-        if (is_in_table) {
+        if (is_in_table)
             report.report_at_shown(failure);
-        } else {
+        else
             report.report_at_current(failure, is_gesture);
-        }
         return true;
     }
 }
@@ -120,9 +114,8 @@ void load_translations(QTranslator& program, QTranslator& toolkit) {
     QString locale;
     for (const QString& name : {QLocale::system().name(), QStringLiteral("en_US")}) {
         locale = name;
-        if (program.load(QStringLiteral("tallowfen_") + name, share_directory)) {
+        if (program.load(QStringLiteral("tallowfen_") + name, share_directory))
             break;
-        }
     }
     QCoreApplication::installTranslator(&program);
     qDebug().noquote().nospace() << share_directory << locale;
@@ -136,11 +129,10 @@ void load_translations(QTranslator& program, QTranslator& toolkit) {
 }
 
 void prepare_streams() {
-    for (int stream = STDIN_FILENO; stream <= STDERR_FILENO; ++stream) {
+    for (int stream = STDIN_FILENO; stream <= STDERR_FILENO; stream++) {
         // The lowest free number is taken, and those below are in use by now.
-        if (fcntl(stream, F_GETFD) == -1 && open("/dev/null", O_RDWR) != stream) {
+        if (fcntl(stream, F_GETFD) == -1 && open("/dev/null", O_RDWR) != stream)
             std::abort();
-        }
     }
     std::signal(SIGXFSZ, SIG_IGN);
     std::signal(SIGPIPE, SIG_IGN);

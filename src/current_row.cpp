@@ -18,7 +18,6 @@ bool is_menu_key(const QEvent& event) {
 
 void ask_for_menu_over_current(QAbstractItemView& view) {
     const QRect seen = view.visualRect(view.currentIndex()) & view.viewport()->rect();
-    if (!seen.isEmpty()) {
+    if (!seen.isEmpty())
         emit view.customContextMenuRequested(seen.center());
-    }
 }

@@ -39,18 +39,16 @@ NameDelegate::NameDelegate(QWidget* main_window) : main_window_(main_window) {
 QWidget* NameDelegate::createEditor(QWidget* parent, const QStyleOptionViewItem& option,
                                     const QModelIndex& index) const {
     QWidget* const editor = QStyledItemDelegate::createEditor(parent, option, index);
-    if (auto* line = qobject_cast<QLineEdit*>(editor)) {
+    if (auto* line = qobject_cast<QLineEdit*>(editor))
         line->setMaxLength(std::numeric_limits<int>::max());
-    }
     return editor;
 }
 
 void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,
                           const QString& refusal) const {
     try {
-        if (!write_back(editor, model, index)) {
+        if (!write_back(editor, model, index))
             tell_later(refusal);
-        }
     } catch (const std::exception& failure) {
         // Told each time: the user has typed a name that is not there now.
         const QString reason = QString::fromLocal8Bit(failure.what());
@@ -60,14 +58,12 @@ void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, cons
 
 bool NameDelegate::eventFilter(QObject* editor, QEvent* event) {
     const int key = event->type() == QEvent::KeyPress ? static_cast<QKeyEvent*>(event)->key() : 0;
-    if (key != Qt::Key_Tab && key != Qt::Key_Backtab) {
+    if (key != Qt::Key_Tab && key != Qt::Key_Backtab)
         return QStyledItemDelegate::eventFilter(editor, event);
-    }
     const QPointer<QWidget> named = qobject_cast<QWidget*>(editor);
     emit commitData(named);
-    if (named) {
+    if (named)
         emit closeEditor(named, NoHint);
-    }
     return true;
 }
 
@@ -76,14 +72,12 @@ bool NameDelegate::write_back(const QWidget& editor, QAbstractItemModel& model, 
     QByteArray property = editor.metaObject()->userProperty().name();
     if (property.isEmpty()) {
         const QItemEditorFactory* factory = itemEditorFactory();
-        if (!factory) {
+        if (!factory)
             factory = QItemEditorFactory::defaultFactory();
-        }
         property = factory->valuePropertyName(model.data(index, Qt::EditRole).userType());
     }
-    if (property.isEmpty()) {
+    if (property.isEmpty())
         return true;
-    }
     const QVariant old_text = model.data(index, Qt::DisplayRole);
     const QVariant new_text = editor.property(property.constData());
     return old_text == new_text || model.setData(index, new_text, Qt::EditRole);
@@ -95,9 +89,8 @@ void NameDelegate::tell_later(const QString& text) const {
 }
 
 void NameDelegate::tell_refused_names() const {
-    while (!pending_refusals_.isEmpty()) {
+    while (!pending_refusals_.isEmpty())
         tell_failure(main_window_, pending_refusals_.takeFirst());
-    }
 }
 
 QString ValueDelegate::displayText(const QVariant& value, const QLocale& /*locale*/) const {
@@ -138,13 +131,11 @@ void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIn
         QStyledItemDelegate::initStyleOption(option, index);
         option->text = with_visible_controls(option->text);
         // Letters that take no room would hide that more follow.
-        if (option->text.size() > most) {
+        if (option->text.size() > most)
             option->text = option->text.left(most) + QChar(0x2026);
-        }
         // Bytes and numbers have one order, whichever way the rest of the window reads.
-        if (index.column() == ValuesModel::DataColumn) {
+        if (index.column() == ValuesModel::DataColumn)
             option->direction = Qt::LeftToRight;
-        }
     } catch (const std::exception& failure) {
         say_unreadable(*option);
         report_value_failure(failure);

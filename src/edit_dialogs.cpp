@@ -82,9 +82,8 @@ bool edit_string(QAbstractItemModel& model, const QString& value_name, const QSt
     QLineEdit edit;
     take_any_length(edit);
     edit.setText(data);
-    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit)) {
+    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit))
         return true;
-    }
     // Compared, since the line edit's own mark of a change misses text that an assistive program has put in.
     const QString text = edit.text();
     return model.setData(data_index, text == data ? data : without_zeros(text), Qt::DisplayRole);

@@ -25,9 +25,8 @@ QValidator* make_hex_validator(int bits, QObject* parent) {
 }
 
 QValidator* make_dec_validator(int bits, QObject* parent) {
-    if (bits > 32) {
+    if (bits > 32)
         return new Uint64Validator(0, std::numeric_limits<quint64>::max(), parent);
-    }
     return new UintValidator(0, std::numeric_limits<quint32>::max(), parent);
 }
 
@@ -79,11 +78,10 @@ bool EditNumberDialog::is_hexadecimal() const { return hex_button->isChecked(); 
 
 void EditNumberDialog::mode_changed(bool hex) {
     data_edit->setValidator(hex ? hex_validator : dec_validator);
-    if (hex) {
+    if (hex)
         convert_text(10, 16);
-    } else {
+    else
         convert_text(16, 10);
-    }
 }
 
 EditDwordDialog::EditDwordDialog(const QString& value_name) : EditNumberDialog(value_name, 32) {}
@@ -93,9 +91,8 @@ void EditDwordDialog::set_value(quint32 number) { data_edit->setText(QString::nu
 quint32 EditDwordDialog::value() const { return data_edit->text().toUInt(nullptr, base()); }
 
 void EditDwordDialog::convert_text(int from_base, int to_base) {
-    if (to_base == 16 || to_base == 10) {
+    if (to_base == 16 || to_base == 10)
         data_edit->setText(QString::number(data_edit->text().toUInt(nullptr, from_base), to_base));
-    }
 }
 
 EditQwordDialog::EditQwordDialog(const QString& value_name) : EditNumberDialog(value_name, 64) {}
@@ -105,7 +102,6 @@ void EditQwordDialog::set_value(quint64 number) { data_edit->setText(QString::nu
 quint64 EditQwordDialog::value() const { return data_edit->text().toULongLong(nullptr, base()); }
 
 void EditQwordDialog::convert_text(int from_base, int to_base) {
-    if (to_base == 16 || to_base == 10) {
+    if (to_base == 16 || to_base == 10)
         data_edit->setText(QString::number(data_edit->text().toULongLong(nullptr, from_base), to_base));
-    }
 }

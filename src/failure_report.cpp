@@ -21,9 +21,8 @@ FailureReport::FailureReport(QObject* parent) : QObject(parent) {}
 
 FailureReport& FailureReport::instance() {
     static QPointer<FailureReport> the_report;
-    if (!the_report) {
+    if (!the_report)
         the_report = new FailureReport(qApp);
-    }
     return *the_report;
 }
 
@@ -35,17 +34,15 @@ void FailureReport::report_row(const QString& key_path, const std::exception& fa
     const QString reason = reason_of(failure);
     int& told = rows_told_[{key_path.left(key_path.lastIndexOf(QLatin1Char('\\'))), reason}];
     // Rows that join a box still to come are counted in its last line.
-    if (told_.contains({key_path, reason}) || (told >= max_lines && pending_.isEmpty())) {
+    if (told_.contains({key_path, reason}) || (told >= max_lines && pending_.isEmpty()))
         return;
-    }
-    ++told;
+    told++;
     tell_once(key_path, reason);
 }
 
 void FailureReport::tell_once(const QString& key_path, const QString& reason) {
-    if (told_.contains({key_path, reason})) {
+    if (told_.contains({key_path, reason}))
         return;
-    }
     pending_.append(mark_told(key_path, reason));
     if (!scheduled_) {
         scheduled_ = true;
@@ -61,9 +58,8 @@ QString FailureReport::mark_told(const QString& key_path, const QString& reason)
 
 void FailureReport::report_at_current(const std::exception& failure, bool from_gesture) {
     const QString reason = reason_of(failure);
-    if (!is_told_below(from_gesture ? current_key_ + QLatin1Char('\\') : QString(), reason)) {
+    if (!is_told_below(from_gesture ? current_key_ + QLatin1Char('\\') : QString(), reason))
         report(current_key_, failure);
-    }
 }
 
 void FailureReport::report_at_shown(const std::exception& failure) { report(shown_key_, failure); }
@@ -82,9 +78,8 @@ void FailureReport::show_pending() {
     // What arrives while the box is open waits for the next one instead of stacking boxes.
     while (!pending_.isEmpty()) {
         QStringList lines = pending_.mid(0, max_lines);
-        if (pending_.size() > max_lines) {
+        if (pending_.size() > max_lines)
             lines.append(tr("More keys cannot be read: %1").arg(pending_.size() - max_lines));
-        }
         pending_.clear();
         tell_failure(QApplication::activeWindow(), lines.join(QLatin1Char('\n')));
     }

@@ -31,11 +31,10 @@ bool ask_find_request(FindRequest& request) {
     auto* whole_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Find whole string"), &dialog);
     auto* wildcard_button = new QRadioButton(QCoreApplication::translate("MainWindow", "Use wildcards"), &dialog);
     substring_button->setChecked(true);
-    if (request.flags == Qt::MatchFixedString) {
+    if (request.flags == Qt::MatchFixedString)
         whole_button->setChecked(true);
-    } else if (request.flags == Qt::MatchWildcard) {
+    else if (request.flags == Qt::MatchWildcard)
         wildcard_button->setChecked(true);
-    }
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, Qt::Horizontal);
     QObject::connect(buttons, &QDialogButtonBox::accepted, &dialog, &QDialog::accept);
     QObject::connect(buttons, &QDialogButtonBox::rejected, &dialog, &QDialog::reject);
@@ -46,9 +45,8 @@ bool ask_find_request(FindRequest& request) {
         layout.addWidget(widget);
     }
     make_compact(dialog, *term_edit);
-    if (dialog.exec() != QDialog::Accepted) {
+    if (dialog.exec() != QDialog::Accepted)
         return false;
-    }
 
     request.flags = whole_button->isChecked()      ? Qt::MatchFixedString
                     : wildcard_button->isChecked() ? Qt::MatchWildcard

@@ -37,23 +37,20 @@ void KeysView::setModel(QAbstractItemModel* model) {
     QTreeView::setModel(model);
     // A long name widens the column and brings a scroll bar instead of being cut.
     setTextElideMode(Qt::ElideNone);
-    if (header()->count() > 0) {
+    if (header()->count() > 0)
         header()->setSectionResizeMode(0, QHeaderView::ResizeToContents);
-    }
     header()->setStretchLastSection(false);
 }
 
 QModelIndex KeysView::in_place(const QModelIndex& key) {
     const QAbstractItemModel* model = key.model();
-    if (!model || model->index(key.row(), 0, key.parent()) == key) {
+    if (!model || model->index(key.row(), 0, key.parent()) == key)
         return key;
-    }
     const QModelIndex parent = key.parent();
-    for (int row = 0; row < model->rowCount(parent); ++row) {
+    for (int row = 0; row < model->rowCount(parent); row++) {
         const QModelIndex sibling = model->index(row, 0, parent);
-        if (sibling.internalPointer() == key.internalPointer()) {
+        if (sibling.internalPointer() == key.internalPointer())
             return sibling;
-        }
     }
     return {};
 }
@@ -62,9 +59,8 @@ QModelIndex KeysView::in_place(const QModelIndex& key) {
 // its branch was closed, or the tree was scrolled.
 void KeysView::show_current() {
     const QModelIndex current = currentIndex();
-    if (!current.isValid()) {
+    if (!current.isValid())
         return;
-    }
     QScrollBar& sideways = *horizontalScrollBar();
     const int before = sideways.value();
     setCurrentIndex(current);
@@ -82,9 +78,8 @@ void KeysView::show_current() {
 }
 
 bool KeysView::event(QEvent* event) {
-    if (!is_menu_key(*event) || !currentIndex().isValid()) {
+    if (!is_menu_key(*event) || !currentIndex().isValid())
         return QTreeView::event(event);
-    }
     if (end_editing_before_change(*this)) {
         meet_failures(this, key_path_of(currentIndex()), [this] {
             show_current();
@@ -100,13 +95,11 @@ QItemSelectionModel::SelectionFlags KeysView::selectionCommand(const QModelIndex
 
 void KeysView::show_keys_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
-    if (std::exchange(menu_is_stale_, false) || !end_editing_before_change(*this)) {
+    if (std::exchange(menu_is_stale_, false) || !end_editing_before_change(*this))
         return;
-    }
     const QModelIndex index = indexAt(point);
-    if (!index.isValid() || index.column() != 0) {
+    if (!index.isValid() || index.column() != 0)
         return;
-    }
     const SharedActions& actions = shared_actions();
     QMenu menu;
     menu.addMenu(tr("New", "menu title"))->addAction(actions.new_key_action);
@@ -117,9 +110,8 @@ void KeysView::show_keys_context_menu(QPoint point) {
 
 void KeysView::run_new_key_action(bool /*checked*/) {
     auto* keys = qobject_cast<RegModel*>(model());
-    if (keys && end_editing_before_change(*this) && currentIndex().isValid()) {
+    if (keys && end_editing_before_change(*this) && currentIndex().isValid())
         meet_failures(this, key_path_of(currentIndex()), [&] { make_key(*keys); });
-    }
 }
 
 void KeysView::make_key(RegModel& keys) {
@@ -137,22 +129,19 @@ void KeysView::make_key(RegModel& keys) {
 
 void KeysView::run_delete_key_action(bool /*checked*/) {
     // The values table answers the same action.
-    if (hasFocus() && model() && end_editing_before_change(*this)) {
+    if (hasFocus() && model() && end_editing_before_change(*this))
         meet_failures(this, key_path_of(currentIndex()), [this] { delete_key(); });
-    }
 }
 
 void KeysView::delete_key() {
     // What is deleted is the key that was asked about.
     const QPersistentModelIndex asked = currentIndex();
     show_current();
-    if (!asked.isValid() || !confirm_remove()) {
+    if (!asked.isValid() || !confirm_remove())
         return;
-    }
     const QModelIndex current = in_place(asked);
-    if (!current.isValid()) {
+    if (!current.isValid())
         return;
-    }
     const QPersistentModelIndex parent = current.parent();
     const int row = current.row();
     const int rows = model()->rowCount(parent);
@@ -172,9 +161,8 @@ void KeysView::delete_key() {
         return_to_kept();
         throw;
     }
-    if (removed) {
+    if (removed)
         return;
-    }
     return_to_kept();
     tell_failure(this, tr("The key could not be deleted."));
 }
@@ -186,13 +174,11 @@ bool KeysView::confirm_remove() {
 }
 
 void KeysView::run_rename_key_action(bool /*checked*/) {
-    if (!hasFocus() || !end_editing_before_change(*this)) {
+    if (!hasFocus() || !end_editing_before_change(*this))
         return;
-    }
     const QModelIndex current = currentIndex();
-    if (!current.isValid()) {
+    if (!current.isValid())
         return;
-    }
     meet_failures(this, key_path_of(current), [&] {
         ask_for_name(current);
         show_current();
@@ -202,33 +188,28 @@ void KeysView::run_rename_key_action(bool /*checked*/) {
 
 // The tree's own asks every shown key for its name, and ends at the first that cannot be read.
 void KeysView::keyboardSearch(const QString& typed) {
-    if (!model() || model()->rowCount() == 0 || typed.isEmpty()) {
+    if (!model() || model()->rowCount() == 0 || typed.isEmpty())
         return;
-    }
     typed_.add(typed);
     const QString wanted = typed_.wanted();
     const QModelIndex current = currentIndex();
-    if (!typed_.is_repeated() && select_if_named(current, wanted)) {
+    if (!typed_.is_repeated() && select_if_named(current, wanted))
         return;
-    }
     // To the end, and once again from the top: the current key may stand in a closed branch, and not be met.
     for (QModelIndex key = indexBelow(current); key.isValid(); key = indexBelow(key)) {
-        if (select_if_named(key, wanted)) {
+        if (select_if_named(key, wanted))
             return;
-        }
     }
     for (QModelIndex key = model()->index(0, 0); key.isValid() && key != current; key = indexBelow(key)) {
-        if (select_if_named(key, wanted)) {
+        if (select_if_named(key, wanted))
             return;
-        }
     }
 }
 
 bool KeysView::select_if_named(const QModelIndex& key, const QString& beginning) {
     try {
-        if (!key.data(Qt::DisplayRole).toString().startsWith(beginning, Qt::CaseInsensitive)) {
+        if (!key.data(Qt::DisplayRole).toString().startsWith(beginning, Qt::CaseInsensitive))
             return false;
-        }
     } catch (const std::exception&) {
         // Told when it comes into sight.
         return false;
@@ -241,9 +222,8 @@ bool KeysView::select_if_named(const QModelIndex& key, const QString& beginning)
 // keys again and again.
 void KeysView::expand_below(const QModelIndex& top) {
     const auto* keys = qobject_cast<const RegModel*>(model());
-    if (!keys || !top.isValid()) {
+    if (!keys || !top.isValid())
         return;
-    }
     // One layout for all of them, instead of one for each.
     scheduleDelayedItemsLayout();
     qint64 left = keys->most_keys();
@@ -254,12 +234,10 @@ void KeysView::expand_below(const QModelIndex& top) {
         try {
             const int rows = keys->rowCount(branch);
             left -= rows;
-            if (rows > 0) {
+            if (rows > 0)
                 expand(branch);
-            }
-            for (int row = 0; row < rows; ++row) {
+            for (int row = 0; row < rows; row++)
                 branches.push_back(keys->index(row, 0, branch));
-            }
         } catch (const std::exception& failure) {
             FailureReport::instance().report(key_path_of(branch), failure);
         }
@@ -296,9 +274,8 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
 bool KeysView::take_mouse_from_naming(const QMouseEvent& event) {
     if (event.type() == QEvent::MouseButtonPress) {
         taken_button_ = Qt::NoButton;
-        if (take_press_from_naming(event)) {
+        if (take_press_from_naming(event))
             taken_button_ = event.button();
-        }
         return taken_button_ != Qt::NoButton;
     }
     // The rows that these would find have moved away under the pointer.
@@ -309,18 +286,15 @@ bool KeysView::take_mouse_from_naming(const QMouseEvent& event) {
 bool KeysView::take_press_from_naming(const QMouseEvent& press) {
     const QPoint point = press.position().toPoint();
     menu_is_stale_ = false;
-    if (state() != QAbstractItemView::EditingState) {
+    if (state() != QAbstractItemView::EditingState)
         return false;
-    }
     const QPersistentModelIndex pressed = indexAt(point);
     finish_editing(*this);
-    if (indexAt(point) == pressed) {
+    if (indexAt(point) == pressed)
         return false;
-    }
     setFocus();
-    if (pressed.isValid()) {
+    if (pressed.isValid())
         setCurrentIndex(pressed);
-    }
     menu_is_stale_ = press.button() == Qt::RightButton;
     return true;
 }

@@ -64,9 +64,8 @@ int main(int argc, char** argv) {
         const QString file = QString::fromLocal8Bit(argv[i + 1]);
         set_file_being_opened(file);
         // A path is text here: one that is none would come to name another file.
-        if (QFile::encodeName(file) != argv[i + 1]) {
+        if (QFile::encodeName(file) != argv[i + 1])
             throw std::runtime_error("Cannot open file");
-        }
         model.add_hive(QString::fromLocal8Bit(argv[i]), file);
     }
     set_file_being_opened(QString());

@@ -30,9 +30,8 @@ namespace {
 int depth_of(const QModelIndex& index) {
     constexpr int deepest = 3;
     int depth = -1;
-    for (QModelIndex step = index; step.isValid() && depth < deepest; step = step.parent()) {
-        ++depth;
-    }
+    for (QModelIndex step = index; step.isValid() && depth < deepest; step = step.parent())
+        depth++;
     return depth;
 }
 
@@ -125,11 +124,10 @@ void MainWindow::make_menus() {
     connect(refresh_action, &QAction::triggered, this, &MainWindow::refresh_views);
     // A key that is clicked again does not become current again, though the actions may be a value's meanwhile.
     connect(qApp, &QApplication::focusChanged, this, [this](QWidget* /*old*/, const QWidget* now) {
-        if (now == keys_tree) {
+        if (now == keys_tree)
             set_key_actions(keys_tree->currentIndex());
-        } else if (now == values_table) {
+        else if (now == values_table)
             value_selected(values_table->currentIndex());
-        }
     });
 }
 
@@ -137,9 +135,8 @@ void MainWindow::set_model(RegModel* model) {
     key_model = model;
     keys_tree->setModel(model);
     keys_tree->setItemDelegate(&key_delegate);
-    if (!model) {
+    if (!model)
         return;
-    }
     connect(model, &QAbstractItemModel::layoutChanged, this, qOverload<>(&MainWindow::update_statusbar));
     // A key that got another name can be far from where it stood. Once its index has followed it.
     connect(
@@ -166,9 +163,8 @@ void MainWindow::show_status(const QModelIndex& key) {
 void MainWindow::update_statusbar() { show_status(keys_tree->currentIndex()); }
 
 void MainWindow::update_statusbar(const QModelIndex& top_left, const QModelIndex& /*bottom_right*/) {
-    if (top_left == keys_tree->currentIndex()) {
+    if (top_left == keys_tree->currentIndex())
         update_statusbar();
-    }
 }
 
 void MainWindow::reload_values(const QModelIndex& current) {
@@ -178,9 +174,8 @@ void MainWindow::reload_values(const QModelIndex& current) {
     show_status(current);
     place_splitter();
     show_values_of(current);
-    if (values_table->selectionModel()) {
+    if (values_table->selectionModel())
         disconnect(values_table->selectionModel(), nullptr, this, nullptr);
-    }
     values_table->setModel(values_proxy.get());
     values_table->setItemDelegate(&value_delegate);
     shared_actions().new_action_group->setEnabled(values_proxy->has_key());
@@ -256,9 +251,8 @@ void MainWindow::value_selected(const QModelIndex& current, const QModelIndex& /
 }
 
 void MainWindow::refresh_views() {
-    if (!end_editing_before_change(*this)) {
+    if (!end_editing_before_change(*this))
         return;
-    }
     if (!values_proxy->has_key() && keys_tree->currentIndex().isValid()) {
         // The key was let go of. It is asked again, and what it throws is told again.
         FailureReport::instance().forget(key_path_of(keys_tree->currentIndex()));
@@ -269,14 +263,12 @@ void MainWindow::refresh_views() {
         // The proxy leaves the current index at its row; the user's next key is meant for the value, not for its place.
         const QModelIndex current = values_proxy->mapToSource(values_table->currentIndex());
         values_proxy->sort(0, Qt::AscendingOrder);
-        if (current.isValid()) {
+        if (current.isValid())
             values_table->setCurrentIndex(values_proxy->mapFromSource(current));
-        }
     });
     // A value that became current has taken the actions, which are about what has the keyboard.
-    if (keys_tree->hasFocus()) {
+    if (keys_tree->hasFocus())
         set_key_actions(keys_tree->currentIndex());
-    }
 }
 
 void MainWindow::closeEvent(QCloseEvent* event) {
@@ -293,9 +285,8 @@ void MainWindow::resizeEvent(QResizeEvent* event) {
 void MainWindow::keyPressEvent(QKeyEvent* event) { QWidget::keyPressEvent(event); }
 
 bool MainWindow::eventFilter(QObject* watched, QEvent* event) {
-    if (event->type() == QEvent::Resize || event->type() == QEvent::Move) {
+    if (event->type() == QEvent::Resize || event->type() == QEvent::Move)
         place_splitter();
-    }
     return QMainWindow::eventFilter(watched, event);
 }
 

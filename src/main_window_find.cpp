@@ -24,9 +24,8 @@ QString failure_of(QFuture<RegModel::FindResult> future) {
         try {
             future.waitForFinished();
         } catch (const QUnhandledException& wrapped) {
-            if (!wrapped.exception()) {
+            if (!wrapped.exception())
                 throw;
-            }
             std::rethrow_exception(wrapped.exception());
         }
     } catch (const std::exception& failure) {
@@ -38,13 +37,11 @@ QString failure_of(QFuture<RegModel::FindResult> future) {
 }  // namespace
 
 void MainWindow::show_find_dialog() {
-    if (!end_editing_before_change(*this)) {
+    if (!end_editing_before_change(*this))
         return;
-    }
     FindRequest request{find_term, find_mode, find_flags};
-    if (!ask_find_request(request)) {
+    if (!ask_find_request(request))
         return;
-    }
     find_flags = request.flags;
     find_mode = request.mode;
     find_term = request.term;
@@ -52,20 +49,18 @@ void MainWindow::show_find_dialog() {
 }
 
 void MainWindow::find_next() {
-    if (can_find_next) {
+    if (can_find_next)
         start_search(QModelIndex());
-    } else {
+    else
         show_find_dialog();
-    }
 }
 
 // Searches as was asked for last. An invalid start goes on where the model's last search stopped.
 void MainWindow::start_search(const QModelIndex& start) {
     // First of all: the search's dialog would take the keyboard from an open editor, and its commit would change the
     // tree under the worker's feet.
-    if (!key_model || !end_editing_before_change(*this)) {
+    if (!key_model || !end_editing_before_change(*this))
         return;
-    }
     if (start.isValid()) {
         key_model->begin_find(start);
         can_find_next = true;
@@ -76,17 +71,15 @@ void MainWindow::start_search(const QModelIndex& start) {
     // Once it has run, the dialog is gone.
     const int result = search_dialog->exec();
     search_dialog = nullptr;
-    if (result == QDialog::Rejected) {
+    if (result == QDialog::Rejected)
         end_search();
-    }
 }
 
 // Returns when the worker has ended, so that nothing reads a tree that the user changes next.
 void MainWindow::end_search() {
     find_future.cancel();
-    if (key_model) {
+    if (key_model)
         key_model->stop_find();
-    }
     [[maybe_unused]] const QString ignored = failure_of(find_future);
     // Whatever it found or threw in the end may still be on its way here; the user has asked not to see it.
     find_watcher.setFuture(QFuture<RegModel::FindResult>());
@@ -121,9 +114,8 @@ void MainWindow::show_find_result() {
 
 void MainWindow::show_hit(const RegModel::FindResult& hit) {
     const QModelIndex key = KeysView::in_place(hit.key);
-    for (QModelIndex step = key; step.isValid(); step = step.parent()) {
+    for (QModelIndex step = key; step.isValid(); step = step.parent())
         keys_tree->setExpanded(step, true);
-    }
     keys_tree->setCurrentIndex(key);
     keys_tree->show_current();
     if (!values_proxy->has_key()) {

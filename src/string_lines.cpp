@@ -24,19 +24,17 @@ StringLines::StringLines(const QStringList& strings) : strings_(strings) {
     for (const QString& string : strings) {
         document.setPlainText(string);
         lines_.append(QStringList());
-        for (QTextBlock block = document.begin(); block.isValid(); block = block.next()) {
+        for (QTextBlock block = document.begin(); block.isValid(); block = block.next())
             lines_.last() += lines_of(block, true);
-        }
     }
 }
 
 void StringLines::fill(QTextEdit& edit) const {
     edit.setPlainText(all_lines().join(QLatin1Char('\n')));
     QTextBlock block = edit.document()->begin();
-    for (int i = 0; i < lines_.size(); ++i) {
-        for (qsizetype line = 0; line < lines_[i].size(); ++line, block = block.next()) {
+    for (int i = 0; i < lines_.size(); i++) {
+        for (qsizetype line = 0; line < lines_[i].size(); line++, block = block.next())
             block.setUserState(i);
-        }
     }
 }
 
@@ -71,17 +69,16 @@ QStringList StringLines::strings_between(qsizetype first, qsizetype end, const Q
     };
     QStringList head;
     qsizetype from = 0;
-    for (; first < end && stands_at(from, lines_[first]); ++first) {
+    for (; first < end && stands_at(from, lines_[first]); first++) {
         head.append(strings_[first]);
         from += lines_[first].size();
     }
     QStringList tail;
     qsizetype to = lines.size();
-    for (; first < end; --end) {
+    for (; first < end; end--) {
         const qsizetype place = to - lines_[end - 1].size();
-        if (place < from || !stands_at(place, lines_[end - 1])) {
+        if (place < from || !stands_at(place, lines_[end - 1]))
             break;
-        }
         tail.prepend(strings_[end - 1]);
         to = place;
     }
@@ -90,8 +87,7 @@ QStringList StringLines::strings_between(qsizetype first, qsizetype end, const Q
 
 QStringList StringLines::all_lines() const {
     QStringList all;
-    for (const QStringList& lines : lines_) {
+    for (const QStringList& lines : lines_)
         all += lines;
-    }
     return all;
 }

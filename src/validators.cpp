@@ -11,20 +11,16 @@ namespace {
 // parse(&ok) reads the whole text as a number of the validator's width.
 template <typename Number, typename Parse>
 QValidator::State judge(const QString& input, Number bottom, Number top, Parse parse) {
-    if (input.isEmpty()) {
+    if (input.isEmpty())
         return QValidator::Intermediate;
-    }
-    if (!std::all_of(input.cbegin(), input.cend(), [](QChar c) { return c.isDigit(); })) {
+    if (!std::all_of(input.cbegin(), input.cend(), [](QChar c) { return c.isDigit(); }))
         return QValidator::Invalid;
-    }
     bool fits = false;
     const Number number = parse(&fits);
-    if (!fits) {
+    if (!fits)
         return QValidator::Invalid;
-    }
-    if (number < bottom) {
+    if (number < bottom)
         return QValidator::Intermediate;
-    }
     return number > top ? QValidator::Invalid : QValidator::Acceptable;
 }
 
@@ -34,11 +30,10 @@ void take_back_invalid_text(QLineEdit& edit) {
     QObject::connect(&edit, &QLineEdit::textChanged, &edit, [&edit, valid = edit.text()](const QString& text) mutable {
         QString judged = text;
         int position = edit.cursorPosition();
-        if (edit.validator()->validate(judged, position) == QValidator::Invalid) {
+        if (edit.validator()->validate(judged, position) == QValidator::Invalid)
             edit.setText(valid);
-        } else {
+        else
             valid = text;
-        }
     });
 }
 

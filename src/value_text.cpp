@@ -15,7 +15,7 @@ QString hexadecimal(const QByteArray& bytes, qsizetype limit) {
     static const char digits[] = "0123456789abcdef";
     const qsizetype count = limit / 3 < bytes.size() ? limit / 3 + 1 : bytes.size();
     QString text(count * 3 - 1, QLatin1Char(' '));
-    for (qsizetype i = 0; i < count; ++i) {
+    for (qsizetype i = 0; i < count; i++) {
         const auto byte = static_cast<unsigned char>(bytes[i]);
         text[i * 3] = QLatin1Char(digits[byte >> 4]);
         text[i * 3 + 1] = QLatin1Char(digits[byte & 15]);
@@ -25,10 +25,9 @@ QString hexadecimal(const QByteArray& bytes, qsizetype limit) {
 
 QString joined(const QStringList& strings, qsizetype limit) {
     QString text;
-    for (qsizetype i = 0; i < strings.size() && text.size() < limit; ++i) {
-        if (i > 0) {
+    for (qsizetype i = 0; i < strings.size() && text.size() < limit; i++) {
+        if (i > 0)
             text += QLatin1Char(' ');
-        }
         text += QStringView(strings[i]).left(std::min(limit, strings[i].size()));
     }
     return text;
@@ -60,9 +59,8 @@ QString value_text(const QVariant& value, qsizetype limit) {
     default:
         break;
     }
-    if (value.typeId() >= QMetaType::User) {
+    if (value.typeId() >= QMetaType::User)
         return QCoreApplication::translate("ValueDelegate", "(value not set)");
-    }
     std::printf("fallback: rendering '%s' as string\n", value.typeName());
     return value.toString();
 }
@@ -70,13 +68,12 @@ QString value_text(const QVariant& value, qsizetype limit) {
 QString with_visible_controls(QString text) {
     // Arrows and U+FFFD: most fonts have them, few the pictures of control characters.
     for (QChar& c : text) {
-        if (c == QChar::LineFeed || c == QChar::LineSeparator || c == QChar::ParagraphSeparator) {
+        if (c == QChar::LineFeed || c == QChar::LineSeparator || c == QChar::ParagraphSeparator)
             c = QChar(0x21b5);
-        } else if (c == QChar::CarriageReturn) {
+        else if (c == QChar::CarriageReturn)
             c = QChar(0x2190);
-        } else if (c != QChar::Tabulation && c.category() == QChar::Other_Control) {
+        else if (c != QChar::Tabulation && c.category() == QChar::Other_Control)
             c = QChar::ReplacementCharacter;
-        }
     }
     return text;
 }

@@ -36,24 +36,18 @@ constexpr int data_column = ValuesModel::DataColumn;
 // The registry type that an action of the "new" group creates; -1 for the action that creates a key.
 int type_created_by(const QAction* action) {
     const SharedActions& actions = shared_actions();
-    if (action == actions.new_string_action) {
+    if (action == actions.new_string_action)
         return REG_SZ;
-    }
-    if (action == actions.new_expand_string_action) {
+    if (action == actions.new_expand_string_action)
         return REG_EXPAND_SZ;
-    }
-    if (action == actions.new_binary_action) {
+    if (action == actions.new_binary_action)
         return REG_BINARY;
-    }
-    if (action == actions.new_dword_action) {
+    if (action == actions.new_dword_action)
         return REG_DWORD;
-    }
-    if (action == actions.new_multi_string_action) {
+    if (action == actions.new_multi_string_action)
         return REG_MULTI_SZ;
-    }
-    if (action == actions.new_qword_action) {
+    if (action == actions.new_qword_action)
         return REG_QWORD;
-    }
     return -1;
 }
 
@@ -90,9 +84,8 @@ ValuesView::ValuesView(QWidget* parent) : QTableView(parent) {
 }
 
 void ValuesView::size_columns(int old_count, int new_count) {
-    if (old_count != 0 || new_count <= data_column) {
+    if (old_count != 0 || new_count <= data_column)
         return;
-    }
     // Wide enough for most names, for the commonest type names and for a line of data; the user widens the rest.
     const int letter = fontMetrics().averageCharWidth();
     setColumnWidth(name_column, letter * 24);
@@ -101,9 +94,8 @@ void ValuesView::size_columns(int old_count, int new_count) {
 }
 
 void ValuesView::value_double_clicked(QModelIndex index) {
-    if (!index.isValid() || !model() || index.column() != name_column || !end_editing_before_change(*this)) {
+    if (!index.isValid() || !model() || index.column() != name_column || !end_editing_before_change(*this))
         return;
-    }
     meet_failures(this, FailureReport::instance().shown_key(), [&] { edit_value(index); });
 }
 
@@ -113,9 +105,8 @@ void ValuesView::edit_value(const QModelIndex& index) {
     const QPersistentModelIndex data_index = model()->index(index.row(), data_column);
     const QVariant datum = data_index.data(Qt::DisplayRole);
     if (datum.typeId() >= QMetaType::User) {
-        if (!edit_string(*model(), name, QString(), data_index)) {
+        if (!edit_string(*model(), name, QString(), data_index))
             tell_failure(this, tr("The value could not be created."));
-        }
         return;
     }
     bool stored = true;
@@ -139,9 +130,8 @@ void ValuesView::edit_value(const QModelIndex& index) {
         tell_failure(this, tr("Data type cannot be edited yet"));
         break;
     }
-    if (!stored) {
+    if (!stored)
         tell_failure(this, tr("The value could not be changed."));
-    }
 }
 
 bool ValuesView::edit_dword(const QString& value_name, quint32 number, const QPersistentModelIndex& data_index) {
@@ -162,9 +152,8 @@ bool ValuesView::edit_qword(const QString& value_name, quint64 number, const QPe
 
 void ValuesView::keyPressEvent(QKeyEvent* event) {
     if (event->key() == Qt::Key_Return && state() != QAbstractItemView::EditingState) {
-        if (!event->isAutoRepeat()) {
+        if (!event->isAutoRepeat())
             value_double_clicked(currentIndex());
-        }
     } else if (event->matches(QKeySequence::Copy) && currentIndex().isValid()) {
         // As it is shown: the toolkit would take bytes for text, and a list of strings for nothing.
         event->accept();
@@ -183,13 +172,12 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
 
 // The table's own reads the data of the rows that it passes, and ends at the first that cannot be read.
 void ValuesView::keyboardSearch(const QString& typed) {
-    if (!model() || model()->rowCount() == 0 || typed.isEmpty()) {
+    if (!model() || model()->rowCount() == 0 || typed.isEmpty())
         return;
-    }
     typed_.add(typed);
     const int rows = model()->rowCount();
     const int first = currentIndex().isValid() ? currentIndex().row() + (typed_.is_repeated() ? 1 : 0) : 0;
-    for (int passed = 0; passed < rows; ++passed) {
+    for (int passed = 0; passed < rows; passed++) {
         const QModelIndex value = model()->index((first + passed) % rows, name_column);
         if (value.data(Qt::DisplayRole).toString().startsWith(typed_.wanted(), Qt::CaseInsensitive)) {
             setCurrentIndex(value);
@@ -206,9 +194,8 @@ void ValuesView::show_current() {
 }
 
 bool ValuesView::event(QEvent* event) {
-    if (!is_menu_key(*event) || !currentIndex().isValid()) {
+    if (!is_menu_key(*event) || !currentIndex().isValid())
         return QTableView::event(event);
-    }
     if (end_editing_before_change(*this)) {
         meet_failures(this, FailureReport::instance().shown_key(), [this] {
             show_current();
@@ -224,9 +211,8 @@ QItemSelectionModel::SelectionFlags ValuesView::selectionCommand(const QModelInd
 
 void ValuesView::show_values_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
-    if (!end_editing_before_change(*this)) {
+    if (!end_editing_before_change(*this))
         return;
-    }
     const SharedActions& actions = shared_actions();
     const QModelIndex index = indexAt(point);
     QMenu menu;
@@ -235,9 +221,8 @@ void ValuesView::show_values_context_menu(QPoint point) {
         menu.addAction(actions.delete_action);
         menu.addAction(actions.rename_action);
         const int row = index.row();
-        if (menu.exec(viewport()->mapToGlobal(point)) == edit_action) {
+        if (menu.exec(viewport()->mapToGlobal(point)) == edit_action)
             value_double_clicked(model()->index(row, name_column));
-        }
         return;
     }
     add_new_actions(*menu.addMenu(tr("New", "menu title")));
@@ -247,9 +232,8 @@ void ValuesView::show_values_context_menu(QPoint point) {
 void ValuesView::run_new_value_action(QAction* action) {
     auto* values = qobject_cast<ValuesProxyModel*>(model());
     const int type = type_created_by(action);
-    if (values && type >= 0 && values->has_key() && end_editing_before_change(*this)) {
+    if (values && type >= 0 && values->has_key() && end_editing_before_change(*this))
         meet_failures(this, FailureReport::instance().shown_key(), [&] { make_value(*values, type); });
-    }
 }
 
 void ValuesView::make_value(ValuesProxyModel& values, int type) {
@@ -271,9 +255,8 @@ void ValuesView::make_current(const QModelIndex& index) {
 
 void ValuesView::run_delete_value_action(bool /*checked*/) {
     // The key tree answers the same action.
-    if (hasFocus() && model() && end_editing_before_change(*this)) {
+    if (hasFocus() && model() && end_editing_before_change(*this))
         meet_failures(this, FailureReport::instance().shown_key(), [this] { delete_value(); });
-    }
 }
 
 // Where a value that was in `row` stands by now; `row` again, as long as there is one, where it has gone. The first
@@ -281,10 +264,9 @@ void ValuesView::run_delete_value_action(bool /*checked*/) {
 int ValuesView::row_of(const QString& name, int row) const {
     const int rows = model()->rowCount();
     if (row > 0 && spoken_name(*model(), row) != name) {
-        for (int other = rows - 1; other > 0; --other) {
-            if (spoken_name(*model(), other) == name) {
+        for (int other = rows - 1; other > 0; other--) {
+            if (spoken_name(*model(), other) == name)
                 return other;
-            }
         }
     }
     return qMin(row, rows - 1);
@@ -294,18 +276,16 @@ void ValuesView::delete_value() {
     // What is deleted is the value that was asked about. The other cells of its row cannot be highlighted, and do not
     // say which value it is.
     const QPersistentModelIndex asked = currentIndex().siblingAtColumn(name_column);
-    if (!asked.isValid()) {
+    if (!asked.isValid())
         return;
-    }
     setCurrentIndex(asked);
     show_current();
     if (QMessageBox::question(this, tr("Confirm Value Removal"), tr("Are you sure you want to delete this value?"),
                               QMessageBox::Yes | QMessageBox::No) != QMessageBox::Yes) {
         return;
     }
-    if (!asked.isValid()) {
+    if (!asked.isValid())
         return;
-    }
     const int row = asked.row();
     const QString name = spoken_name(*model(), row);
     // A removal that was announced and then did not come to be has moved the selection to a neighbour, and the table
@@ -329,13 +309,11 @@ void ValuesView::delete_value() {
 }
 
 void ValuesView::run_rename_value_action(bool /*checked*/) {
-    if (!hasFocus() || !end_editing_before_change(*this)) {
+    if (!hasFocus() || !end_editing_before_change(*this))
         return;
-    }
     const QModelIndex current = currentIndex();
-    if (!current.isValid()) {
+    if (!current.isValid())
         return;
-    }
     meet_failures(this, FailureReport::instance().shown_key(), [&] {
         ask_for_name(current);
         show_current();
@@ -347,9 +325,8 @@ void ValuesView::run_rename_value_action(bool /*checked*/) {
 // not say how many values it has, which is reported.
 bool ValuesView::check_key() {
     try {
-        if (model()) {
+        if (model())
             model()->rowCount();
-        }
         return true;
     } catch (const std::exception& failure) {
         FailureReport::instance().report_at_shown(failure);
@@ -359,9 +336,8 @@ bool ValuesView::check_key() {
 }
 
 void ValuesView::paintEvent(QPaintEvent* event) {
-    if (!check_key()) {
+    if (!check_key())
         return;
-    }
     // Last net, should a read fail that has just gone well.
     try {
         QTableView::paintEvent(event);
@@ -371,9 +347,8 @@ void ValuesView::paintEvent(QPaintEvent* event) {
 }
 
 bool ValuesView::eventFilter(QObject* watched, QEvent* event) {
-    if (watched == horizontalHeader()->viewport() && event->type() == QEvent::Paint && !check_key()) {
+    if (watched == horizontalHeader()->viewport() && event->type() == QEvent::Paint && !check_key())
         return true;
-    }
     return QTableView::eventFilter(watched, event);
 }
 
@@ -381,18 +356,16 @@ bool ValuesView::eventFilter(QObject* watched, QEvent* event) {
 QString ValuesView::cut_text(const QModelIndex& index) const {
     constexpr qsizetype longest = 1000;
     QString shown = shown_text(index, longest + 1);
-    if (shown.size() > longest) {
+    if (shown.size() > longest)
         shown = shown.left(longest) + QChar(0x2026);
-    }
     const bool is_cut =
         shown.size() > ValueDelegate::shortest_cut || sizeHintForIndex(index).width() > columnWidth(index.column());
     return is_cut ? shown : QString();
 }
 
 bool ValuesView::viewportEvent(QEvent* event) {
-    if (event->type() != QEvent::ToolTip) {
+    if (event->type() != QEvent::ToolTip)
         return QTableView::viewportEvent(event);
-    }
     const auto* help = static_cast<QHelpEvent*>(event);
     QString text;
     try {

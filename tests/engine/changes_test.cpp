@@ -222,7 +222,7 @@ TEST_F(Changing, the_longest_subkey_name_is_raised_beside_the_flags_that_windows
 }
 
 TEST_F(Changing, five_hundred_keys_grow_the_leaf_and_the_hive) {
-    for (int i = 0; i < 500; ++i)
+    for (int i = 0; i < 500; i++)
         ASSERT_EQ(scene.Create("Empty\\k" + std::to_string((i * 7919) % 1000)), 0);
     EXPECT_EQ(scene.Check(), "");
     EXPECT_EQ(find("Empty")->children.size(), 500U);
@@ -375,11 +375,11 @@ TEST_F(Changing, data_that_begins_like_a_record_is_updated_in_its_own_cell) {
 }
 
 TEST_F(Changing, two_hundred_values_grow_the_list) {
-    for (int i = 0; i < 200; ++i) {
+    for (int i = 0; i < 200; i++) {
         ASSERT_EQ(scene.Set("Empty", "v" + std::to_string(i), 3, pattern(static_cast<size_t>(i))), 0);
         ASSERT_EQ(scene.Check(), "") << i;
     }
-    for (int i = 0; i < 200; ++i)
+    for (int i = 0; i < 200; i++)
         EXPECT_EQ(data("Empty", "v" + std::to_string(i)), pattern(static_cast<size_t>(i)));
 }
 

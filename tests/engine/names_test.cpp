@@ -204,12 +204,12 @@ TEST(BaseBlock, an_append_keeps_every_byte_but_size_and_checksum) {
     for (uint32_t position = 48; position < 508; position += 4)
         hive.put_base(position, position * 2654435761U);
     hive.fix_checksum();
-    for (size_t position = 512; position < 4096; ++position)
+    for (size_t position = 512; position < 4096; position++)
         hive.bytes[position] = static_cast<uint8_t>(position);
     Scene scene(hive.bytes);
     ASSERT_TRUE(scene.is_open());
     EXPECT_EQ(scene.Create("New"), 0);
-    for (size_t position = 0; position < 4096; ++position)
+    for (size_t position = 0; position < 4096; position++)
         if ((position < 40 || position >= 44) && (position < 508 || position >= 512)) {
             EXPECT_EQ(scene.bytes()[position], hive.bytes[position]) << position;
         }
@@ -218,7 +218,7 @@ TEST(BaseBlock, an_append_keeps_every_byte_but_size_and_checksum) {
 TEST(Depth, a_key_lies_at_most_512_levels_below_the_root) {
     Scene scene;
     std::string path = "k";
-    for (int level = 1; level < 512; ++level)
+    for (int level = 1; level < 512; level++)
         path += "\\k";
     EXPECT_EQ(scene.Create(path), 0);
     EXPECT_EQ(scene.Check(), "");
@@ -229,7 +229,7 @@ TEST(Depth, a_key_lies_at_most_512_levels_below_the_root) {
 
 TEST(Leaf, of_65535_entries_takes_no_other) {
     HiveLayout layout;
-    for (int i = 0; i < 65534; ++i)
+    for (int i = 0; i < 65534; i++)
         layout.root.add("k" + std::to_string(i));
     Scene scene(layout);
     ASSERT_TRUE(scene.is_open());
@@ -243,7 +243,7 @@ TEST(Leaf, of_65535_entries_takes_no_other) {
 TEST(Leaf, of_65535_entries_takes_none_from_another_leaf) {
     HiveLayout layout;
     KeyLayout& many = layout.root.add("many");
-    for (int i = 0; i < 65535; ++i)
+    for (int i = 0; i < 65535; i++)
         many.add("k" + std::to_string(i));
     many.add("z");
     many.per_leaf = 65535;

@@ -263,14 +263,14 @@ TEST(OpenKey, keys_below_an_index_root_are_found_in_every_leaf_kind) {
         many.own_leaf = true;
         many.leaf = leaf;
         many.per_leaf = 4;
-        for (int i = 10; i < 31; ++i)
+        for (int i = 10; i < 31; i++)
             many.add("k" + std::to_string(i));
         Scene scene(layout);
         ASSERT_TRUE(scene.is_open());
         Handle key = scene.OpenKey("many");
         const std::vector<std::string> names = subkey_names(key.get());
         ASSERT_EQ(names.size(), 21U);
-        for (uint32_t i = 0; i < 21; ++i) {
+        for (uint32_t i = 0; i < 21; i++) {
             EXPECT_EQ(names[i], "k" + std::to_string(10 + i));
             Handle child;
             uint32_t index = 99;

@@ -109,7 +109,7 @@ TEST_P(OwnWideNameRoom, is_as_the_contract_says) {
                              nullptr, nullptr, nullptr),
               row.status);
     EXPECT_EQ(size, row.size);
-    for (size_t i = 0; i < 7; ++i)
+    for (size_t i = 0; i < 7; i++)
         EXPECT_EQ(name[i], static_cast<uint16_t>(row.text[i])) << i;
 }
 
@@ -130,7 +130,7 @@ TEST_P(ValueNameRoom, is_as_the_contract_says) {
     uint32_t size = row.room;
     EXPECT_EQ(REnumValueW(key.get(), 0, name, &size, nullptr, nullptr, nullptr), row.status);
     EXPECT_EQ(size, row.size);
-    for (size_t i = 0; i < 7; ++i)
+    for (size_t i = 0; i < 7; i++)
         EXPECT_EQ(name[i], static_cast<uint16_t>(row.text[i])) << i;
 }
 

@@ -39,7 +39,7 @@ struct Comparer {
     }
 
     void compare_value(RegistryKey* key, uint32_t index, const Value& value) {
-        ++values;
+        values++;
         std::vector<uint16_t> name(value.stored_name.size() + 2);
         auto name_size = static_cast<uint32_t>(name.size() * 2);
         uint32_t type = 0;
@@ -55,16 +55,16 @@ struct Comparer {
     }
 
     void compare(RegistryKey* handle, const Key& key) {
-        ++keys;
+        keys++;
         uint32_t subkeys = 0;
         uint32_t value_count = 0;
         if (RQueryInfoKeyA(handle, nullptr, nullptr, nullptr, nullptr, &subkeys, nullptr, nullptr, &value_count,
                            nullptr, nullptr, nullptr, nullptr) != 0 ||
             subkeys != key.children.size() || value_count != key.values.size())
             return differ("counts of " + utf8(key.name));
-        for (uint32_t i = 0; i < value_count; ++i)
+        for (uint32_t i = 0; i < value_count; i++)
             compare_value(handle, i, key.values[i]);
-        for (uint32_t i = 0; i < subkeys; ++i) {
+        for (uint32_t i = 0; i < subkeys; i++) {
             compare_name(handle, i, key.children[i]);
             Handle child;
             if (ROpenSubKey(handle, i, child.out()) != 0)

@@ -161,7 +161,7 @@ TEST_P(ValuesLeft, is_half_rounded_down) {
     HiveLayout layout;
     KeyLayout& top = layout.root.add("Top");
     KeyLayout& key = top.add("Key");
-    for (size_t i = 0; i < GetParam(); ++i)
+    for (size_t i = 0; i < GetParam(); i++)
         key.set("v" + std::to_string(i), 4, {1, 2, 3, 4});
     Scene scene(layout);
     EXPECT_EQ(scene.Delete("Top\\Key"), 0);

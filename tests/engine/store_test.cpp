@@ -61,7 +61,7 @@ TEST(Allocator, a_new_bin_holds_x_and_its_size_and_the_first_bin_the_size_of_all
     Scene scene(layout);
     const uint32_t bin = get32(scene.bytes(), 40);
     engine::allocate(store_of(scene), 8);
-    for (uint32_t i = 12; i < 28; ++i)
+    for (uint32_t i = 12; i < 28; i++)
         EXPECT_EQ(scene.bytes()[4096 + bin + i], 0x78);
     EXPECT_EQ(get32(scene.bytes(), 4096 + uint64_t{bin} + 28), 4096U);
     EXPECT_EQ(get32(scene.bytes(), 4096 + 28), bin + 4096);

@@ -41,13 +41,12 @@ bool as_8bit(const std::string& text, std::string& narrow) {
         const auto byte = static_cast<uint8_t>(text[i]);
         if (byte == 0)
             return true;
-        if (byte < 0x80) {
+        if (byte < 0x80)
             narrow += text[i];
-        } else if ((byte & 0xFC) == 0xC0 && i + 1 < text.size()) {
+        else if ((byte & 0xFC) == 0xC0 && i + 1 < text.size())
             narrow += static_cast<char>((byte & 3) << 6 | (static_cast<uint8_t>(text[++i]) & 0x3F));
-        } else {
+        else
             return false;
-        }
     }
     return true;
 }

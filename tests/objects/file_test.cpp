@@ -206,9 +206,8 @@ QStringList browse(RegKey* key) {
     attempt([&] { values = key->value_count(); });
     for (int i = 0; i < values; i++)
         attempt([&] { key->read_value(i); });
-    for (int i = 0; i < key->child_count(); i++) {
+    for (int i = 0; i < key->child_count(); i++)
         attempt([&] { troubles += browse(static_cast<RegKey*>(key->child(i))); });
-    }
     return troubles;
 }
 

@@ -28,9 +28,8 @@ private slots:
     void the_icons_of_the_values_load() {
         for (const char* name : {"type_string.ico", "type_binary.ico"}) {
             const QIcon icon(QStringLiteral(TALLOWFEN_SHARE_DIR) + QLatin1String(name));
-            for (const int size : {16, 32, 64}) {
+            for (const int size : {16, 32, 64})
                 QCOMPARE(icon.pixmap(size).size(), QSize(size, size));
-            }
         }
     }
 };

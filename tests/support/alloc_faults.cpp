@@ -23,7 +23,7 @@ int64_t most_held = 0;
 bool fails(size_t size) {
     if (!active)
         return false;
-    ++asked;
+    asked++;
     largest_request = std::max<uint64_t>(largest_request, size);
     const bool now = failing != 0 && (lasting_failure ? asked >= failing : asked == failing);
     has_failed = has_failed || now;

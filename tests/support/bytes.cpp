@@ -30,7 +30,7 @@ std::string hex(const Bytes& bytes) {
 
 std::string utf8(const std::u16string& text) {
     std::string out;
-    for (size_t i = 0; i < text.size(); ++i) {
+    for (size_t i = 0; i < text.size(); i++) {
         uint32_t code = text[i];
         const bool high = code >= 0xD800 && code < 0xDC00;
         if (high && i + 1 < text.size() && text[i + 1] >= 0xDC00 && text[i + 1] < 0xE000)

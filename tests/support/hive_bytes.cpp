@@ -15,7 +15,7 @@ public:
     explicit Builder(const HiveLayout& layout) : layout_(layout) { hive_.bytes.assign(base_block_bytes, 0); }
 
     LaidHive build() {
-        for (size_t i = 0; i < std::max<size_t>(layout_.security_records, 1); ++i)
+        for (size_t i = 0; i < std::max<size_t>(layout_.security_records, 1); i++)
             hive_.security.push_back(add_cell(20 + 24));
         const uint32_t root = lay_key(layout_.root, "", none, true);
         write_security();
@@ -125,7 +125,7 @@ private:
         uint32_t longest = 0;
         uint32_t largest = 0;
         places.value_list = add_cell(key.values.size() * 4);
-        for (size_t i = 0; i < key.values.size(); ++i) {
+        for (size_t i = 0; i < key.values.size(); i++) {
             const ValueLayout& value = key.values[i];
             places.values.push_back(lay_value(value));
             hive_.put32(places.value_list, static_cast<uint32_t>(i * 4), places.values.back().record);
@@ -171,7 +171,7 @@ private:
         sign(places.data, "db");
         hive_.put16(places.data, 2, static_cast<uint16_t>(count));
         hive_.put32(places.data, 4, places.segment_list);
-        for (size_t i = 0; i < count; ++i) {
+        for (size_t i = 0; i < count; i++) {
             const size_t first = i * segment_bytes;
             const size_t last = std::min<size_t>(data.size(), first + segment_bytes);
             // A segment's cell has 4 bytes more than it gives to the data.
@@ -216,7 +216,7 @@ private:
         const uint32_t leaf = add_cell(4 + (last - first) * width);
         sign(leaf, kind == Leaf::plain ? "li" : kind == Leaf::hash ? "lh" : "lf");
         hive_.put16(leaf, 2, static_cast<uint16_t>(last - first));
-        for (size_t i = first; i < last; ++i) {
+        for (size_t i = first; i < last; i++) {
             const uint32_t field = 4 + static_cast<uint32_t>(i - first) * width;
             hive_.put32(leaf, field, offsets[i]);
             if (kind == Leaf::hash)
@@ -241,14 +241,14 @@ private:
         const uint32_t root = add_cell(4 + leaves.size() * 4);
         sign(root, "ri");
         hive_.put16(root, 2, static_cast<uint16_t>(leaves.size()));
-        for (size_t i = 0; i < leaves.size(); ++i)
+        for (size_t i = 0; i < leaves.size(); i++)
             hive_.put32(root, 4 + static_cast<uint32_t>(i * 4), leaves[i]);
         return root;
     }
 
     void write_security() {
         const size_t count = hive_.security.size();
-        for (size_t i = 0; i < count; ++i) {
+        for (size_t i = 0; i < count; i++) {
             const uint32_t cell = hive_.security[i];
             sign(cell, "sk");
             hive_.put32(cell, 4, hive_.security[(i + 1) % count]);
@@ -312,7 +312,7 @@ Bytes text_data(const std::string& text) {
 
 Bytes pattern(size_t n, uint8_t seed) {
     Bytes data(n);
-    for (size_t i = 0; i < n; ++i)
+    for (size_t i = 0; i < n; i++)
         data[i] = static_cast<uint8_t>(seed + i * 7 + i / 256);
     return data;
 }

@@ -134,7 +134,7 @@ private:
         const Cell cell = record(offset, "nk", 76, visit.parent);
         if (cell.room == 0)
             return;
-        ++result_.keys;
+        result_.keys++;
         const uint64_t p = cell.position;
         if (cell.room - 76 < get16(bytes_, p + 72))
             fault("name", offset, "the key's name is longer than its cell");
@@ -175,7 +175,7 @@ private:
         if (list.room / 4 < count)
             return fault("count", offset, "the value list is shorter than its count");
         std::set<std::u16string> names;
-        for (uint32_t i = 0; i < count; ++i)
+        for (uint32_t i = 0; i < count; i++)
             check_value(offset, p, get32(bytes_, list.position + uint64_t{i} * 4), names);
     }
 
@@ -183,7 +183,7 @@ private:
         const Cell cell = record(offset, "vk", 20, key);
         if (cell.room == 0)
             return;
-        ++result_.values;
+        result_.values++;
         const uint64_t p = cell.position;
         const uint16_t length = get16(bytes_, p + 2);
         const bool narrow = (get16(bytes_, p + 16) & 1) != 0;
@@ -221,7 +221,7 @@ private:
         if (list.room / 4 < count)
             return fault("data", offset, "the segment list is shorter than its count");
         uint64_t total = 0;
-        for (uint32_t i = 0; i < count; ++i)
+        for (uint32_t i = 0; i < count; i++)
             total += std::min(16344U, reach(get32(bytes_, list.position + i * 4), "segment", offset).room);
         if (total < size)
             fault("data", offset, "the segments hold less than the data's size");
@@ -238,7 +238,7 @@ private:
             fault("count", visit.offset,
                   "subkey count " + std::to_string(count) + ", index " + std::to_string(index.keys.size()));
         std::u16string last;
-        for (size_t i = 0; i < index.keys.size(); ++i) {
+        for (size_t i = 0; i < index.keys.size(); i++) {
             const std::u16string name = check_entry(visit.offset, p, index, i);
             if (i != 0 && !(last < name))
                 fault("order", index.keys[i], utf8(last) + " stands before " + utf8(name));
@@ -269,7 +269,7 @@ private:
 
     static uint32_t hint(const std::u16string& name) {
         uint32_t word = 0;
-        for (size_t i = 0; i < 4 && i < name.size(); ++i)
+        for (size_t i = 0; i < 4 && i < name.size(); i++)
             word |= static_cast<uint32_t>(name[i] & 0xFF) << (8 * i);
         return word;
     }
@@ -303,7 +303,7 @@ private:
             return fault("index", key, "an index root below an index root");
         if ((cell.room - 4) / (wide ? 8 : 4) < count)
             return fault("count", key, "an index longer than its cell at " + std::to_string(offset));
-        for (uint32_t i = 0; i < count; ++i) {
+        for (uint32_t i = 0; i < count; i++) {
             const uint64_t at = cell.position + 4 + uint64_t{i} * (wide ? 8 : 4);
             if (root) {
                 list_index(key, get32(bytes_, at), level + 1, index);
@@ -355,7 +355,7 @@ private:
     }
 
     void collect_leaks() {
-        for (uint32_t i = 0; i < state_.size(); ++i) {
+        for (uint32_t i = 0; i < state_.size(); i++) {
             if (state_[i] != used)
                 continue;
             const uint16_t head = get16(bytes_, base_block_bytes + uint64_t{i} * 8 + 4);

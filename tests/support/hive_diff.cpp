@@ -15,7 +15,7 @@ std::map<Ordinal, const Key*> keys_by_path(const Hive& hive) {
     for (const FlatKey& flat : flatten(hive)) {
         int ordinal = 0;
         while (!map.emplace(Ordinal{flat.path, ordinal}, flat.key).second)
-            ++ordinal;
+            ordinal++;
     }
     return map;
 }
@@ -25,7 +25,7 @@ std::map<Ordinal, const Value*> values_by_name(const Key& key) {
     for (const Value& value : key.values) {
         int ordinal = 0;
         while (!map.emplace(Ordinal{value.name, ordinal}, &value).second)
-            ++ordinal;
+            ordinal++;
     }
     return map;
 }

@@ -114,7 +114,7 @@ private:
             complain("value list shorter than its count", offset);
             count = list.room / 4;
         }
-        for (uint64_t i = 0; i < count && spend_entry(); ++i) {
+        for (uint64_t i = 0; i < count && spend_entry(); i++) {
             Value value;
             if (read_value(get32(bytes_, list.position + i * 4), value))
                 key.values.push_back(std::move(value));
@@ -168,7 +168,7 @@ private:
         const uint32_t count = get16(bytes_, record.position + 2);
         if (!list.ok || list.room < count * 4U)
             return;
-        for (uint32_t i = 0; i < count && value.data.size() < value.size; ++i) {
+        for (uint32_t i = 0; i < count && value.data.size() < value.size; i++) {
             const Place segment = place(get32(bytes_, list.position + i * 4));
             const uint64_t n = std::min<uint64_t>(segment_bytes, value.size - value.data.size());
             if (!segment.ok || segment.room < n)
@@ -204,7 +204,7 @@ private:
             complain("index shorter than its count", offset);
             count = (at.room - 4) / width;
         }
-        for (uint64_t i = 0; i < count && spend_entry(); ++i) {
+        for (uint64_t i = 0; i < count && spend_entry(); i++) {
             const uint32_t entry = get32(bytes_, at.position + 4 + i * width);
             if (root)
                 list_index(entry, level + 1, offsets);
@@ -216,7 +216,7 @@ private:
     bool spend_entry() {
         if (entry_budget_ == 0)
             return false;
-        --entry_budget_;
+        entry_budget_--;
         return true;
     }
 
@@ -277,7 +277,7 @@ std::vector<FlatKey> flatten(const Hive& hive) {
 Totals count(const Hive& hive) {
     Totals totals;
     for (const FlatKey& flat : flatten(hive)) {
-        ++totals.keys;
+        totals.keys++;
         totals.values += flat.key->values.size();
         totals.wide_keys += flat.key->name_8bit ? 0 : 1;
     }

@@ -31,7 +31,7 @@ bool MemoryFile::strikes(Call call, uint64_t number) {
 
 int32_t MemoryFile::seek(void* device, int32_t offset, int32_t whence) {
     auto& file = *static_cast<MemoryFile*>(device);
-    ++file.counts_.seeks;
+    file.counts_.seeks++;
     if (file.strikes(Call::seek, file.counts_.seeks))
         return -1;
     int64_t from = 0;
@@ -48,7 +48,7 @@ int32_t MemoryFile::seek(void* device, int32_t offset, int32_t whence) {
 
 int32_t MemoryFile::read(void* device, void* buffer, int32_t length) {
     auto& file = *static_cast<MemoryFile*>(device);
-    ++file.counts_.reads;
+    file.counts_.reads++;
     if (length < 0)
         return -1;
     auto n = static_cast<uint64_t>(length);
@@ -69,7 +69,7 @@ int32_t MemoryFile::read(void* device, void* buffer, int32_t length) {
 
 int32_t MemoryFile::write(void* device, const void* buffer, int32_t length) {
     auto& file = *static_cast<MemoryFile*>(device);
-    ++file.counts_.writes;
+    file.counts_.writes++;
     if (length < 0)
         return -1;
     auto n = static_cast<uint64_t>(length);

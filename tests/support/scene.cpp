@@ -127,7 +127,7 @@ std::string Scene::Check(size_t expected_leaks) const {
 
 std::vector<std::string> subkey_names(RegistryKey* key) {
     std::vector<std::string> names;
-    for (uint32_t index = 0;; ++index) {
+    for (uint32_t index = 0;; index++) {
         char name[512] = {};
         uint32_t size = sizeof name;
         const int32_t status = REnumKeyExA(key, index, name, &size, nullptr, nullptr, nullptr);

@@ -18,7 +18,7 @@ TEST(SupportReal, every_sound_hive_has_the_counts_that_its_index_says) {
         const Totals totals = count(hive);
         EXPECT_EQ(totals.keys, real.keys);
         EXPECT_EQ(totals.values, real.values);
-        for (size_t i = 0; i < hive.complaints.size() && i < 5; ++i)
+        for (size_t i = 0; i < hive.complaints.size() && i < 5; i++)
             printf("%s: %s\n", real.name.c_str(), hive.complaints[i].c_str());
     }
 }

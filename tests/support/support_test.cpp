@@ -26,7 +26,7 @@ HiveLayout sample() {
     a.add("Inner").set("Big", 3, pattern(40000)).storage = Storage::big;
     KeyLayout& many = layout.root.add("many_keys");
     many.per_leaf = 3;
-    for (int i = 0; i < 10; ++i)
+    for (int i = 0; i < 10; i++)
         many.add("k" + std::to_string(i));
     KeyLayout& wide = layout.root.add("Wide");
     wide.wide_name = true;
@@ -77,7 +77,7 @@ TEST(Support, no_free_space_leaves_no_free_cell) {
 HiveLayout chain(int keys) {
     HiveLayout layout;
     KeyLayout* last = &layout.root;
-    for (int i = 0; i < keys; ++i)
+    for (int i = 0; i < keys; i++)
         last = &last->add("Below");
     return layout;
 }
@@ -282,7 +282,7 @@ TEST(Support, a_write_to_a_file_fails_when_told) {
     {
         const WriteFaults faults(2, true);
         EXPECT_EQ(write(file.descriptor, "1", 1), 1);
-        for (int i = 0; i < 3; ++i)
+        for (int i = 0; i < 3; i++)
             EXPECT_EQ(write(file.descriptor, "2", 1), -1);
         EXPECT_EQ(errno, ENOSPC);
     }

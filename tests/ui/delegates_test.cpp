@@ -32,9 +32,8 @@ public:
     bool setData(const QModelIndex& index, const QVariant& value, int role) override {
         written.append(value);
         roles.append(role);
-        if (throws) {
+        if (throws)
             throw std::runtime_error("as asked");
-        }
         return !refuses && QStandardItemModel::setData(index, value, role);
     }
 
@@ -50,9 +49,8 @@ public:
     int rowCount(const QModelIndex& parent = {}) const override { return parent.isValid() ? 0 : 3; }
     int columnCount(const QModelIndex& parent = {}) const override { return parent.isValid() ? 0 : 3; }
     QVariant data(const QModelIndex& /*index*/, int role) const override {
-        if (role == Qt::DisplayRole) {
+        if (role == Qt::DisplayRole)
             throw std::invalid_argument("index");
-        }
         return {};
     }
 };
@@ -218,11 +216,10 @@ void DelegatesTest::a_refused_name_is_told() {
     model.refuses = true;
     QLineEdit editor(QStringLiteral("other"));
     std::unique_ptr<QStyledItemDelegate> delegate;
-    if (is_key) {
+    if (is_key)
         delegate = std::make_unique<KeyDelegate>(&window);
-    } else {
+    else
         delegate = std::make_unique<ValueDelegate>(&window);
-    }
     DialogHand hand;
     hand.then_press(QMessageBox::Ok);
     delegate->setModelData(&editor, &model, model.index(0, 0));
@@ -256,7 +253,7 @@ void DelegatesTest::a_lost_name_is_told_with_its_key() {
     const ValueDelegate values(&window);
     const NameDelegate& delegate = is_key ? static_cast<const NameDelegate&>(keys) : values;
     // Twice, unlike what is met while painting: each is a name that is not there now.
-    for (int i = 0; i < 2; ++i) {
+    for (int i = 0; i < 2; i++) {
         delegate.setModelData(&editor, &model, model.index(0, 0));
         DialogHand hand;
         hand.then_press(QMessageBox::Ok);
@@ -344,7 +341,7 @@ void DelegatesTest::a_megabyte_paints_like_a_kilobyte() {
     const auto fastest = [&](const QVariant& datum) {
         const OneDatumModel model(datum);
         qint64 best = std::numeric_limits<qint64>::max();
-        for (int i = 0; i < 50; ++i) {
+        for (int i = 0; i < 50; i++) {
             QElapsedTimer timer;
             timer.start();
             delegate.paint(&painter, option, model.index(0, 0));
@@ -450,10 +447,9 @@ void DelegatesTest::each_cell_has_its_own_icon() {
         delegate.paint(&painter, option, model.index(0, column));
         painter.end();
         int count = 0;
-        for (int y = 0; y < image.height(); ++y) {
-            for (int x = 0; x < image.width(); ++x) {
+        for (int y = 0; y < image.height(); y++) {
+            for (int x = 0; x < image.width(); x++)
                 count += image.pixelColor(x, y) == Qt::red ? 1 : 0;
-            }
         }
         return count;
     };

@@ -54,30 +54,26 @@ void run(Editor editor, NotingModel& model, const QVariant& data) {
     case DwordEditor: {
         EditDwordDialog dialog(name);
         dialog.set_value(data.toUInt());
-        if (dialog.exec() == QDialog::Accepted) {
+        if (dialog.exec() == QDialog::Accepted)
             model.setData(index, QVariant(dialog.value()), Qt::DisplayRole);
-        }
         return;
     }
     case QwordEditor: {
         EditQwordDialog dialog(name);
         dialog.set_value(data.toULongLong());
-        if (dialog.exec() == QDialog::Accepted) {
+        if (dialog.exec() == QDialog::Accepted)
             model.setData(index, QVariant(dialog.value()), Qt::DisplayRole);
-        }
         return;
     }
     }
 }
 
 QWidget* data_field(const QWidget& dialog) {
-    if (auto* text = dialog.findChild<QTextEdit*>()) {
+    if (auto* text = dialog.findChild<QTextEdit*>())
         return text;
-    }
     for (QLineEdit* edit : dialog.findChildren<QLineEdit*>()) {
-        if (!edit->isReadOnly()) {
+        if (!edit->isReadOnly())
             return edit;
-        }
     }
     return nullptr;
 }
@@ -96,9 +92,8 @@ void set_text(const QWidget& dialog, const QString& text) {
 
 QStringList lines(std::initializer_list<const char*> texts) {
     QStringList list;
-    for (const char* text : texts) {
+    for (const char* text : texts)
         list.append(QString::fromUtf8(text));
-    }
     return list;
 }
 
@@ -161,14 +156,12 @@ void EditorsTest::the_layout() {
     hand.then([&](QWidget* dialog) {
         QCOMPARE(dialog->parentWidget(), nullptr);
         QStringList labels;
-        for (const QLabel* label : dialog->findChildren<QLabel*>()) {
+        for (const QLabel* label : dialog->findChildren<QLabel*>())
             labels.append(label->text());
-        }
         QCOMPARE(labels, lines({"Value name:", "Value data:"}));
         const QLineEdit* name = nullptr;
-        for (const QLineEdit* edit : dialog->findChildren<QLineEdit*>()) {
+        for (const QLineEdit* edit : dialog->findChildren<QLineEdit*>())
             name = edit->isReadOnly() ? edit : name;
-        }
         QVERIFY(name);
         QCOMPARE(name->text(), QStringLiteral("the name"));
         // What is typed goes to the data at once.
@@ -229,9 +222,8 @@ void EditorsTest::leaving_writes_nothing_data() {
     QTest::addColumn<int>("editor");
     QTest::addColumn<QString>("way");
     for (int editor : {StringEditor, BinaryEditor, MultiStringEditor, DwordEditor, QwordEditor}) {
-        for (const char* way : {"cancel", "close", "escape"}) {
+        for (const char* way : {"cancel", "close", "escape"})
             QTest::addRow("editor %d, %s", editor, way) << editor << QString::fromLatin1(way);
-        }
     }
 }
 
@@ -242,13 +234,12 @@ void EditorsTest::leaving_writes_nothing() {
     DialogHand hand;
     hand.then([&](QWidget* dialog) {
         set_text(*dialog, QStringLiteral("12"));
-        if (way == QStringLiteral("cancel")) {
+        if (way == QStringLiteral("cancel"))
             press(*dialog, QDialogButtonBox::Cancel);
-        } else if (way == QStringLiteral("close")) {
+        else if (way == QStringLiteral("close"))
             dialog->close();
-        } else {
+        else
             QTest::keyClick(data_field(*dialog), Qt::Key_Escape);
-        }
     });
     run(static_cast<Editor>(editor), model, QVariant());
     QVERIFY(hand.is_done());
@@ -271,9 +262,8 @@ void EditorsTest::ok_alone_gives_back_what_was_stored_data() {
     text("control characters", QStringLiteral("\u0001\u0007\u001b\u007f"));
     text("an unpaired surrogate", QString(QChar(0xd800)));
     text("more than a line edit takes by default", QString(100000, QLatin1Char('x')));
-    for (int size : {0, 1, 4, 5, 100, 16344, 16345}) {
+    for (int size : {0, 1, 4, 5, 100, 16344, 16345})
         QTest::addRow("%d bytes", size) << int(BinaryEditor) << QVariant(QByteArray(size, '\xa5'));
-    }
     const auto list = [](const char* row, const QStringList& value) {
         QTest::newRow(row) << int(MultiStringEditor) << QVariant(value);
     };
@@ -284,12 +274,10 @@ void EditorsTest::ok_alone_gives_back_what_was_stored_data() {
     list("texts with non-breaking spaces and tabs", lines({"a\u00a0b", "c\td"}));
     list("texts with line ends inside", {QStringLiteral("a\nb"), QStringLiteral("c\rd\u2028e\u2029f")});
     list("two hundred texts", QStringList(200, QStringLiteral("text")));
-    for (uint number : {0U, 255U, 4294967295U}) {
+    for (uint number : {0U, 255U, 4294967295U})
         QTest::addRow("dword %u", number) << int(DwordEditor) << QVariant(number);
-    }
-    for (qulonglong number : {0ULL, 255ULL, 18446744073709551615ULL}) {
+    for (qulonglong number : {0ULL, 255ULL, 18446744073709551615ULL})
         QTest::addRow("qword %llu", number) << int(QwordEditor) << QVariant(number);
-    }
 }
 
 void EditorsTest::ok_alone_gives_back_what_was_stored() {
@@ -440,9 +428,8 @@ void EditorsTest::what_an_assistive_program_puts_in_is_stored_as_it_is_shown() {
     NotingModel model;
     DialogHand hand;
     hand.then([&](QWidget* dialog) {
-        if (in_decimal) {
+        if (in_decimal)
             find_by_text<QRadioButton>(*dialog, QStringLiteral("Decimal"))->setChecked(true);
-        }
         QAccessible::queryAccessibleInterface(data_field(*dialog))->editableTextInterface()->insertText(0, put_in);
         press(*dialog, QDialogButtonBox::Ok);
     });
@@ -502,21 +489,19 @@ void EditorsTest::what_stands_beside_an_edited_line_stays_data() {
     const auto type_at = [go_to](int line, const char* text) {
         return Edit([=](QTextEdit& edit) {
             go_to(edit, line);
-            for (const char* c = text; *c != 0; ++c) {
-                if (*c == '\n') {
+            for (const char* c = text; *c != 0; c++) {
+                if (*c == '\n')
                     QTest::keyClick(&edit, Qt::Key_Return);
-                } else {
+                else
                     QTest::keyClick(&edit, *c);
-                }
             }
         });
     };
     const auto delete_lines = [go_to](int first, int count) {
         return Edit([=](QTextEdit& edit) {
             go_to(edit, first);
-            for (int i = 0; i < count; ++i) {
+            for (int i = 0; i < count; i++)
                 QTest::keyClick(&edit, Qt::Key_Down, Qt::ShiftModifier);
-            }
             QTest::keyClick(&edit, Qt::Key_Delete);
         });
     };

@@ -38,9 +38,8 @@ Ended run(const QStringList& arguments, const QMap<QString, QString>& variables 
     environment.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("offscreen"));
     environment.insert(QStringLiteral("QT_PLUGIN_PATH"), QStringLiteral(PRESSER_PLUGIN_PATH));
     environment.insert(QStringLiteral("QT_QPA_GENERIC_PLUGINS"), QStringLiteral("presser"));
-    for (auto it = variables.cbegin(); it != variables.cend(); ++it) {
+    for (auto it = variables.cbegin(); it != variables.cend(); ++it)
         environment.insert(it.key(), it.value());
-    }
     process.setProcessEnvironment(environment);
     process.start(program, arguments);
     Ended ended;
@@ -198,9 +197,8 @@ void EntryTest::no_message_goes_into_a_hive_where_the_standard_streams_are_close
     const Scene scene(testkit::HiveLayout(), close_improperly);
     const QByteArray before = scene.bytes();
     const Ended ended = run({tops, scene.file()}, {{QStringLiteral("PRESSER_EXIT"), QStringLiteral("0")}}, [&] {
-        for (const int stream : closed) {
+        for (const int stream : closed)
             close(stream);
-        }
     });
     QVERIFY2(!ended.crashed, qPrintable(ended.err));
     QCOMPARE(ended.status, 0);
@@ -277,9 +275,8 @@ void EntryTest::a_file_that_is_no_hive_ends_the_program() {
     }
     const QString shown = kind == QStringLiteral("directory") ? directory.path() : file.fileName();
     QStringList arguments{tops, shown};
-    if (kind == QStringLiteral("twice")) {
+    if (kind == QStringLiteral("twice"))
         arguments << QStringLiteral("A/B") << shown;
-    }
     const QByteArray before = sound.bytes();
     const Ended ended = run(arguments, {{QStringLiteral("LC_ALL"), QStringLiteral("C.UTF-8")}});
     // Nobody catches it: the program is ended by the uncaught exception, without a window.

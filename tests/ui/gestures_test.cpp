@@ -106,9 +106,8 @@ private slots:
         QVERIFY(stage.keys->indexAt(point) != stage.keys->currentIndex());
         QVERIFY(stage.key(below("Zzz")).isValid());
         // The menu that comes with a right press would stand over another key. The next is one that was asked for.
-        if (button == Qt::RightButton) {
+        if (button == Qt::RightButton)
             QVERIFY(!with_context_menu(*stage.keys, point, [](QMenu&) {}));
-        }
         QVERIFY(with_context_menu(*stage.keys, point, [](QMenu&) {}));
     }
 
@@ -170,9 +169,8 @@ private slots:
 
     void an_arrow_key_that_ends_a_naming_leads_to_the_key_that_stood_there_data() {
         QTest::addColumn<Qt::Key>("key");
-        for (const Qt::Key key : {Qt::Key_Down, Qt::Key_Up, Qt::Key_PageDown}) {
+        for (const Qt::Key key : {Qt::Key_Down, Qt::Key_Up, Qt::Key_PageDown})
             QTest::addRow("%s", QMetaEnum::fromType<Qt::Key>().valueToKey(key)) << key;
-        }
     }
 
     void an_arrow_key_that_ends_a_naming_leads_to_the_key_that_stood_there() {
@@ -318,9 +316,8 @@ private slots:
             QTest::keyClick(editor, key);
             QTRY_COMPARE(stage.status(), below("Disc"));
             QVERIFY(editor->isHidden());
-            for (const QLineEdit* other : stage.keys->viewport()->findChildren<QLineEdit*>()) {
+            for (const QLineEdit* other : stage.keys->viewport()->findChildren<QLineEdit*>())
                 QVERIFY(other->isHidden());
-            }
         }
         const Scene scene;
         Stage stage(scene);

@@ -20,9 +20,8 @@ QString subkeys_in_file(const Scene& scene, const char* path) {
     const testkit::Hive hive = testkit::read_hive(scene.file_bytes());
     const testkit::Key* key = hive.find(std::string(path));
     QStringList names;
-    for (const testkit::Key& child : key->children) {
+    for (const testkit::Key& child : key->children)
         names.append(QString::fromStdU16String(child.name));
-    }
     return joined(names);
 }
 
@@ -232,7 +231,7 @@ void KeysViewTest::a_branch_is_deleted_with_all_below() {
     shared_actions().delete_action->trigger();
     QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Leaf Zeta"));
     // The last key of a branch leaves its parent current.
-    for (int i = 0; i < 2; ++i) {
+    for (int i = 0; i < 2; i++) {
         stage.return_to(*stage.keys);
         stage.keys->setCurrentIndex(stage.model->index(0, 0, stage.key(alpha)));
         hand.then_press(QMessageBox::Yes);
@@ -394,9 +393,8 @@ void KeysViewTest::typing_goes_round_the_end() {
 
 void KeysViewTest::one_letter_again_and_again_goes_from_match_to_match() {
     testkit::HiveLayout hive;
-    for (const char* name : {"Bat", "Bee", "Bb"}) {
+    for (const char* name : {"Bat", "Bee", "Bb"})
         hive.root.add(name);
-    }
     const Scene scene(hive);
     Stage stage(scene);
     const QString root = QStringLiteral("MACHINE\\SYSTEM");
@@ -426,9 +424,8 @@ void KeysViewTest::an_asterisk_tells_what_it_cannot_open() {
     // Below what the window shows: it is told as the tree measures its rows.
     constexpr int sound_keys = 100;
     testkit::HiveLayout hive;
-    for (int i = 0; i < sound_keys; ++i) {
+    for (int i = 0; i < sound_keys; i++)
         hive.root.add("a" + std::to_string(1000 + i));
-    }
     hive.root.add("damaged");
     hive.root.add("last").add("below");
     Scene scene(hive);
@@ -451,9 +448,8 @@ void KeysViewTest::an_asterisk_tells_what_it_cannot_open() {
 class UncountableModel : public RegModel {
 public:
     int rowCount(const QModelIndex& parent = QModelIndex()) const override {
-        if (fails && parent == uncountable) {
+        if (fails && parent == uncountable)
             throw std::runtime_error("not now");
-        }
         return RegModel::rowCount(parent);
     }
 
@@ -489,13 +485,13 @@ void KeysViewTest::an_asterisk_on_a_hive_without_end_ends() {
     constexpr int levels = 40;
     testkit::HiveLayout ladder;
     testkit::KeyLayout* step = &ladder.root;
-    for (int i = 0; i < levels; ++i) {
+    for (int i = 0; i < levels; i++) {
         step->add("twin");
         step = &step->add("step");
     }
     const Scene scene(ladder, [](testkit::LaidHive& laid) {
         std::string path;
-        for (int i = 0; i < levels; ++i) {
+        for (int i = 0; i < levels; i++) {
             const uint32_t index = laid.at(path).index;
             laid.put32(index, 12, laid.get32(index, 4));
             path += path.empty() ? "step" : "\\step";

@@ -38,22 +38,20 @@ testkit::HiveLayout large() {
     key.add("Deep");
     layout.root.add("Beta").add("Below");
     layout.root.add("Filler").set("much", 3, testkit::pattern(40000));
-    for (int i = 0; i < 150; i++) {
+    for (int i = 0; i < 150; i++)
         layout.root.add("k" + std::to_string(i));
-    }
     return layout;
 }
 
 // As when the user has been elsewhere in the tree for long.
 void forget_everything(const Stage& stage) {
     const QModelIndex hive = stage.key(system_path);
-    for (int row = 0; row < stage.model->rowCount(hive); ++row) {
+    for (int row = 0; row < stage.model->rowCount(hive); row++) {
         try {
             stage.model->index(row, 0, hive).data();
             RegKey* key = RegModel::editable_key(stage.model->index(row, 0, hive));
-            if (key->value_count() == 1) {
+            if (key->value_count() == 1)
                 key->read_value(0);
-            }
         } catch (const std::exception&) {
             // The damaged one.
         }
@@ -117,7 +115,7 @@ private slots:
         QVERIFY(hand.nothing_comes());
 
         // Asked again, it answers again.
-        for (int i = 0; i < 2; ++i) {
+        for (int i = 0; i < 2; i++) {
             stage.return_to(*stage.keys);
             hand.then_press(QMessageBox::Ok);
             QTest::keySequence(&stage.window, QKeySequence(QKeySequence::Refresh));
@@ -232,9 +230,8 @@ private slots:
     void typing_in_the_table_passes_over_what_cannot_be_read() {
         testkit::HiveLayout layout;
         testkit::KeyLayout& key = layout.root.add("Alpha");
-        for (const char* name : {"about", "damaged", "query", "quick"}) {
+        for (const char* name : {"about", "damaged", "query", "quick"})
             key.set(name, 4, testkit::pattern(4));
-        }
         layout.root.add("Beta");
         Scene scene(layout);
         scene.damage_value("Alpha", 1);
@@ -285,16 +282,14 @@ private slots:
     void a_damaged_value_is_told_however_many_siblings_have_one() {
         constexpr int siblings = 12;
         testkit::HiveLayout layout;
-        for (int i = 0; i < siblings; ++i) {
+        for (int i = 0; i < siblings; i++)
             layout.root.add("Key" + std::to_string(i)).set("damaged", 4, testkit::pattern(4));
-        }
         const Scene scene(layout, [](testkit::LaidHive& hive) {
-            for (int i = 0; i < siblings; ++i) {
+            for (int i = 0; i < siblings; i++)
                 hive.put16(hive.at("Key" + std::to_string(i)).values.at(0).record, 0, 0x7878);
-            }
         });
         Stage stage(scene);
-        for (int i = 0; i < siblings; ++i) {
+        for (int i = 0; i < siblings; i++) {
             const QString shown = system_path + QStringLiteral("\\Key%1").arg(i);
             DialogHand hand;
             hand.then_press(QMessageBox::Ok);
@@ -326,18 +321,16 @@ private slots:
         put_back(scene, sound);
         forget_everything(stage);
         stage.keys->setCurrentIndex(stage.model->index(0, 0, stage.key(alpha)));
-        for (int i = 0; i < 2; ++i) {
+        for (int i = 0; i < 2; i++) {
             stage.return_to(*stage.keys);
             hand.text.clear();
-            if (action == shared_actions().delete_action) {
+            if (action == shared_actions().delete_action)
                 hand.then_press(QMessageBox::Yes);
-            }
             hand.then_press(QMessageBox::Ok);
-            if (action) {
+            if (action)
                 action->trigger();
-            } else {
+            else
                 QTest::keyClick(stage.keys, Qt::Key_F2);
-            }
             QVERIFY(hand.is_done());
             QCOMPARE(hand.text, told(alpha + QStringLiteral("\\#0"), "ROpenSubKey failed"));
         }

@@ -30,9 +30,8 @@ QString joined(const QStringList& names) { return names.join(QLatin1Char(' ')); 
 template <typename Named>
 QString names_of(const std::vector<Named>& all) {
     QStringList names;
-    for (const Named& each : all) {
+    for (const Named& each : all)
         names.append(QString::fromStdU16String(each.name));
-    }
     names.sort(Qt::CaseInsensitive);
     return joined(names);
 }
@@ -60,17 +59,15 @@ public:
     bool setData(const QModelIndex& index, const QVariant& value, int role) override {
         renames++;
         renamed_behind_a_dialog = renamed_behind_a_dialog || QApplication::activeModalWidget();
-        if (throws) {
+        if (throws)
             throw std::runtime_error("as asked");
-        }
         return RegModel::setData(index, value, role);
     }
 
     // While it is gated, a search looks at no name before the gate opens.
     QVariant data(const QModelIndex& index, int role) const override {
-        if (is_gated && QThread::currentThread() != thread()) {
+        if (is_gated && QThread::currentThread() != thread())
             gate.acquire();
-        }
         return RegModel::data(index, role);
     }
 
@@ -83,9 +80,8 @@ public:
 
 QLineEdit* editor_in(const QWidget& view) {
     for (QLineEdit* editor : view.findChildren<QLineEdit*>()) {
-        if (!editor->isHidden()) {
+        if (!editor->isHidden())
             return editor;
-        }
     }
     return nullptr;
 }
@@ -120,9 +116,8 @@ void search_up_to_leaf(Stage& stage) {
     DialogHand hand;
     hand.then(ask(QStringLiteral("a"), false));
     stage.window.show_find_dialog();
-    for (int hits = 0; hits < 10 && stage.status() != leaf; ++hits) {
+    for (int hits = 0; hits < 10 && stage.status() != leaf; hits++)
         stage.window.find_next();
-    }
     QCOMPARE(stage.status(), leaf);
     stage.return_to(*stage.keys);
     shared_actions().rename_action->trigger();
@@ -227,9 +222,8 @@ void OpenEditorTest::a_refused_name_is_told_before_the_search() {
     bool is_searching = true;
     hand.then([&](QWidget* dialog) {
         is_searching = false;
-        for (const QDialog* other : stage.window.findChildren<QDialog*>()) {
+        for (const QDialog* other : stage.window.findChildren<QDialog*>())
             is_searching = is_searching || other->accessibleName() == QStringLiteral("Searching...");
-        }
         QCOMPARE(qobject_cast<QMessageBox*>(dialog)->text(), QStringLiteral("The specified key name already exists."));
         QTest::keyClick(dialog, Qt::Key_Return);
     });
@@ -540,7 +534,7 @@ void OpenEditorTest::a_rename_that_throws_leaves_the_views_able_to_rename() {
     auto& model = static_cast<WitnessModel&>(*stage.model);
     stage.select_key(leaf);
     // Twice: a name that is lost is told each time.
-    for (int i = 0; i < 2; ++i) {
+    for (int i = 0; i < 2; i++) {
         stage.return_to(*stage.keys);
         shared_actions().rename_action->trigger();
         type_in(*stage.keys, QStringLiteral("zzz"));

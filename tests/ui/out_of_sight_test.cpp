@@ -26,7 +26,7 @@ testkit::HiveLayout many_rows() {
         key.add(name);
         key.set(std::string("v of ") + name, 4, testkit::pattern(4));
     }
-    for (int i = 10; i < 70; ++i) {
+    for (int i = 10; i < 70; i++) {
         key.add("k" + std::to_string(i));
         key.set("w" + std::to_string(i), 4, testkit::pattern(4));
     }
@@ -52,7 +52,7 @@ struct CurrentRow {
     // By its wheel, until the row has gone.
     void scroll_away() const {
         const QPoint middle = view->viewport()->rect().center();
-        for (int turns = 0; is_in_sight(); ++turns) {
+        for (int turns = 0; is_in_sight(); turns++) {
             QVERIFY(turns < 100);
             QWheelEvent turn(middle, view->viewport()->mapToGlobal(middle), {}, {0, -120}, Qt::NoButton, {},
                              Qt::NoScrollPhase, false);
@@ -70,11 +70,10 @@ struct CurrentRow {
     }
 
     void hide(const QString& how) const {
-        if (how == QStringLiteral("closed")) {
+        if (how == QStringLiteral("closed"))
             close_its_branch();
-        } else if (how == QStringLiteral("scrolled")) {
+        else if (how == QStringLiteral("scrolled"))
             scroll_away();
-        }
     }
 
     bool is_in_sight() const {
@@ -92,9 +91,8 @@ struct CurrentRow {
 
 QLineEdit* editor_in(const QAbstractItemView& view) {
     for (QLineEdit* editor : view.viewport()->findChildren<QLineEdit*>()) {
-        if (!editor->isHidden()) {
+        if (!editor->isHidden())
             return editor;
-        }
     }
     return nullptr;
 }
@@ -129,11 +127,10 @@ private slots:
             Stage stage(scene);
             const CurrentRow row(stage, in_table);
             row.hide(hidden);
-            if (by_key) {
+            if (by_key)
                 QTest::keyClick(row.view, Qt::Key_F2);
-            } else {
+            else
                 shared_actions().rename_action->trigger();
-            }
             QLineEdit* editor = editor_in(*row.view);
             QVERIFY(editor);
             QCOMPARE(QApplication::focusWidget(), editor);
@@ -254,9 +251,8 @@ private slots:
         constexpr int levels = 25;
         testkit::HiveLayout layout;
         testkit::KeyLayout* step = &layout.root;
-        for (int i = 0; i < levels; ++i) {
+        for (int i = 0; i < levels; i++)
             step = &step->add("step");
-        }
         const Scene scene(layout);
         Stage stage(scene);
         stage.keys->setLayoutDirection(direction);

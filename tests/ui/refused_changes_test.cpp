@@ -20,9 +20,8 @@ const QString alpha = QStringLiteral("MACHINE\\SYSTEM\\Alpha");
 testkit::HiveLayout some_values() {
     testkit::HiveLayout layout;
     testkit::KeyLayout& key = layout.root.add("Alpha");
-    for (const char* name : {"b", "m", "z"}) {
+    for (const char* name : {"b", "m", "z"})
         key.set(name, 1, testkit::text_data("text"));
-    }
     return layout;
 }
 
@@ -106,7 +105,7 @@ private slots:
         QFETCH(const bool, lasting);
         int kept = 0;
         bool has_failed = true;
-        for (int nth = 1; has_failed; ++nth) {
+        for (int nth = 1; has_failed; nth++) {
             const Scene scene(some_values());
             Stage stage(scene);
             make_a_value_a(stage);
@@ -117,7 +116,7 @@ private slots:
                 QVERIFY2(
                     current_of(*stage.values) == QStringLiteral("a"),
                     qPrintable(QStringLiteral("number %1: %2 is current").arg(nth).arg(current_of(*stage.values))));
-                ++kept;
+                kept++;
             }
         }
         QVERIFY(kept > 0);
@@ -127,7 +126,7 @@ private slots:
         int kept = 0;
         int doubled = 0;
         bool has_failed = true;
-        for (int nth = 1; has_failed; ++nth) {
+        for (int nth = 1; has_failed; nth++) {
             const Scene scene(some_values());
             Stage stage(scene);
             stage.select_value(alpha, QStringLiteral("z"));
@@ -178,7 +177,7 @@ private slots:
         QFETCH(const bool, lasting);
         int kept = 0;
         bool has_failed = true;
-        for (int nth = 1; has_failed; ++nth) {
+        for (int nth = 1; has_failed; nth++) {
             const Scene scene(some_keys());
             Stage stage(scene);
             const QString b = alpha + QStringLiteral("\\b");
@@ -192,7 +191,7 @@ private slots:
                 QVERIFY2(current_of(*stage.keys) == QStringLiteral("b"),
                          qPrintable(QStringLiteral("number %1: %2 is current").arg(nth).arg(current_of(*stage.keys))));
                 QVERIFY(stage.keys->isExpanded(stage.key(b)));
-                ++kept;
+                kept++;
             }
         }
         QVERIFY(kept > 0);
@@ -212,7 +211,7 @@ private slots:
         stage.select_key(alpha);
         ThrowingModel model(3, 3);
         stage.values->setModel(&model);
-        for (int row = 0; row < model.rowCount(); ++row) {
+        for (int row = 0; row < model.rowCount(); row++) {
             stage.return_to(*stage.values);
             stage.values->setCurrentIndex(model.index(row, 0));
             shared_actions().delete_action->setEnabled(true);

@@ -77,9 +77,8 @@ QStringList all_hits(Stage& stage, const Search& search) {
     constexpr int most = 100;
     while (!hand.is_done() && hits.size() < most) {
         QString hit = stage.status();
-        if (stage.values->currentIndex().isValid()) {
+        if (stage.values->currentIndex().isValid())
             hit += QLatin1Char(':') + stage.cell(stage.values->currentIndex().row(), 0);
-        }
         hits.append(hit);
         stage.window.find_next();
     }
@@ -240,9 +239,8 @@ void SearchTest::a_hit_is_opened_and_selected() {
     stage.window.show_find_dialog();
     const QModelIndex deep = stage.key(alpha + QStringLiteral("\\Deep"));
     QCOMPARE(stage.keys->currentIndex(), deep);
-    for (QModelIndex step = deep; step.isValid(); step = step.parent()) {
+    for (QModelIndex step = deep; step.isValid(); step = step.parent())
         QVERIFY(stage.keys->isExpanded(step));
-    }
     QCOMPARE(stage.value_names().join(QLatin1Char(' ')), QStringLiteral("(Default) A b"));
     QVERIFY(!stage.values->currentIndex().isValid());
     QVERIFY(stage.keys->viewport()->rect().intersects(stage.keys->visualRect(deep)));
@@ -251,9 +249,8 @@ void SearchTest::a_hit_is_opened_and_selected() {
 void SearchTest::a_hit_is_seen_though_it_was_current() {
     testkit::HiveLayout hive;
     testkit::KeyLayout& key = hive.root.add("Key").add("found");
-    for (int i = 0; i < 200; ++i) {
+    for (int i = 0; i < 200; i++)
         key.set("v" + std::to_string(i), 4, testkit::pattern(4));
-    }
     const Scene scene(hive);
     Stage stage(scene);
     const QString branch = QStringLiteral("MACHINE\\SYSTEM\\Key");
@@ -285,9 +282,8 @@ void SearchTest::a_hit_is_seen_though_it_was_current() {
 void SearchTest::a_hit_far_down_is_seen() {
     testkit::HiveLayout hive;
     testkit::KeyLayout* key = &hive.root;
-    for (int level = 0; level < 30; ++level) {
+    for (int level = 0; level < 30; level++)
         key = &key->add("k");
-    }
     key->add("found");
     const Scene scene(hive);
     Stage stage(scene);
@@ -402,11 +398,10 @@ void SearchTest::cancel_returns_when_the_worker_has_ended() {
     DialogHand hand;
     hand.then(ask({QStringLiteral("zeta")})).then_while_searching([&](QWidget* dialog) {
         model.entered.acquire();
-        if (by_button) {
+        if (by_button)
             QTest::mouseClick(dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Cancel), Qt::LeftButton);
-        } else {
+        else
             escape(dialog);
-        }
         model.gate.release(1000);
     });
     stage.window.show_find_dialog();
@@ -461,7 +456,7 @@ void SearchTest::cancelled_and_started_again_fifty_times() {
     Stage stage(scene, std::make_unique<GatedModel>());
     auto& model = static_cast<GatedModel&>(*stage.model);
     DialogHand hand;
-    for (int i = 0; i < 50; ++i) {
+    for (int i = 0; i < 50; i++) {
         hand.then(ask({QStringLiteral("not there"), true, true})).then_while_searching([&](QWidget* dialog) {
             model.entered.acquire();
             // The window paints and expands while the worker is in the middle of a key.

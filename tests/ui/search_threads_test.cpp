@@ -31,7 +31,7 @@ const QString root_path = QStringLiteral("MACHINE\\SYSTEM");
 // More keys than the hive keeps handles, so that window and worker take each other's away.
 testkit::HiveLayout layout() {
     testkit::HiveLayout hive;
-    for (int i = 0; i < branches; ++i) {
+    for (int i = 0; i < branches; i++) {
         testkit::KeyLayout& branch = hive.root.add("Branch " + std::to_string(100 + i));
         for (int j = 0; j < values_of_branch; j += 3) {
             branch.set("text " + std::to_string(j), 1, testkit::text_data(std::string(200, 'x')));
@@ -39,9 +39,8 @@ testkit::HiveLayout layout() {
             // Eight bytes are no DWORD: its data cannot be read.
             branch.set("unreadable " + std::to_string(j), 4, testkit::pattern(8));
         }
-        for (int j = 0; j < leaves; ++j) {
+        for (int j = 0; j < leaves; j++)
             branch.add("Leaf " + std::to_string(j)).set("value", 4, testkit::pattern(4));
-        }
     }
     hive.root.add("Last");
     return hive;
@@ -54,9 +53,8 @@ class PacedModel : public RegModel {
 public:
     QVariant data(const QModelIndex& index, int role) const override {
         if (QThread::currentThread() != thread()) {
-            while (visited.load(std::memory_order_relaxed) >= granted.load(std::memory_order_relaxed)) {
+            while (visited.load(std::memory_order_relaxed) >= granted.load(std::memory_order_relaxed))
                 QThread::yieldCurrentThread();
-            }
             visited.fetch_add(1, std::memory_order_relaxed);
         }
         return RegModel::data(index, role);
@@ -136,42 +134,38 @@ void SearchThreadsTest::the_window_goes_on_beside_its_search() {
     int number = 0;
     int steps = 0;
     int accompanied = 0;
-    for (int round = 0; round < rounds; ++round) {
+    for (int round = 0; round < rounds; round++) {
         const bool is_cancelled = round % 3 == 0;
         const bool is_hit = round % 3 == 1;
         DialogHand hand;
         hand.then(ask_for(is_hit ? QStringLiteral("last") : QStringLiteral("not there")));
         hand.then_while_searching([&](QWidget* dialog) {
-            for (int i = 0; i < gestures; ++i) {
+            for (int i = 0; i < gestures; i++) {
                 for (const auto& step : gesture(stage, number++)) {
                     const int before = model.visited.load(std::memory_order_relaxed);
                     model.grant(keys_a_step);
                     step();
-                    ++steps;
+                    steps++;
                     accompanied += model.visited.load(std::memory_order_relaxed) > before ? 1 : 0;
                 }
             }
-            if (is_cancelled) {
+            if (is_cancelled)
                 QTest::keyClick(dialog, Qt::Key_Escape);
-            }
             model.let_go();
             if (!is_cancelled) {
                 // To the end of the search as well, and behind it.
-                for (const auto& step : gesture(stage, number++)) {
+                for (const auto& step : gesture(stage, number++))
                     step();
-                }
             }
         });
-        if (!is_cancelled && !is_hit) {
+        if (!is_cancelled && !is_hit)
             hand.then_press(QMessageBox::Ok);
-        }
         model.grant(0);
         stage.window.show_find_dialog();
         QVERIFY(hand.is_done());
         QVERIFY(hand.nothing_comes());
-        if (is_hit) {
+        if (is_hit)
             QCOMPARE(stage.status(), root_path + QStringLiteral("\\Last"));
-        }
     }
     qInfo("%d of %d steps had the search beside them", accompanied, steps);
     QVERIFY(accompanied >= rounds);

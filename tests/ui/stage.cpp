@@ -14,9 +14,8 @@ namespace {
 
 testkit::Bytes number_data(quint64 number, size_t size) {
     testkit::Bytes data;
-    for (size_t i = 0; i < size; ++i) {
+    for (size_t i = 0; i < size; i++)
         data.push_back(static_cast<quint8>(number >> (8 * i)));
-    }
     return data;
 }
 
@@ -49,18 +48,16 @@ Scene::Scene() : Scene(layout()) {}
 
 Scene::Scene(const testkit::HiveLayout& layout, const std::function<void(testkit::LaidHive&)>& change)
     : laid_(testkit::lay_out(layout)) {
-    if (change) {
+    if (change)
         change(laid_);
-    }
     write(laid_.bytes);
 }
 
 void Scene::write(const testkit::Bytes& all) const {
     QFile out(file());
     const auto size = static_cast<qint64>(all.size());
-    if (!out.open(QIODevice::WriteOnly) || out.write(reinterpret_cast<const char*>(all.data()), size) != size) {
+    if (!out.open(QIODevice::WriteOnly) || out.write(reinterpret_cast<const char*>(all.data()), size) != size)
         qFatal("cannot write %s", qPrintable(file()));
-    }
 }
 
 void Scene::damage_key(const std::string& path) {
@@ -82,9 +79,8 @@ testkit::Bytes Scene::file_bytes() const {
 
 QByteArray Scene::bytes() const {
     QFile in(file());
-    if (!in.open(QIODevice::ReadOnly)) {
+    if (!in.open(QIODevice::ReadOnly))
         qFatal("cannot read %s", qPrintable(file()));
-    }
     return in.readAll();
 }
 
@@ -96,9 +92,8 @@ Stage::Stage(const Scene& scene, std::unique_ptr<RegModel> key_model) : model(st
     values = static_cast<ValuesView*>(by_accessible_name(window, QStringLiteral("values_table")));
     window.show();
     window.activateWindow();
-    if (!QTest::qWaitForWindowActive(&window)) {
+    if (!QTest::qWaitForWindowActive(&window))
         qFatal("the window does not become active");
-    }
 }
 
 QModelIndex Stage::key(const QString& path) const {
@@ -106,15 +101,13 @@ QModelIndex Stage::key(const QString& path) const {
     for (const QString& name : path.split(QLatin1Char('\\'))) {
         const QModelIndex parent = found;
         found = QModelIndex();
-        for (int row = 0; row < model->rowCount(parent) && !found.isValid(); ++row) {
+        for (int row = 0; row < model->rowCount(parent) && !found.isValid(); row++) {
             const QModelIndex child = model->index(row, 0, parent);
-            if (child.data(Qt::DisplayRole).toString() == name) {
+            if (child.data(Qt::DisplayRole).toString() == name)
                 found = child;
-            }
         }
-        if (!found.isValid()) {
+        if (!found.isValid())
             return {};
-        }
     }
     return found;
 }
@@ -122,9 +115,8 @@ QModelIndex Stage::key(const QString& path) const {
 QStringList Stage::subkeys(const QString& path) const {
     const QModelIndex parent = key(path);
     QStringList names;
-    for (int row = 0; row < model->rowCount(parent); ++row) {
+    for (int row = 0; row < model->rowCount(parent); row++)
         names.append(model->index(row, 0, parent).data(Qt::DisplayRole).toString());
-    }
     return names;
 }
 
@@ -141,9 +133,8 @@ QString Stage::cell(int row, int column) const {
 QStringList Stage::value_names() const {
     QStringList names;
     const int rows = values->model() ? values->model()->rowCount() : 0;
-    for (int row = 0; row < rows; ++row) {
+    for (int row = 0; row < rows; row++)
         names.append(cell(row, 0));
-    }
     return names;
 }
 
@@ -166,11 +157,10 @@ void Stage::press_in_editor(const QString& text, Qt::Key key) const {
 
 std::unique_ptr<RegValue> stored(const Stage& stage, const QString& name) {
     RegKey* key = RegModel::editable_key(stage.keys->currentIndex());
-    for (int i = 0; i < key->value_count(); ++i) {
+    for (int i = 0; i < key->value_count(); i++) {
         auto value = key->read_value(i);
-        if (value && value->name == name) {
+        if (value && value->name == name)
             return value;
-        }
     }
     return nullptr;
 }
@@ -184,9 +174,8 @@ void double_click(const Stage& stage, const QModelIndex& index) {
 
 QWidget* by_accessible_name(const QWidget& parent, const QString& name) {
     for (QWidget* widget : parent.findChildren<QWidget*>()) {
-        if (widget->accessibleName() == name) {
+        if (widget->accessibleName() == name)
             return widget;
-        }
     }
     qFatal("no widget has the accessible name %s", qPrintable(name));
 }

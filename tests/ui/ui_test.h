@@ -79,28 +79,24 @@ public:
 private:
     void look() {
         QWidget* dialog = QApplication::activeModalWidget();
-        if (!dialog || !dialog->isVisible()) {
+        if (!dialog || !dialog->isVisible())
             return;
-        }
         const bool is_searching = dialog->accessibleName() == QStringLiteral("Searching...");
         if (steps_.empty()) {
-            if (!is_searching && !answered_.contains(dialog)) {
+            if (!is_searching && !answered_.contains(dialog))
                 refuse(*dialog);
-            }
             return;
         }
-        if ((!answered_.isEmpty() && dialog == answered_.last()) || is_searching != steps_.front().second) {
+        if ((!answered_.isEmpty() && dialog == answered_.last()) || is_searching != steps_.front().second)
             return;
-        }
         answered_.append(dialog);
         const Step step = std::move(steps_.front().first);
         steps_.pop_front();
         // Not from inside the timer's own event: a step may open the next dialog before it returns.
         const QPointer<QWidget> shown = dialog;
         QTimer::singleShot(0, qApp, [step, shown] {
-            if (shown) {
+            if (shown)
                 step(shown);
-            }
         });
     }
 
@@ -129,9 +125,8 @@ inline bool with_menu(const std::function<void()>& ask, const std::function<void
     QTimer timer;
     QObject::connect(&timer, &QTimer::timeout, &timer, [&] {
         auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
-        if (!menu) {
+        if (!menu)
             return;
-        }
         timer.stop();
         shown = true;
         act(*menu);
@@ -155,9 +150,8 @@ inline bool with_context_menu(QAbstractScrollArea& view, QPoint point, const std
 // The texts of a menu; "-" for a separator.
 inline QStringList texts_of(const QMenu& menu) {
     QStringList texts;
-    for (const QAction* action : menu.actions()) {
+    for (const QAction* action : menu.actions())
         texts.append(action->isSeparator() ? QStringLiteral("-") : action->text());
-    }
     return texts;
 }
 
@@ -165,9 +159,8 @@ inline QStringList texts_of(const QMenu& menu) {
 template <typename Widget>
 Widget* find_by_text(const QWidget& parent, const QString& text) {
     for (Widget* widget : parent.findChildren<Widget*>()) {
-        if (widget->text().remove(QLatin1Char('&')) == text) {
+        if (widget->text().remove(QLatin1Char('&')) == text)
             return widget;
-        }
     }
     return nullptr;
 }

@@ -117,19 +117,16 @@ void ValidatorsTest::the_field_refuses_what_does_not_fit() {
     QFETCH(QString, typed);
     QFETCH(QString, text);
     std::unique_ptr<EditNumberDialog> dialog;
-    if (bits == 32) {
+    if (bits == 32)
         dialog = std::make_unique<EditDwordDialog>(QStringLiteral("n"));
-    } else {
+    else
         dialog = std::make_unique<EditQwordDialog>(QStringLiteral("n"));
-    }
-    if (!hexadecimal) {
+    if (!hexadecimal)
         find_by_text<QRadioButton>(*dialog, QStringLiteral("Decimal"))->setChecked(true);
-    }
     QLineEdit* field = nullptr;
     for (QLineEdit* edit : dialog->findChildren<QLineEdit*>()) {
-        if (!edit->isReadOnly()) {
+        if (!edit->isReadOnly())
             field = edit;
-        }
     }
     QVERIFY(field);
     field->clear();

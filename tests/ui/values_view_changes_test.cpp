@@ -330,11 +330,10 @@ void ValuesViewChangesTest::a_refused_creation_is_told() {
         }
     });
     presser.start(1);
-    if (is_default) {
+    if (is_default)
         stage.values->value_double_clicked(stage.values->model()->index(0, 0));
-    } else {
+    else
         shared_actions().new_string_action->trigger();
-    }
     QCOMPARE(told.count(QStringLiteral("The value could not be created.")), 1);
     QCOMPARE(stage.value_names(), shown);
     QCOMPARE(stage.values->currentIndex(), stage.value(QStringLiteral("odd")));
@@ -366,7 +365,7 @@ void ValuesViewChangesTest::a_deletion_refused_after_its_row_went_keeps_the_row(
     ReturningModel model(3, 3);
     stage.values->setModel(&model);
     stage.values->setFocus();
-    for (int row = 0; row < model.rowCount(); ++row) {
+    for (int row = 0; row < model.rowCount(); row++) {
         const QModelIndex asked = model.index(row, 1);
         stage.return_to(*stage.values);
         stage.values->setCurrentIndex(asked);

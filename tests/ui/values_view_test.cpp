@@ -17,22 +17,19 @@ const QString alpha = QStringLiteral("MACHINE\\SYSTEM\\Alpha");
 const QString beta = QStringLiteral("MACHINE\\SYSTEM\\Beta");
 
 QString shown_in(const QWidget& dialog) {
-    if (const auto* text = dialog.findChild<QTextEdit*>()) {
+    if (const auto* text = dialog.findChild<QTextEdit*>())
         return text->toPlainText();
-    }
     for (const QLineEdit* edit : dialog.findChildren<QLineEdit*>()) {
-        if (!edit->isReadOnly()) {
+        if (!edit->isReadOnly())
             return edit->text();
-        }
     }
     return QStringLiteral("no field");
 }
 
 QString name_in(const QWidget& dialog) {
     for (const QLineEdit* edit : dialog.findChildren<QLineEdit*>()) {
-        if (edit->isReadOnly()) {
+        if (edit->isReadOnly())
             return edit->text();
-        }
     }
     return QStringLiteral("no name");
 }
@@ -122,11 +119,10 @@ void ValuesViewTest::the_editor_follows_the_data() {
         QVERIFY(field);
         QTest::keyClick(field, Qt::Key_A, Qt::ControlModifier);
         for (const QChar c : typed) {
-            if (c == QLatin1Char('\n')) {
+            if (c == QLatin1Char('\n'))
                 QTest::keyClick(field, Qt::Key_Return);
-            } else {
+            else
                 QTest::keyClick(field, c.toLatin1());
-            }
         }
         press(*dialog, QDialogButtonBox::Ok);
     });
@@ -186,9 +182,8 @@ void ValuesViewTest::an_emptied_number_is_written_as_zero() {
 
 void ValuesViewTest::data_goes_to_no_other_key_s_value_data() {
     QTest::addColumn<QString>("name");
-    for (const char* name : {"text", "bytes", "list", "dword", "qword"}) {
+    for (const char* name : {"text", "bytes", "list", "dword", "qword"})
         QTest::newRow(name) << QString::fromLatin1(name);
-    }
 }
 
 void ValuesViewTest::data_goes_to_no_other_key_s_value() {

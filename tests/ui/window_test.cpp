@@ -25,18 +25,16 @@ namespace {
 
 QMenu* menu_of(const QWidget& bar_or_menu, const QString& title) {
     for (QAction* action : bar_or_menu.actions()) {
-        if (action->menu() && action->text() == title) {
+        if (action->menu() && action->text() == title)
             return action->menu();
-        }
     }
     return nullptr;
 }
 
 QAction* action_of(const QMenu& menu, const QString& text) {
     for (QAction* action : menu.actions()) {
-        if (action->text() == text) {
+        if (action->text() == text)
             return action;
-        }
     }
     return nullptr;
 }
@@ -78,9 +76,8 @@ private slots:
 void WindowTest::before_anything_is_selected_only_the_window_s_own_actions_are_enabled() {
     const MainWindow window;
     const SharedActions& actions = shared_actions();
-    for (const QAction* action : actions.new_action_group->actions()) {
+    for (const QAction* action : actions.new_action_group->actions())
         QVERIFY2(!action->isEnabled(), qPrintable(action->text()));
-    }
     QVERIFY(!actions.delete_action->isEnabled());
     QVERIFY(!actions.rename_action->isEnabled());
     const QMenu& edit_menu = *menu_of(*window.menuBar(), QStringLiteral("&Edit"));
@@ -130,9 +127,8 @@ void WindowTest::every_slot_stands_a_missing_model() {
 void WindowTest::menus() {
     const MainWindow window;
     QStringList titles;
-    for (const QAction* action : window.menuBar()->actions()) {
+    for (const QAction* action : window.menuBar()->actions())
         titles.append(action->text());
-    }
     QCOMPARE(titles.join(QLatin1Char(' ')), QStringLiteral("&File &Edit &View"));
     const QMenu& edit_menu = *menu_of(*window.menuBar(), QStringLiteral("&Edit"));
     QCOMPARE(texts_of(edit_menu).join(QLatin1Char('|')), QStringLiteral("&New|-|Delete|Rename|-|Find...|Find next"));
@@ -467,9 +463,8 @@ void WindowTest::a_name_like_markup_is_told_as_it_is() {
 void WindowTest::many_failures_share_a_box() {
     DialogHand hand;
     hand.then_press(QMessageBox::Ok);
-    for (int i = 0; i < 1000; ++i) {
+    for (int i = 0; i < 1000; i++)
         FailureReport::instance().report(QStringLiteral("many\\%1").arg(i), std::runtime_error("gone"));
-    }
     QTRY_VERIFY(hand.is_done());
     QCOMPARE(hand.text.count(QLatin1Char('\n')), 10);
     QVERIFY(hand.text.endsWith(QStringLiteral("More keys cannot be read: 990")));
@@ -479,10 +474,9 @@ void WindowTest::many_failures_share_a_box() {
 void WindowTest::rows_that_come_into_sight_bring_no_endless_row_of_boxes() {
     constexpr int most = 10;
     DialogHand hand;
-    for (int i = 0; i < 100; ++i) {
-        if (i < most) {
+    for (int i = 0; i < 100; i++) {
+        if (i < most)
             hand.then_press(QMessageBox::Ok);
-        }
         FailureReport::instance().report_row(QStringLiteral("scrolled\\#%1").arg(i), std::runtime_error("gone"));
         QTRY_VERIFY(hand.is_done());
         QVERIFY(hand.nothing_comes());

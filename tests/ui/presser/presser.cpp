@@ -27,12 +27,11 @@ void tell_window(const QMainWindow& window) {
     std::printf("size: %d x %d\n", window.width(), window.height());
     const auto* tree = window.findChild<QTreeView*>();
     const QAbstractItemModel& keys = *tree->model();
-    for (int top = 0; top < keys.rowCount(); ++top) {
+    for (int top = 0; top < keys.rowCount(); top++) {
         const QModelIndex group = keys.index(top, 0);
         tell("group", group.data().toString());
-        for (int row = 0; row < keys.rowCount(group); ++row) {
+        for (int row = 0; row < keys.rowCount(group); row++)
             tell("hive", keys.index(row, 0, group).data().toString());
-        }
     }
     tell("style", qApp->styleSheet());
 }
