@@ -128,7 +128,7 @@ void load_translations(QTranslator& program, QTranslator& toolkit) {
     QCoreApplication::installTranslator(&toolkit);
 }
 
-void prepare_streams() {
+void prepare_process() {
     for (int stream = STDIN_FILENO; stream <= STDERR_FILENO; stream++) {
         // The lowest free number is taken, and those below are in use by now.
         if (fcntl(stream, F_GETFD) == -1 && open("/dev/null", O_RDWR) != stream)

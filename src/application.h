@@ -34,7 +34,7 @@ void load_translations(QTranslator& program, QTranslator& toolkit);
 // Before anything is opened. Fills what is missing of the three standard streams with /dev/null, since a hive that got
 // the number of one would have messages written into it. And ignores the signals of a write past the file size limit or
 // into a closed pipe, which would end the program in the middle of a change: the write fails, as on a full disk.
-void prepare_streams();
+void prepare_process();
 
 // From here on an exception that nobody catches is told in one line on standard error before it ends the program.
 void install_terminate_handler();

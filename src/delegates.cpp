@@ -17,12 +17,6 @@
 
 namespace {
 
-void report_value_failure(const std::exception& failure) { FailureReport::instance().report_at_shown(failure); }
-
-void report_key_failure(const QModelIndex& index, const std::exception& failure) {
-    FailureReport::instance().report_row(key_path_of(index), failure);
-}
-
 // In place of a text that cannot be had.
 void say_unreadable(QStyleOptionViewItem& option) {
     option.features |= QStyleOptionViewItem::HasDisplay;
@@ -51,8 +45,24 @@ void NameDelegate::commit(const QWidget& editor, QAbstractItemModel& model, cons
             tell_later(refusal);
     } catch (const std::exception& failure) {
         // Told each time: the user has typed a name that is not there now.
-        const QString reason = QString::fromLocal8Bit(failure.what());
-        tell_later(FailureReport::instance().mark_told(key_path_for(index), reason));
+        tell_later(FailureReport::instance().mark_told(path_to_tell(index), reason_of(failure)));
+    }
+}
+
+void NameDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const {
+    try {
+        QStyledItemDelegate::paint(painter, option, index);
+    } catch (const std::exception& failure) {
+        report(index, failure);
+    }
+}
+
+QSize NameDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const {
+    try {
+        return QStyledItemDelegate::sizeHint(option, index);
+    } catch (const std::exception& failure) {
+        report(index, failure);
+        return {};
     }
 }
 
@@ -60,10 +70,10 @@ bool NameDelegate::eventFilter(QObject* editor, QEvent* event) {
     const int key = event->type() == QEvent::KeyPress ? static_cast<QKeyEvent*>(event)->key() : 0;
     if (key != Qt::Key_Tab && key != Qt::Key_Backtab)
         return QStyledItemDelegate::eventFilter(editor, event);
-    const QPointer<QWidget> named = qobject_cast<QWidget*>(editor);
-    emit commitData(named);
-    if (named)
-        emit closeEditor(named, NoHint);
+    const QPointer<QWidget> widget = qobject_cast<QWidget*>(editor);
+    emit commitData(widget);
+    if (widget)
+        emit closeEditor(widget, NoHint);
     return true;
 }
 
@@ -101,44 +111,30 @@ void ValueDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, con
     commit(*editor, *model, index, tr("The specified value name already exists."));
 }
 
-QString ValueDelegate::key_path_for(const QModelIndex& /*index*/) const {
+QString ValueDelegate::path_to_tell(const QModelIndex& /*index*/) const {
     return FailureReport::instance().shown_key();
 }
 
-void ValueDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const {
-    try {
-        QStyledItemDelegate::paint(painter, option, index);
-    } catch (const std::exception& failure) {
-        report_value_failure(failure);
-    }
-}
-
-QSize ValueDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const {
-    try {
-        return QStyledItemDelegate::sizeHint(option, index);
-    } catch (const std::exception& failure) {
-        report_value_failure(failure);
-        return {};
-    }
+void ValueDelegate::report(const QModelIndex& /*index*/, const std::exception& failure) const {
+    FailureReport::instance().report_at_shown(failure);
 }
 
 void ValueDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
     try {
-        // No more letters than half the cell's width in pixels.
+        // No more characters than half the cell's width in pixels, but at least shortest_cut.
         const qsizetype most = std::max(shortest_cut, qsizetype{option->rect.width() / 2});
         // The base class asks displayText for the text, and takes font, icon and colours from the same index.
         const QScopedValueRollback<qsizetype> cut(limit_, most + 1);
         QStyledItemDelegate::initStyleOption(option, index);
         option->text = with_visible_controls(option->text);
         // Letters that take no room would hide that more follow.
-        if (option->text.size() > most)
-            option->text = option->text.left(most) + QChar(0x2026);
+        option->text = shortened(option->text, most);
         // Bytes and numbers have one order, whichever way the rest of the window reads.
         if (index.column() == ValuesModel::DataColumn)
             option->direction = Qt::LeftToRight;
     } catch (const std::exception& failure) {
         say_unreadable(*option);
-        report_value_failure(failure);
+        report(index, failure);
     }
 }
 
@@ -146,23 +142,10 @@ void KeyDelegate::setModelData(QWidget* editor, QAbstractItemModel* model, const
     commit(*editor, *model, index, tr("The specified key name already exists."));
 }
 
-QString KeyDelegate::key_path_for(const QModelIndex& index) const { return key_path_of(index); }
+QString KeyDelegate::path_to_tell(const QModelIndex& index) const { return key_path_of(index); }
 
-void KeyDelegate::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const {
-    try {
-        QStyledItemDelegate::paint(painter, option, index);
-    } catch (const std::exception& failure) {
-        report_key_failure(index, failure);
-    }
-}
-
-QSize KeyDelegate::sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const {
-    try {
-        return QStyledItemDelegate::sizeHint(option, index);
-    } catch (const std::exception& failure) {
-        report_key_failure(index, failure);
-        return {};
-    }
+void KeyDelegate::report(const QModelIndex& index, const std::exception& failure) const {
+    FailureReport::instance().report_row(key_path_of(index), failure);
 }
 
 void KeyDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const {
@@ -171,6 +154,6 @@ void KeyDelegate::initStyleOption(QStyleOptionViewItem* option, const QModelInde
         option->text = with_visible_controls(option->text);
     } catch (const std::exception& failure) {
         say_unreadable(*option);
-        report_key_failure(index, failure);
+        report(index, failure);
     }
 }

@@ -13,8 +13,8 @@
 #include <limits>
 
 // What the two have in common: a name that was typed in place is written back when it was changed, and one that did
-// not come to be is told. Not while it is being committed: the view goes on with the editor afterwards, which a box's
-// event loop can outlive.
+// not come to be is told. The box comes later, from the event loop: after a commit the view goes on with the editor,
+// which may not live as long as a box is open.
 class NameDelegate : public QStyledItemDelegate {
     Q_OBJECT
 
@@ -25,20 +25,26 @@ public:
     // Names are longer than the toolkit's editor takes by default; one that it cut would pass for a new name.
     QWidget* createEditor(QWidget* parent, const QStyleOptionViewItem& option, const QModelIndex& index) const override;
 
-    // Tells each name that was refused and not told yet, and returns when the user has seen it. Comes from the event
-    // loop by itself.
+    // Tells each name that was refused and not told yet, and returns when the user has seen it. Called by the event
+    // loop where nobody did before.
     void tell_refused_names() const;
+
+    // What a row throws is reported here: an exception must not pass a view that paints.
+    void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override;
+    QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override;
 
 protected:
     // Tab ends a naming as Return does. The toolkit would go on to the name, or another cell, of the next row, which
     // the next thing typed is then taken for.
     bool eventFilter(QObject* editor, QEvent* event) override;
-    // An exception must not pass the view, which would take the editor for one being committed from then on, and
-    // commit no other.
+    // Writes the name back; `refusal` is told where the model refuses it. An exception must not pass the view, which
+    // would take the editor for one being committed from then on, and commit no other.
     void commit(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index,
                 const QString& refusal) const;
     // What is named when the name was lost to an exception.
-    virtual QString key_path_for(const QModelIndex& index) const = 0;
+    virtual QString path_to_tell(const QModelIndex& index) const = 0;
+    // Reports what a row threw as it was laid out or painted.
+    virtual void report(const QModelIndex& index, const std::exception& failure) const = 0;
 
 private:
     bool write_back(const QWidget& editor, QAbstractItemModel& model, const QModelIndex& index) const;
@@ -62,14 +68,12 @@ public:
     QString displayText(const QVariant& value, const QLocale& locale) const override;
     void setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const override;
 
-    void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override;
-    QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override;
-
 protected:
     // Lays out only as much of a long datum as a cell can show: painting a megabyte costs what a line costs. Control
     // characters are made visible.
     void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
-    QString key_path_for(const QModelIndex& index) const override;
+    QString path_to_tell(const QModelIndex& index) const override;
+    void report(const QModelIndex& index, const std::exception& failure) const override;
 
 private:
     // How many characters displayText need give; fewer than all only while a cell is laid out.
@@ -84,11 +88,9 @@ public:
 
     void setModelData(QWidget* editor, QAbstractItemModel* model, const QModelIndex& index) const override;
 
-    void paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const override;
-    QSize sizeHint(const QStyleOptionViewItem& option, const QModelIndex& index) const override;
-
 protected:
     // The name on one line, its control characters made visible.
     void initStyleOption(QStyleOptionViewItem* option, const QModelIndex& index) const override;
-    QString key_path_for(const QModelIndex& index) const override;
+    QString path_to_tell(const QModelIndex& index) const override;
+    void report(const QModelIndex& index, const std::exception& failure) const override;
 };

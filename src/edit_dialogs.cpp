@@ -25,17 +25,17 @@ namespace {
 // reads it.
 class Loan {
 public:
-    explicit Loan(QWidget* widget) : widget_(widget) {}
-    ~Loan() { widget_->setParent(nullptr); }
+    explicit Loan(QWidget& widget) : widget_(widget) {}
+    ~Loan() { widget_.setParent(nullptr); }
     Loan(const Loan&) = delete;
     Loan& operator=(const Loan&) = delete;
 
 private:
-    QWidget* widget_;
+    QWidget& widget_;
 };
 
 // Lays out an editor around its data widget and runs it; true for Ok.
-bool run_editor(const QString& title, const QString& value_name, QWidget* data_widget) {
+bool run_editor(const QString& title, const QString& value_name, QWidget& data_widget) {
     QDialog dialog;
     const Loan loan(data_widget);
     dialog.setWindowTitle(title);
@@ -47,15 +47,15 @@ bool run_editor(const QString& title, const QString& value_name, QWidget* data_w
     auto* name_label = new QLabel(QCoreApplication::translate("ValuesView", "Value name:"));
     name_label->setBuddy(name_edit);
     auto* data_label = new QLabel(QCoreApplication::translate("ValuesView", "Value data:"));
-    data_label->setBuddy(data_widget);
+    data_label->setBuddy(&data_widget);
 
     auto* layout = new QVBoxLayout(&dialog);
     layout->addWidget(name_label);
     layout->addWidget(name_edit);
     layout->addWidget(data_label);
-    layout->addWidget(data_widget);
+    layout->addWidget(&data_widget);
     layout->addWidget(buttons);
-    make_compact(dialog, *data_widget);
+    make_compact(dialog, data_widget);
     return dialog.exec() == QDialog::Accepted;
 }
 
@@ -82,7 +82,7 @@ bool edit_string(QAbstractItemModel& model, const QString& value_name, const QSt
     QLineEdit edit;
     take_any_length(edit);
     edit.setText(data);
-    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, &edit))
+    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit String", "dialog title"), value_name, edit))
         return true;
     // Compared, since the line edit's own mark of a change misses text that an assistive program has put in.
     const QString text = edit.text();
@@ -98,10 +98,8 @@ bool edit_binary(QAbstractItemModel& model, const QString& value_name, const QBy
     // at some ten thousand digits.
     edit.setValidator(new QRegularExpressionValidator(QRegularExpression(QStringLiteral("[a-fA-F0-9]*")), &edit));
     take_back_invalid_text(edit);
-    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Binary Value", "dialog title"), value_name,
-                    &edit)) {
+    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Binary Value", "dialog title"), value_name, edit))
         return true;
-    }
     return model.setData(data_index, QByteArray::fromHex(edit.text().toLatin1()), Qt::DisplayRole);
 }
 
@@ -115,9 +113,7 @@ bool edit_multi_string(QAbstractItemModel& model, const QString& value_name, con
     // Plain text, and not line by line: what looks like markup is data, and so is an empty first line.
     const StringLines lines(data);
     lines.fill(edit);
-    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Multi-String", "dialog title"), value_name,
-                    &edit)) {
+    if (!run_editor(QCoreApplication::translate("ValuesView", "Edit Multi-String", "dialog title"), value_name, edit))
         return true;
-    }
     return model.setData(data_index, lines.strings_in(*edit.document()), Qt::DisplayRole);
 }

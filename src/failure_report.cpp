@@ -13,8 +13,6 @@ namespace {
 // A hive can hold thousands of damaged keys; a box must still fit the screen.
 constexpr qsizetype max_lines = 10;
 
-QString reason_of(const std::exception& failure) { return QString::fromLocal8Bit(failure.what()); }
-
 }  // namespace
 
 FailureReport::FailureReport(QObject* parent) : QObject(parent) {}
@@ -86,6 +84,8 @@ void FailureReport::show_pending() {
     scheduled_ = false;
 }
 
+QString reason_of(const std::exception& failure) { return QString::fromLocal8Bit(failure.what()); }
+
 void tell_failure(QWidget* parent, const QString& text) {
     QMessageBox box(QMessageBox::Critical, QCoreApplication::applicationName(), text, QMessageBox::Ok, parent);
     box.setTextFormat(Qt::PlainText);
@@ -100,7 +100,7 @@ void meet_failures(QWidget* parent, const QString& key_path, const std::function
     }
 }
 
-void ask_for_name(const QModelIndex& index) {
+void read_name_ahead(const QModelIndex& index) {
     const QVariant name = index.data(Qt::EditRole);
     const Qt::ItemFlags flags = index.flags();
     if (!name.isValid() && flags.testFlag(Qt::ItemIsEditable)) {

@@ -66,6 +66,9 @@ private:
     bool scheduled_ = false;
 };
 
+// What an exception says of itself.
+QString reason_of(const std::exception& failure);
+
 // A critical box with the application's name that shows the text letter by letter: a key's name may look like markup.
 void tell_failure(QWidget* parent, const QString& text);
 
@@ -75,7 +78,7 @@ void meet_failures(QWidget* parent, const QString& key_path, const std::function
 
 // Reads what an editor in place at `index` will ask for. What cannot be read throws here, and not from inside the
 // toolkit, whose editing loses memory when an exception passes it.
-void ask_for_name(const QModelIndex& index);
+void read_name_ahead(const QModelIndex& index);
 
 // The names from the outermost key down to `index`, joined with backslashes. For a name that cannot be read
 // stands the key's place among its siblings, as in "TOP\HIVE\#3": this never throws.

@@ -42,7 +42,7 @@ void KeysView::setModel(QAbstractItemModel* model) {
     header()->setStretchLastSection(false);
 }
 
-QModelIndex KeysView::in_place(const QModelIndex& key) {
+QModelIndex KeysView::index_now(const QModelIndex& key) {
     const QAbstractItemModel* model = key.model();
     if (!model || model->index(key.row(), 0, key.parent()) == key)
         return key;
@@ -93,6 +93,11 @@ QItemSelectionModel::SelectionFlags KeysView::selectionCommand(const QModelIndex
     return keeping_highlight(QTreeView::selectionCommand(index, event), index, event);
 }
 
+void KeysView::selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) {
+    QTreeView::selectionChanged(selected, deselected);
+    follow_highlight(*this);
+}
+
 void KeysView::show_keys_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
     if (std::exchange(menu_is_stale_, false) || !end_editing_before_change(*this))
@@ -139,9 +144,11 @@ void KeysView::delete_key() {
     show_current();
     if (!asked.isValid() || !confirm_remove())
         return;
-    const QModelIndex current = in_place(asked);
+    const QModelIndex current = index_now(asked);
     if (!current.isValid())
         return;
+    // Not one below it: those go first, and would pass the place on to a key that is going as well.
+    setCurrentIndex(current);
     const QPersistentModelIndex parent = current.parent();
     const int row = current.row();
     const int rows = model()->rowCount(parent);
@@ -180,7 +187,7 @@ void KeysView::run_rename_key_action(bool /*checked*/) {
     if (!current.isValid())
         return;
     meet_failures(this, key_path_of(current), [&] {
-        ask_for_name(current);
+        read_name_ahead(current);
         show_current();
         edit(current);
     });
@@ -244,8 +251,8 @@ void KeysView::expand_below(const QModelIndex& top) {
     }
 }
 
-// The keys that open and close branches go no further: the tree's own expansion knows no end, and to its type-ahead
-// they are letters, which select a key that begins with one.
+// The keyboard's *, + and - go no further: the tree's own expansion knows no end, and to its type-ahead they are
+// letters, which select a registry key whose name begins with one.
 void KeysView::keyPressEvent(QKeyEvent* event) {
     switch (event->key()) {
     case Qt::Key_Asterisk:
@@ -259,7 +266,7 @@ void KeysView::keyPressEvent(QKeyEvent* event) {
         break;
     case Qt::Key_F2:
         meet_failures(this, key_path_of(currentIndex()), [&] {
-            ask_for_name(currentIndex());
+            read_name_ahead(currentIndex());
             show_current();
             QTreeView::keyPressEvent(event);
         });
@@ -300,7 +307,6 @@ bool KeysView::take_press_from_naming(const QMouseEvent& press) {
 }
 
 void KeysView::mousePressEvent(QMouseEvent* event) {
-    // A branch is opened without becoming current: what it throws is about this key.
     const QModelIndex index = indexAt(event->position().toPoint());
     if (index.isValid()) {
         // The context menu's actions are about the current key, so it must be the one that was clicked, also where that
@@ -312,6 +318,7 @@ void KeysView::mousePressEvent(QMouseEvent* event) {
             setCurrentIndex(index);
             setAutoScroll(scrolls);
         }
+        // A branch is opened without becoming current: what that throws is about the key that was pressed.
         FailureReport::instance().set_current_key(key_path_of(index));
     }
     QTreeView::mousePressEvent(event);

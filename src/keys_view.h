@@ -18,8 +18,9 @@ public:
 
     void setModel(QAbstractItemModel* model) override;
 
-    // The index of the same key at the row where the key stands now.
-    static QModelIndex in_place(const QModelIndex& key);
+    // The index of the same key at the row where it stands now; invalid where its parent does not list it any more. The
+    // key object must still be there.
+    static QModelIndex index_now(const QModelIndex& key);
 
     // Asked before a press of the mouse takes the keyboard from the editor of a name. Ends the naming; where that
     // moves the rows, the key that was pressed becomes current, and true says that the press has done its work. The
@@ -41,6 +42,7 @@ public slots:
 protected:
     bool event(QEvent* event) override;
     QItemSelectionModel::SelectionFlags selectionCommand(const QModelIndex& index, const QEvent* event) const override;
+    void selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) override;
     void keyPressEvent(QKeyEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
     void paintEvent(QPaintEvent* event) override;

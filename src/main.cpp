@@ -1,5 +1,6 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
+//
 // The program's entry: translations, the command line, one model over every hive named, one window.
 
 #include "application.h"
@@ -30,7 +31,7 @@ void tell_hibernated() {
 }  // namespace
 
 int main(int argc, char** argv) {
-    prepare_streams();
+    prepare_process();
     install_terminate_handler();
     Application application(argc, argv);
     QTranslator program_translator;

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 #include "main_window.h"
 
+#include "elided_label.h"
 #include "failure_report.h"
 #include "finish_editing.h"
 #include "keys_view.h"
@@ -24,28 +25,12 @@
 #include <QSplitter>
 #include <QStatusBar>
 
-namespace {
-
-// Parent steps from `index` to the top, no more than three; -1 for no index.
-int depth_of(const QModelIndex& index) {
-    constexpr int deepest = 3;
-    int depth = -1;
-    for (QModelIndex step = index; step.isValid() && depth < deepest; step = step.parent())
-        depth++;
-    return depth;
-}
-
-}  // namespace
-
 MainWindow::MainWindow(QWidget* parent, Qt::WindowFlags flags)
     : QMainWindow(parent, flags), key_delegate(this), value_delegate(this),
       values_proxy(std::make_unique<ValuesProxyModel>()) {
     setWindowTitle(QCoreApplication::applicationName());
-    shared_actions();
-    find_mode = RegModel::FindKeys;
-    find_flags = Qt::MatchContains;
     make_views();
-    status_label = new QLabel(QString(), this);
+    status_label = new ElidedLabel(QString(), this);
     // A path that is wider than the window is cut, and must not widen the window.
     status_label->setMinimumWidth(1);
     // Key names are data: what looks like markup in one is shown as it is.
@@ -91,6 +76,8 @@ void MainWindow::make_views() {
     values_table->setEditTriggers(QAbstractItemView::EditKeyPressed);
     values_table->setContextMenuPolicy(Qt::CustomContextMenu);
     values_table->verticalHeader()->setVisible(false);
+    // What a command asks about is seen: neither view can be dragged shut, and keep the keyboard.
+    splitter->setChildrenCollapsible(false);
     // The values take the larger share, and what the window grows by.
     splitter->setStretchFactor(0, 0);
     splitter->setStretchFactor(1, 1);
@@ -222,10 +209,10 @@ void MainWindow::set_values_source(RegKey* key) {
 
 void MainWindow::set_key_actions(const QModelIndex& key) {
     const SharedActions& actions = shared_actions();
-    const int depth = depth_of(key);
-    actions.new_key_action->setEnabled(depth >= 2);
-    actions.delete_action->setEnabled(depth >= 3);
-    actions.rename_action->setEnabled(depth >= 3);
+    const bool is_editable = key.flags().testFlag(Qt::ItemIsEditable);
+    actions.new_key_action->setEnabled(RegModel::editable_key(key) != nullptr);
+    actions.delete_action->setEnabled(is_editable);
+    actions.rename_action->setEnabled(is_editable);
 }
 
 void MainWindow::value_selected(const QModelIndex& current) {
@@ -260,7 +247,8 @@ void MainWindow::refresh_views() {
         return;
     }
     meet_failures(this, FailureReport::instance().shown_key(), [this] {
-        // The proxy leaves the current index at its row; the user's next key is meant for the value, not for its place.
+        // The proxy leaves the current index at its row; what the user presses next is meant for the value, not for
+        // its place.
         const QModelIndex current = values_proxy->mapToSource(values_table->currentIndex());
         values_proxy->sort(0, Qt::AscendingOrder);
         if (current.isValid())

@@ -31,7 +31,7 @@ public:
     // Leaves the key model alone: it is gone by then.
     ~MainWindow() override;
 
-    // `model` is not owned and must live until the event loop has ended.
+    // Called once. `model` is not owned and must live until the event loop has ended; null leaves the tree empty.
     void set_model(RegModel* model);
 
 public slots:
@@ -57,7 +57,7 @@ private:
     void make_views();
     void make_menus();
     void place_splitter();
-    void show_status(const QModelIndex& key);
+    void show_status(const QModelIndex& key);  // and notes for failures that it is the shown one
     void show_values_of(const QModelIndex& key);
     void set_values_source(RegKey* key);
     void let_go_of_lost_key();
@@ -75,12 +75,12 @@ private:
     // Destroyed from the last one on: the source model, then the proxy over it.
     std::unique_ptr<ValuesProxyModel> values_proxy;
     std::unique_ptr<ValuesModel> values_source;
-    QDialog* search_dialog = nullptr;
+    QDialog* search_dialog = nullptr;  // null but while it is open; deletes itself
     QString find_term;
-    RegModel::FindMode find_mode;
-    Qt::MatchFlags find_flags;
+    RegModel::FindMode find_mode = RegModel::FindKeys;
+    Qt::MatchFlags find_flags = Qt::MatchContains;
     QFuture<RegModel::FindResult> find_future;
     QFutureWatcher<RegModel::FindResult> find_watcher;
     bool can_find_next = false;
-    QPointer<RegModel> key_model;
+    QPointer<RegModel> key_model;  // null before set_model, and once the model is gone
 };

@@ -1,5 +1,6 @@
 // SPDX-FileCopyrightText: 2026 The tallowfen developers
 // SPDX-License-Identifier: MIT
+//
 // The window's search: one walk of the key model on a worker thread behind a modal dialog.
 
 #include "failure_report.h"
@@ -29,7 +30,7 @@ QString failure_of(QFuture<RegModel::FindResult> future) {
             std::rethrow_exception(wrapped.exception());
         }
     } catch (const std::exception& failure) {
-        return QString::fromLocal8Bit(failure.what());
+        return reason_of(failure);
     }
     return {};
 }
@@ -113,7 +114,7 @@ void MainWindow::show_find_result() {
 }
 
 void MainWindow::show_hit(const RegModel::FindResult& hit) {
-    const QModelIndex key = KeysView::in_place(hit.key);
+    const QModelIndex key = KeysView::index_now(hit.key);
     for (QModelIndex step = key; step.isValid(); step = step.parent())
         keys_tree->setExpanded(step, true);
     keys_tree->setCurrentIndex(key);
@@ -122,12 +123,14 @@ void MainWindow::show_hit(const RegModel::FindResult& hit) {
         // Where the key was current already, and had been let go of.
         reload_values(key);
     }
-    if (hit.value_row >= 0) {
-        // The row is one of the sorted table, which a value added or renamed since has left unsorted.
-        values_proxy->sort(0, Qt::AscendingOrder);
-        values_table->setCurrentIndex(values_proxy->index(hit.value_row, 0));
-        values_table->show_current();
-    }
     // What is pressed next is about the hit.
-    (hit.value_row >= 0 ? static_cast<QWidget*>(values_table) : keys_tree)->setFocus();
+    if (hit.value_row < 0) {
+        keys_tree->setFocus();
+        return;
+    }
+    // The row is one of the sorted table, which a value added or renamed since has left unsorted.
+    values_proxy->sort(0, Qt::AscendingOrder);
+    values_table->setCurrentIndex(values_proxy->index(hit.value_row, 0));
+    values_table->show_current();
+    values_table->setFocus();
 }

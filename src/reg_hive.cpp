@@ -15,6 +15,7 @@
 #include <cassert>
 #include <cerrno>
 #include <cstdio>
+#include <cstring>
 #include <set>
 #include <stdexcept>
 #include <utility>
@@ -100,10 +101,10 @@ void RegHive::open_file() {
 
 // Windows numbers a hive's writes in two places; where they differ it has changes waiting in its logs.
 void RegHive::warn_if_dirty() {
-    constexpr qint64 sequences = 4;
+    constexpr qint64 sequence_numbers = 4;  // bytes from the file's beginning: two numbers of four bytes
     char numbers[8];
-    if (file_.seek(sequences) && file_.read(numbers, sizeof numbers) == static_cast<qint64>(sizeof numbers) &&
-        memcmp(numbers, numbers + 4, 4) != 0)
+    if (file_.seek(sequence_numbers) && file_.read(numbers, sizeof numbers) == static_cast<qint64>(sizeof numbers) &&
+        std::memcmp(numbers, numbers + 4, 4) != 0)
         std::fprintf(stderr, "warning: %s was not closed properly; Windows may replay its logs over changes\n",
                      qPrintable(file_.fileName()));
 }

@@ -36,7 +36,7 @@ private:
 // a handle goes up from key to key. They are the standard library's, which the thread sanitizer can see into.
 class RegHive {
 public:
-    // Opens the file and loads the hive; its root key hangs below parent, which it is not appended to.
+    // Opens the file and loads the hive; its root key hangs below `parent`, which it is not appended to.
     // std::runtime_error("Cannot open file"): missing, no regular file, no permission, locked, or open here already.
     // std::runtime_error("Cannot load hive"): no hive that can be relied on.
     RegHive(const QString& name, const QString& path, AbstractRegKey* parent);
@@ -52,7 +52,8 @@ public:
     // The engine handle of a key of this hive; opened and cached when it is not there. Valid only while the caller
     // holds both locks, see Dialogue. std::runtime_error("ROpenSubKey failed").
     RegistryKey* key_handle(const RegKey* key);
-    // The same for a key that its parent does not list yet.
+    // Opens and caches the handle of a key as the index-th subkey of `parent`, whether the parent's object lists it yet
+    // or not. Throws as key_handle; also where another key lies there by now.
     RegistryKey* open_child_handle(const RegKey* key, const RegKey* parent, int index);
     void clear_handle_cache();
     // Takes one key's handle out of the cache, when the key object goes.

@@ -24,7 +24,7 @@ constexpr uint32_t longest_shown_name = 512;  // characters; a key with a longer
 using NameBuffer = std::array<char, 513>;
 constexpr uint32_t name_room = NameBuffer().size() - 1;
 
-// size receives the name's length in bytes.
+// `size` receives the name's length in bytes.
 int32_t subkey_name(RegistryKey* handle, uint32_t index, NameBuffer& name, uint32_t& size) {
     name.fill('\0');
     size = name_room;
@@ -149,7 +149,9 @@ AbstractRegKey* RegKey::shown_child(int i) {
         auto unopened = std::make_unique<RegKey>(hive_, this);
         unopened->set_number_hint(static_cast<size_t>(i));
         unopened->stands_in_ = true;
-        return children_[static_cast<size_t>(i)] = unopened.release();
+        AbstractRegKey*& slot = children_[static_cast<size_t>(i)];
+        slot = unopened.release();
+        return slot;
     }
 }
 

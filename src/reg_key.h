@@ -104,7 +104,7 @@ public:
     // null: the data cannot be read. std::invalid_argument("index"): not even its name and type can.
     std::unique_ptr<RegValue> read_value(int index);
     // The name and type of a value without its data, whose variant stays invalid; throws as read_value.
-    RegValue read_value_name(int index);
+    RegValue read_value_without_data(int index);
     // The name alone; nothing when the value's record cannot be read.
     std::optional<QString> value_name(int index);
     // The setters store under a name, making the value when there is none. With an index, the value of that name must

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 //
 // The values of a key: stored bytes to toolkit values and back.
+
 #include "reg_hive.h"
 #include "reg_key.h"
 #include "stored_text.h"
@@ -20,23 +21,24 @@ namespace {
 
 constexpr int longest_value_name = 16383;  // characters, as Windows has it
 
-struct EnumeratedName {
+struct ValueRecord {
     QString name;
     uint32_t type;
     uint32_t data_size;  // bytes, as stored
 };
 
-EnumeratedName enumerate_name(RegistryKey* handle, int index) {
+// What a value's record says without its data. std::invalid_argument("index"): there is none, or it cannot be read.
+ValueRecord read_record(RegistryKey* handle, int index) {
     QByteArray buffer(256, '\0');
     uint32_t size = 256;
-    EnumeratedName found = {};
+    ValueRecord found = {};
     const auto ask = [&] {
         return REnumValueW(handle, static_cast<uint32_t>(index), reinterpret_cast<uint16_t*>(buffer.data()), &size,
                            &found.type, nullptr, &found.data_size);
     };
     int32_t status = index < 0 ? int32_t{R_NO_MORE_ITEMS} : ask();
     if (status == R_BUFFER_OVERFLOW) {
-        size *= 2;
+        size *= 2;  // bytes; what was handed back is enough already
         buffer.resize(static_cast<qsizetype>(size));
         status = ask();
     }
@@ -132,12 +134,14 @@ bool is_text(uint type) { return type == REG_SZ || type == REG_EXPAND_SZ || type
 
 // The 8-bit name that leads to the value at an index and to no other; null when none does.
 QByteArray name_leading_to(RegistryKey* handle, int index) {
-    QByteArray name(513, '\0');
-    uint32_t size = 512;
+    constexpr uint32_t room = 512;
+    // One byte more than the engine is told of, preset to zero: a name that fills its room comes without a terminator.
+    QByteArray name(room + 1, '\0');
+    uint32_t size = room;
     const auto position = static_cast<uint32_t>(index);
     if (REnumValueA(handle, position, name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS)
         return QByteArray();
-    if (size > 511) {
+    if (size >= room) {  // cut, or without a terminator
         name = QByteArray(static_cast<qsizetype>(size) + 2, '\0');
         size++;
         if (REnumValueA(handle, position, name.data(), &size, nullptr, nullptr, nullptr) != R_SUCCESS)
@@ -146,7 +150,7 @@ QByteArray name_leading_to(RegistryKey* handle, int index) {
     if (RFindValueA(handle, name.constData()) == index)
         return QByteArray(name.constData());
     // A name that is stored in UTF-16, though 8 bits could carry it.
-    const StoredText text = stored_text(enumerate_name(handle, index).name);
+    const StoredText text = stored_text(read_record(handle, index).name);
     return text.fits && RFindValueA(handle, text.bytes.constData()) == index ? text.bytes : QByteArray();
 }
 
@@ -165,9 +169,9 @@ bool is_surely_free(RegistryKey* handle, const char* name) {
 
 }  // namespace
 
-RegValue RegKey::read_value_name(int index) {
+RegValue RegKey::read_value_without_data(int index) {
     const RegHive::Dialogue dialogue(hive_);
-    const EnumeratedName found = enumerate_name(hive_->key_handle(this), index);
+    const ValueRecord found = read_record(hive_->key_handle(this), index);
     RegValue value;
     value.name = found.name;
     value.type = found.type;
@@ -178,7 +182,7 @@ std::optional<QString> RegKey::value_name(int index) {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
     try {
-        return enumerate_name(handle, index).name;
+        return read_record(handle, index).name;
     } catch (const std::invalid_argument&) {
         return std::nullopt;
     }
@@ -187,7 +191,7 @@ std::optional<QString> RegKey::value_name(int index) {
 std::unique_ptr<RegValue> RegKey::read_value(int index) {
     const RegHive::Dialogue dialogue(hive_);
     RegistryKey* handle = hive_->key_handle(this);
-    const EnumeratedName found = enumerate_name(handle, index);
+    const ValueRecord found = read_record(handle, index);
     if (found.type == REG_DWORD || found.type == REG_DWORD_BIG_ENDIAN) {
         uint number = 0;
         if (!read_number(handle, index, number))
@@ -289,7 +293,7 @@ bool RegKey::rename_value(int index, const QString& new_name) {
         name_leading_to(handle, index).isNull() || read_value(index) == nullptr)
         return false;
     // The bytes go over as they are stored: a record cannot carry text behind a zero, an odd size or a short number.
-    const EnumeratedName old = enumerate_name(handle, index);
+    const ValueRecord old = read_record(handle, index);
     QByteArray bytes;
     return read_bytes(hive_, handle, index, old.data_size, bytes) &&
            store_value(new_name, old.type, bytes, new_value) && delete_value(index);

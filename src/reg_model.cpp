@@ -15,7 +15,7 @@
 
 namespace {
 
-constexpr int editable_ancestors = 3;
+constexpr int editable_ancestors = 3;  // above a key that can be renamed and deleted: group, root, key
 
 QStringList split_mount_name(const QString& name) { return name.split(QLatin1Char('/'), Qt::SkipEmptyParts); }
 
@@ -23,12 +23,7 @@ QStringList split_mount_name(const QString& name) { return name.split(QLatin1Cha
 
 RegModel::RegModel(QObject* parent) : QAbstractItemModel(parent) {}
 
-// The hives go before the groups that their root keys hang below.
-RegModel::~RegModel() {
-    for (auto& hive : hives_)
-        hive.reset();
-    top_level_.clear();
-}
+RegModel::~RegModel() = default;
 
 bool RegModel::is_mount_name(const QString& name) { return split_mount_name(name).size() >= 2; }
 
@@ -80,7 +75,7 @@ int RegModel::rowCount(const QModelIndex& parent) const {
     return parent.isValid() ? key_of(parent)->child_count() : static_cast<int>(top_level_.size());
 }
 
-int RegModel::columnCount(const QModelIndex&) const { return 1; }
+int RegModel::columnCount(const QModelIndex& /*parent*/) const { return 1; }
 
 // What a screen reader says, which is what is shown. It asks through parts of the toolkit that lose memory when an
 // exception passes them.
@@ -134,7 +129,7 @@ RegKey* RegModel::editable_key(const QModelIndex& index) {
 // Whether an index still says where its key is. What acts on a row must not act on another key that has come to it.
 bool RegModel::is_current(const QModelIndex& index) const { return row_of(key_of(index)) == index.row(); }
 
-bool RegModel::setData(const QModelIndex& index, const QVariant& value, int) {
+bool RegModel::setData(const QModelIndex& index, const QVariant& value, int /*role*/) {
     const QModelIndex parent = index.parent();
     RegKey* const key = editable_key(parent);
     if (key == nullptr || !is_current(index))

@@ -16,10 +16,10 @@ class AbstractRegKey;
 class RegHive;
 class RegKey;
 
-// Every index carries its key object as internal pointer, in column 0. Depths are fixed: groups, hive roots below them,
-// keys below those. Keys are renamed and deleted from depth 4 on, and get new subkeys and show values from depth 3 on.
-// data(), the changes and the search throw std::runtime_error where a key cannot be opened. Who meets that:
-// docs/architecture.md.
+// Every index carries its key object as internal pointer, in column 0. Levels are fixed: groups, hive roots below them,
+// keys below those. Keys directly below a root get new subkeys and show their values; all below them can be renamed and
+// deleted as well. data(), the changes and the search throw std::runtime_error where a key cannot be opened. Who meets
+// that: docs/architecture.md.
 class RegModel : public QAbstractItemModel {
     Q_OBJECT
 
@@ -57,7 +57,7 @@ public:
     // Makes a subkey; returns its row. -1: no parent; -2: not under this one; -3: refused.
     int new_key(const QModelIndex& parent);
 
-    // The key behind an index at depth 3 or more, else null. One more level than those that flags() lets rename.
+    // The key behind an index below a hive's root, else null. flags() does not let those directly below it be renamed.
     static RegKey* editable_key(const QModelIndex& index);
 
     // How many keys the hives have room for. More are met only where a damaged hive lists some again and again.
@@ -103,6 +103,7 @@ private:
     void let_frames_follow_new_key(const QModelIndex& made);
     void renumber_frames();
 
+    // Destroyed from the last one on: the hives, then the groups that their root keys hang below.
     std::vector<std::unique_ptr<AbstractRegKey>> top_level_;
     std::vector<std::unique_ptr<RegHive>> hives_;
     std::vector<Frame> search_;  // the last one is visited next

@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: MIT
 //
 // The search of RegModel: depth first, each key before its values before its subkeys, resumable after every hit.
+
 #include "reg_hive.h"
 #include "reg_key.h"
 #include "reg_model.h"
@@ -19,10 +20,9 @@
 namespace {
 
 constexpr int frames_between_stop_checks = 10;
-// A key takes at least its record and its cell's size word in the file.
-constexpr qint64 smallest_key = 80;
 
-// The same for a value.
+// Bytes that a key or a value takes in the file at least: its record and its cell's size word.
+constexpr qint64 smallest_key = 80;
 constexpr qint64 smallest_value = 24;
 
 qint64 most_keys_in(const RegHive& hive) { return 1 + hive.file_size() / smallest_key; }

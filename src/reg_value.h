@@ -26,11 +26,11 @@ enum RegType : quint32 {
     REG_QWORD = 11,
 };
 
-// Byte orders of a 32-bit number as it is stored: types 4 and 5.
+// Byte orders of a 32-bit number as it is stored: REG_DWORD and REG_DWORD_BIG_ENDIAN.
 constexpr int little_endian_order = 1234;
 constexpr int big_endian_order = 4321;
 
-// The name of a type, null for one above 11.
+// The name of a type, null for one above REG_QWORD.
 QString type_name(quint32 type);
 
 // The data of the default value where a key has none. A type of its own, since a null variant never reaches
@@ -38,18 +38,22 @@ QString type_name(quint32 type);
 struct ValueNotSet {};
 Q_DECLARE_METATYPE(ValueNotSet)
 
+// Whether a datum says that there is none. No other datum is of a type beyond the toolkit's own.
+inline bool is_not_set(const QVariant& data) { return data.typeId() >= QMetaType::User; }
+
 // A value with its data in the toolkit type that its registry type calls for.
 struct RegValue {
     RegValue() = default;
-    // Text of types 1, 2 and 6.
+    // Text: REG_SZ, REG_EXPAND_SZ and REG_LINK.
     RegValue(const QString& name, const QString& text, quint32 type);
     // Bytes of any other type.
     RegValue(const QString& name, const QByteArray& bytes, quint32 type);
-    // A number of 32 bits, as the user sees it; order 1234 makes it type 4, any other type 5.
+    // A number of 32 bits, as the user sees it; little_endian_order makes it REG_DWORD, any
+    // other REG_DWORD_BIG_ENDIAN.
     RegValue(const QString& name, uint number, int order);
-    // A number of 64 bits, type 11.
+    // A number of 64 bits: REG_QWORD.
     RegValue(const QString& name, qulonglong number);
-    // A list of texts, type 7.
+    // A list of texts: REG_MULTI_SZ.
     RegValue(const QString& name, const QStringList& list);
 
     QString name;  // empty for the unnamed (default) value

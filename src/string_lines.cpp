@@ -2,17 +2,24 @@
 // SPDX-License-Identifier: MIT
 #include "string_lines.h"
 
+#include <QHash>
 #include <QTextBlock>
 #include <QTextDocument>
 #include <QTextEdit>
+
+#include <algorithm>
 
 namespace {
 
 // Not toPlainText of the document: that turns a non-breaking space into a blank.
 QStringList lines_of(const QTextBlock& block, bool had_line_separators) {
     const QString text = without_zeros(block.text());
-    // A pasted one; the user means a line.
+    // Where none was shown, a line separator was pasted, and the user means a new line by it.
     return had_line_separators ? QStringList{text} : text.split(QChar::LineSeparator);
+}
+
+bool stands_at(qsizetype place, const QStringList& part, const QStringList& lines) {
+    return lines.mid(place, part.size()) == part;
 }
 
 }  // namespace
@@ -61,15 +68,12 @@ QStringList StringLines::strings_in(const QTextDocument& document) const {
     return strings + strings_between(next, lines_.size(), changed);
 }
 
-// Of the strings from first up to end those whose lines stand at the head or the tail of some lines, and the rest
-// of the lines between. Return at the beginning of a line makes of the line, not of the new one, another block.
+// Of the strings from first up to end those whose lines stand at the head or the tail of some lines, and what is
+// between them. Return at the beginning of a line makes of the line, not of the new one, another block.
 QStringList StringLines::strings_between(qsizetype first, qsizetype end, const QStringList& lines) const {
-    const auto stands_at = [&](qsizetype place, const QStringList& shown) {
-        return lines.mid(place, shown.size()) == shown;
-    };
     QStringList head;
     qsizetype from = 0;
-    for (; first < end && stands_at(from, lines_[first]); first++) {
+    for (; first < end && stands_at(from, lines_[first], lines); first++) {
         head.append(strings_[first]);
         from += lines_[first].size();
     }
@@ -77,12 +81,36 @@ QStringList StringLines::strings_between(qsizetype first, qsizetype end, const Q
     qsizetype to = lines.size();
     for (; first < end; end--) {
         const qsizetype place = to - lines_[end - 1].size();
-        if (place < from || !stands_at(place, lines_[end - 1]))
+        if (place < from || !stands_at(place, lines_[end - 1], lines))
             break;
         tail.prepend(strings_[end - 1]);
         to = place;
     }
-    return head + lines.mid(from, to - from) + tail;
+    return head + strings_among(first, end, lines.mid(from, to - from)) + tail;
+}
+
+// A string for each line, but for lines that stand together as one of the strings from first up to end was shown.
+QStringList StringLines::strings_among(qsizetype first, qsizetype end, const QStringList& lines) const {
+    QHash<QString, QList<qsizetype>> by_first_line;  // those of more than one line: any other is its line
+    for (qsizetype i = first; i < end; i++) {
+        if (lines_[i].size() > 1)
+            by_first_line[lines_[i].first()].append(i);
+    }
+    QStringList strings;
+    for (qsizetype place = 0; place < lines.size();) {
+        const QList<qsizetype> alike = by_first_line.value(lines[place]);
+        const auto found = std::find_if(alike.cbegin(), alike.cend(), [&](qsizetype string) {
+            return string >= first && stands_at(place, lines_[string], lines);
+        });
+        if (found == alike.cend()) {
+            strings.append(lines[place++]);
+            continue;
+        }
+        strings.append(strings_[*found]);
+        place += lines_[*found].size();
+        first = *found + 1;
+    }
+    return strings;
 }
 
 QStringList StringLines::all_lines() const {

@@ -10,8 +10,8 @@
 class QTextDocument;
 class QTextEdit;
 
-// A text of a value ends at its first zero, and what is behind one would never be seen again; a clipboard can hold
-// some.
+// The text without its zeros, which a clipboard can hold: a value's text ends at its first one, and what is behind it
+// would never be seen again.
 QString without_zeros(QString text);
 
 class StringLines {
@@ -27,6 +27,7 @@ public:
 
 private:
     QStringList strings_between(qsizetype first, qsizetype end, const QStringList& lines) const;
+    QStringList strings_among(qsizetype first, qsizetype end, const QStringList& lines) const;
     QStringList all_lines() const;
 
     QStringList strings_;

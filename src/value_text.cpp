@@ -2,6 +2,8 @@
 // SPDX-License-Identifier: MIT
 #include "value_text.h"
 
+#include "reg_value.h"
+
 #include <QCoreApplication>
 #include <QStringList>
 #include <QVariant>
@@ -11,6 +13,7 @@
 
 namespace {
 
+// `bytes` is not empty. A byte takes three characters, the blank behind it included.
 QString hexadecimal(const QByteArray& bytes, qsizetype limit) {
     static const char digits[] = "0123456789abcdef";
     const qsizetype count = limit / 3 < bytes.size() ? limit / 3 + 1 : bytes.size();
@@ -31,6 +34,11 @@ QString joined(const QStringList& strings, qsizetype limit) {
         text += QStringView(strings[i]).left(std::min(limit, strings[i].size()));
     }
     return text;
+}
+
+// Embeddings, overrides and isolates, which make what follows read in another order than it is stored in.
+bool turns_direction(QChar c) {
+    return (c >= QChar(0x202a) && c <= QChar(0x202e)) || (c >= QChar(0x2066) && c <= QChar(0x2069));
 }
 
 }  // namespace
@@ -59,8 +67,9 @@ QString value_text(const QVariant& value, qsizetype limit) {
     default:
         break;
     }
-    if (value.typeId() >= QMetaType::User)
+    if (is_not_set(value))
         return QCoreApplication::translate("ValueDelegate", "(value not set)");
+    // No type that a datum has comes here: a line for developers, on standard output as it is meant to be.
     std::printf("fallback: rendering '%s' as string\n", value.typeName());
     return value.toString();
 }
@@ -72,10 +81,14 @@ QString with_visible_controls(QString text) {
             c = QChar(0x21b5);
         else if (c == QChar::CarriageReturn)
             c = QChar(0x2190);
-        else if (c != QChar::Tabulation && c.category() == QChar::Other_Control)
+        else if ((c != QChar::Tabulation && c.category() == QChar::Other_Control) || turns_direction(c))
             c = QChar::ReplacementCharacter;
     }
     return text;
+}
+
+QString shortened(const QString& text, qsizetype most) {
+    return text.size() > most ? text.left(most) + QChar(0x2026) : text;
 }
 
 QString unreadable_text() { return QCoreApplication::translate("KeyDelegate", "(cannot be read)"); }

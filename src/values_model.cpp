@@ -33,7 +33,8 @@ qsizetype memory_of(const QVariant& data) {
     return bytes;
 }
 
-// Whether an editor hands back what it was given. A text without lines becomes a list of one empty string in it.
+// Whether an editor hands back what it was given. A list without strings comes back
+// as empty ones, which would be stored as none.
 bool is_same_data(const QVariant& old, const QVariant& given) {
     if (old.typeId() == QMetaType::QStringList && old.toStringList().isEmpty())
         return given.toStringList().join(QString()).isEmpty();
@@ -51,9 +52,9 @@ int ValuesModel::rowCount(const QModelIndex& parent) const {
     return key_ == nullptr || parent.isValid() ? 0 : key_->value_count();
 }
 
-int ValuesModel::columnCount(const QModelIndex&) const { return ColumnCount; }
+int ValuesModel::columnCount(const QModelIndex& /*parent*/) const { return ColumnCount; }
 
-QVariant ValuesModel::headerData(int section, Qt::Orientation, int role) const {
+QVariant ValuesModel::headerData(int section, Qt::Orientation /*orientation*/, int role) const {
     if (role != Qt::DisplayRole)
         return QVariant();
     switch (section) {
@@ -82,7 +83,7 @@ RegValue ValuesModel::lookup(int row) const {
         return *cached;
     std::unique_ptr<RegValue> value = key_->read_value(row);
     if (value == nullptr)
-        value = std::make_unique<RegValue>(key_->read_value_name(row));
+        value = std::make_unique<RegValue>(key_->read_value_without_data(row));
     RegValue found = *value;
     // The row asked for last is kept, however large it is.
     cache_.insert(row, value.release(), std::clamp(memory_of(found.data), least_cost, most_cached_bytes));
@@ -109,14 +110,14 @@ QVariant ValuesModel::data(const QModelIndex& index, int role) const {
     }
     if (role == Qt::DecorationRole && index.column() == NameColumn) {
         const quint32 type = lookup(index.row()).type;
-        const bool text = type == REG_SZ || type == REG_EXPAND_SZ || type == REG_MULTI_SZ;
-        return QIcon(QStringLiteral(TALLOWFEN_SHARE_DIR) +
-                     (text ? QStringLiteral("type_string.ico") : QStringLiteral("type_binary.ico")));
+        const bool is_text = type == REG_SZ || type == REG_EXPAND_SZ || type == REG_MULTI_SZ;
+        return QIcon(is_text ? QStringLiteral(TALLOWFEN_SHARE_DIR "type_string.ico")
+                             : QStringLiteral(TALLOWFEN_SHARE_DIR "type_binary.ico"));
     }
     return QVariant();
 }
 
-bool ValuesModel::setData(const QModelIndex& index, const QVariant& value, int) {
+bool ValuesModel::setData(const QModelIndex& index, const QVariant& value, int /*role*/) {
     if (!index.isValid() || key_ == nullptr || index.row() >= rowCount())
         return false;
     if (index.column() == NameColumn) {
@@ -144,7 +145,7 @@ bool ValuesModel::setData(const QModelIndex& index, const QVariant& value, int) 
     return stored;
 }
 
-// Empties the cache.
+// The cached rows, as they are shown; empties the cache.
 std::vector<std::pair<int, RegValue>> ValuesModel::take_shown() {
     std::vector<std::pair<int, RegValue>> shown;
     const QList<int> rows = cache_.keys();
@@ -155,7 +156,8 @@ std::vector<std::pair<int, RegValue>> ValuesModel::take_shown() {
 }
 
 // Tells of rows that do not read any more as they were shown: those of a value that was stored by half, and in a
-// damaged hive those of values that share their data with the one that was stored.
+// damaged hive those of values that share their data with the one that was stored. `told` is the row that has been told
+// of already, -1 for none.
 void ValuesModel::announce_others(const std::vector<std::pair<int, RegValue>>& shown, int told) {
     for (const auto& [row, before] : shown) {
         if (row == told)

@@ -23,7 +23,7 @@ class ValuesModel : public QAbstractTableModel {
 public:
     enum Column { NameColumn, TypeColumn, DataColumn, ColumnCount };
 
-    // key may be null, which gives an empty table; it must outlive the model.
+    // `key` may be null, which gives an empty table; it must outlive the model.
     explicit ValuesModel(RegKey* key, QObject* parent = nullptr);
 
     RegKey* key() const { return key_; }
@@ -37,7 +37,8 @@ public:
     // The data column gives the value's QVariant as it is; the delegate makes the text. A value whose data cannot be
     // read has an invalid variant there, and cannot be edited.
     QVariant data(const QModelIndex& index, int role) const override;
-    // Column 0 renames, column 2 stores new data under the type that the value has. The role is not looked at.
+    // The name column renames, the data column stores new data under the type that the value has. The role is not
+    // looked at.
     bool setData(const QModelIndex& index, const QVariant& value, int role) override;
     // One row at a time.
     bool removeRows(int row, int count, const QModelIndex& parent = QModelIndex()) override;
@@ -45,17 +46,17 @@ public:
     // Whether removeRows could delete the row's value.
     bool can_remove(int row) const;
     // Makes a value with a generated name and empty data, at the end. The signals of an inserted row come also for a
-    // type that makes nothing; callers pass only the six types that can be made.
+    // type that makes nothing; callers pass only the six types of the "New" menu, which all can be made.
     bool add_value(int type);
     // Makes the unnamed value, as text; false where there may be one.
     bool add_default_value(const QString& data);
 
-    // Lets every row be read again. Until then also those whose data could not be read are kept: where many values
-    // lead to the same long data, each painting of them would read all of it for each.
+    // Empties the cache, so that every row is read anew. Until then rows whose data could not be read are kept too: in
+    // a damaged hive many values can lead to one long datum, and each paint would read all of it for each of them.
     void forget_rows() { cache_.clear(); }
 
-    // Bytes of memory that the data of the rows kept counts for: that of a short row as a hundredth of what may be
-    // kept, that of one longer than all that as just that.
+    // Bytes that the cached rows count for: each its data's memory, but at least a hundredth of what the cache may hold
+    // and at most all of it.
     qsizetype cached_bytes() const { return cache_.totalCost(); }
 
 private:

@@ -58,13 +58,13 @@ QModelIndex ValuesProxyModel::index(int row, int column, const QModelIndex& pare
     return createIndex(row, column, static_cast<quintptr>(row));
 }
 
-QModelIndex ValuesProxyModel::parent(const QModelIndex&) const { return QModelIndex(); }
+QModelIndex ValuesProxyModel::parent(const QModelIndex& /*index*/) const { return QModelIndex(); }
 
 int ValuesProxyModel::rowCount(const QModelIndex& parent) const {
     return sourceModel() == nullptr || parent.isValid() ? 0 : sourceModel()->rowCount() + offset();
 }
 
-int ValuesProxyModel::columnCount(const QModelIndex&) const {
+int ValuesProxyModel::columnCount(const QModelIndex& /*parent*/) const {
     return sourceModel() != nullptr ? sourceModel()->columnCount() : 0;
 }
 
@@ -138,7 +138,7 @@ Qt::ItemFlags ValuesProxyModel::flags(const QModelIndex& index) const {
         return Qt::NoItemFlags;
     if (index.row() > 0)
         return sourceModel()->flags(mapToSource(index));
-    // The unnamed value, made up or real, can never be renamed.
+    // The unnamed value, synthetic or real, can never be renamed.
     if (index.column() == ValuesModel::NameColumn)
         return Qt::ItemIsSelectable | Qt::ItemIsEnabled;
     return Qt::ItemIsEnabled;
@@ -150,6 +150,8 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
     if (is_synthetic(index.row()))
         return make_default(index, value);
     const bool is_rename = index.column() == ValuesModel::NameColumn;
+    if (is_rename && source_row(index.row()) == unnamed_)
+        return false;
     const int rows = rowCount();
     const QVariant name = is_rename ? data(index, Qt::DisplayRole) : QVariant();
     const QHash<int, QString> held = is_rename ? names_of_held_rows() : QHash<int, QString>();
@@ -168,8 +170,8 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
     return true;
 }
 
-// The made-up row's place is taken by the unnamed value, which the source has at its end: for this model's rows nothing
-// was inserted.
+// The synthetic row's place is taken by the unnamed value, which the source has at its end: for this model's rows
+// nothing was inserted.
 bool ValuesProxyModel::make_default(const QModelIndex& index, const QVariant& value) {
     auto* values = qobject_cast<ValuesModel*>(sourceModel());
     if (index.column() != ValuesModel::DataColumn || values == nullptr)
@@ -189,8 +191,8 @@ bool ValuesProxyModel::make_default(const QModelIndex& index, const QVariant& va
     return added;
 }
 
-// A key that could not be read whole when it was asked for its unnamed value may have one all the same: the made-up row
-// goes then.
+// A key that could not be read whole when it was asked for its unnamed value may have one all the same: the synthetic
+// row goes then.
 bool ValuesProxyModel::give_way_to_default() {
     const int position = synthetic_default_ ? key()->default_value_position() : -1;
     if (position < 0)
@@ -317,7 +319,7 @@ void ValuesProxyModel::end_removal(int row, int source, int rows_before) {
         }
     }
     if (rows_now(rows_before) == rows_before) {
-        // The row is there again: it was refused, or the made-up row has taken the unnamed value's place.
+        // The row is there again: it was refused, or the synthetic row has taken the unnamed value's place.
         beginInsertRows(QModelIndex(), row, row);
         endInsertRows();
     }
@@ -325,17 +327,20 @@ void ValuesProxyModel::end_removal(int row, int source, int rows_before) {
         std::rethrow_exception(failure);
 }
 
+// For views that asked while an addition was tried and failed: nothing moved, but all is to be asked again.
 void ValuesProxyModel::announce_layout() {
     emit layoutAboutToBeChanged();
     emit layoutChanged();
 }
 
-void ValuesProxyModel::sort(int, Qt::SortOrder) {
+void ValuesProxyModel::sort(int /*column*/, Qt::SortOrder /*order*/) {
     const bool has_default_twice = arrange([] {});
     if (has_default_twice && give_way_to_default())
         arrange([] {});
 }
 
+// Orders the rows, then lets move_indexes move the persistent indexes, between the signals of a new layout. Returns
+// what order_rows does.
 bool ValuesProxyModel::arrange(const std::function<void()>& move_indexes) {
     emit layoutAboutToBeChanged();
     bool has_default_twice = false;
@@ -350,7 +355,8 @@ bool ValuesProxyModel::arrange(const std::function<void()>& move_indexes) {
     return has_default_twice;
 }
 
-// Whether a value reads like the made-up row: the unnamed one may not have been readable when it was asked for.
+// Reads every name anew and sorts the mapping by them. True: a value reads like the synthetic row; the unnamed one may
+// not have been readable when it was asked for.
 bool ValuesProxyModel::order_rows() {
     if (auto* values = qobject_cast<ValuesModel*>(sourceModel()))
         values->forget_rows();
@@ -416,7 +422,7 @@ bool ValuesProxyModel::add_value(int type) {
 
 // With the source's row numbers as they are, without the offset: a view asks how many rows there are now, and for all
 // of them again; where they were announced does not matter to it.
-void ValuesProxyModel::on_rows_inserted(const QModelIndex&, int first, int last) {
+void ValuesProxyModel::on_rows_inserted(const QModelIndex& /*parent*/, int first, int last) {
     if (is_source_quiet_)
         return;
     beginInsertRows(QModelIndex(), first, last);

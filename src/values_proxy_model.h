@@ -12,9 +12,9 @@
 
 class RegKey;
 
-// When the key has no unnamed value, row 0 is made up for it; every other row maps to a source row. Positions behind
-// the sorted ones (values added since) map to themselves, which keeps a new value at the bottom until the next sort.
-// Throws what its source and the key throw, setSourceModel() and rowCount() too.
+// When the key has no unnamed value, row 0 is a synthetic one for it; every other row maps to a source row. Positions
+// behind the sorted ones (values added since) map to themselves, which keeps a new value at the bottom until the next
+// sort. Throws what its source and the key throw, setSourceModel() and rowCount() too.
 class ValuesProxyModel : public QAbstractProxyModel {
     Q_OBJECT
 
@@ -34,7 +34,7 @@ public:
     QModelIndex mapFromSource(const QModelIndex& source_index) const override;
     QVariant data(const QModelIndex& index, int role) const override;
     Qt::ItemFlags flags(const QModelIndex& index) const override;
-    // The data of the made-up row creates the unnamed value.
+    // The data of the synthetic row creates the unnamed value.
     bool setData(const QModelIndex& index, const QVariant& value, int role) override;
     bool removeRows(int row, int count, const QModelIndex& parent = QModelIndex()) override;
     // Reads every row anew and orders them by name, ascending, whatever is asked for.
@@ -66,12 +66,13 @@ private:
     QHash<int, QString> names_of_held_rows() const;
     void move_held_rows(const QHash<int, QString>& names_before, int renamed, const QString& new_name);
     void note_moved_to_end(int row);
-    bool remove_from_source(int row, int source_row);
-    void end_removal(int row, int source_row, int rows_before);
+    bool remove_from_source(int row, int source);
+    void end_removal(int row, int source, int rows_before);
 
     std::vector<int> mapping_;  // source row by position; empty until the first sort
     bool synthetic_default_ = false;
     int unnamed_ = -1;  // source row of the unnamed value
-    QString default_name_;
+    QString
+        default_name_;  // reads as ValuesModel::default_name() in every language; a test of the translations sees to it
     bool is_source_quiet_ = false;  // what the source says of its rows is not passed on
 };

@@ -51,7 +51,7 @@ int type_created_by(const QAction* action) {
     return -1;
 }
 
-// What a cell shows, of which only the first `limit` characters need be right; data that cannot be read shows nothing.
+// What a cell shows, right in its first `limit` characters at least; data that cannot be read shows nothing.
 QString shown_text(const QModelIndex& cell, qsizetype limit = std::numeric_limits<qsizetype>::max()) {
     const QVariant datum = cell.data(Qt::DisplayRole);
     return datum.isValid() ? value_text(datum, limit) : QString();
@@ -104,7 +104,7 @@ void ValuesView::edit_value(const QModelIndex& index) {
     // Should the table show another key's values by the time the editor is left, this leads nowhere.
     const QPersistentModelIndex data_index = model()->index(index.row(), data_column);
     const QVariant datum = data_index.data(Qt::DisplayRole);
-    if (datum.typeId() >= QMetaType::User) {
+    if (is_not_set(datum)) {
         if (!edit_string(*model(), name, QString(), data_index))
             tell_failure(this, tr("The value could not be created."));
         return;
@@ -161,7 +161,7 @@ void ValuesView::keyPressEvent(QKeyEvent* event) {
                       [this] { QApplication::clipboard()->setText(shown_text(currentIndex())); });
     } else if (event->key() == Qt::Key_F2) {
         meet_failures(this, FailureReport::instance().shown_key(), [&] {
-            ask_for_name(currentIndex());
+            read_name_ahead(currentIndex());
             show_current();
             QTableView::keyPressEvent(event);
         });
@@ -194,9 +194,12 @@ void ValuesView::show_current() {
 }
 
 bool ValuesView::event(QEvent* event) {
-    if (!is_menu_key(*event) || !currentIndex().isValid())
+    if (!is_menu_key(*event))
         return QTableView::event(event);
-    if (end_editing_before_change(*this)) {
+    if (!currentIndex().isValid()) {
+        // The place that comes with it can be over a row, which nobody has pointed at.
+        show_new_menu(viewport()->rect().center());
+    } else if (end_editing_before_change(*this)) {
         meet_failures(this, FailureReport::instance().shown_key(), [this] {
             show_current();
             ask_for_menu_over_current(*this);
@@ -207,6 +210,11 @@ bool ValuesView::event(QEvent* event) {
 
 QItemSelectionModel::SelectionFlags ValuesView::selectionCommand(const QModelIndex& index, const QEvent* event) const {
     return keeping_highlight(QTableView::selectionCommand(index, event), index, event);
+}
+
+void ValuesView::selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) {
+    QTableView::selectionChanged(selected, deselected);
+    follow_highlight(*this);
 }
 
 void ValuesView::show_values_context_menu(QPoint point) {
@@ -225,6 +233,11 @@ void ValuesView::show_values_context_menu(QPoint point) {
             value_double_clicked(model()->index(row, name_column));
         return;
     }
+    show_new_menu(point);
+}
+
+void ValuesView::show_new_menu(QPoint point) {
+    QMenu menu;
     add_new_actions(*menu.addMenu(tr("New", "menu title")));
     menu.exec(viewport()->mapToGlobal(point));
 }
@@ -246,8 +259,8 @@ void ValuesView::make_value(ValuesProxyModel& values, int type) {
     edit(created);
 }
 
-// By way of no current index, so that the actions follow also where the rows have moved the current index there
-// unheard.
+// By way of no current index: where the rows have moved it there without a signal, setting it would not be heard, and
+// the actions would not follow.
 void ValuesView::make_current(const QModelIndex& index) {
     setCurrentIndex(QModelIndex());
     setCurrentIndex(index);
@@ -315,7 +328,7 @@ void ValuesView::run_rename_value_action(bool /*checked*/) {
     if (!current.isValid())
         return;
     meet_failures(this, FailureReport::instance().shown_key(), [&] {
-        ask_for_name(current);
+        read_name_ahead(current);
         show_current();
         edit(current);
     });
@@ -355,9 +368,7 @@ bool ValuesView::eventFilter(QObject* watched, QEvent* event) {
 // The text of a cell that cuts it; of a very long one, the beginning.
 QString ValuesView::cut_text(const QModelIndex& index) const {
     constexpr qsizetype longest = 1000;
-    QString shown = shown_text(index, longest + 1);
-    if (shown.size() > longest)
-        shown = shown.left(longest) + QChar(0x2026);
+    const QString shown = shortened(shown_text(index, longest + 1), longest);
     const bool is_cut =
         shown.size() > ValueDelegate::shortest_cut || sizeHintForIndex(index).width() > columnWidth(index.column());
     return is_cut ? shown : QString();

@@ -37,10 +37,11 @@ public slots:
 protected:
     bool event(QEvent* event) override;
     QItemSelectionModel::SelectionFlags selectionCommand(const QModelIndex& index, const QEvent* event) const override;
+    void selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) override;
     void keyPressEvent(QKeyEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
     bool viewportEvent(QEvent* event) override;
-    // Of the header, which asks the key as well.
+    // Holds back a paint of the header, which asks the key as well, where the key does not say how many values it has.
     bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
@@ -48,6 +49,7 @@ private:
     void make_current(const QModelIndex& index);
     int row_of(const QString& name, int row) const;
     bool check_key();
+    void show_new_menu(QPoint point);
     void make_value(ValuesProxyModel& values, int type);
     void delete_value();
     QString cut_text(const QModelIndex& index) const;

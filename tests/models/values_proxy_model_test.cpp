@@ -228,6 +228,9 @@ private slots:
             QCOMPARE(shown.proxy.flags(shown.proxy.index(0, 0)), Qt::ItemIsSelectable | Qt::ItemIsEnabled);
             QCOMPARE(shown.proxy.flags(shown.proxy.index(0, 2)), Qt::ItemFlags(Qt::ItemIsEnabled));
             QVERIFY(shown.proxy.flags(shown.proxy.index(2, 0)).testFlag(Qt::ItemIsEditable));
+            const QStringList names = shown.names();
+            QVERIFY(!shown.proxy.setData(shown.proxy.index(0, 0), QStringLiteral("x"), Qt::EditRole));
+            QCOMPARE(shown.names(), names);
         }
     }
 

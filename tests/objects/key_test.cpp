@@ -250,7 +250,7 @@ private slots:
         RegHive hive(QStringLiteral("HIVE"), file.path(), &top);
         auto* deleted = static_cast<RegKey*>(hive.root_key()->child(0));
         auto* renamed = static_cast<RegKey*>(hive.root_key()->child(1));
-        QVERIFY(!renamed->set_dword_value(renamed->read_value_name(0).name, 99, little_endian_order, 0));
+        QVERIFY(!renamed->set_dword_value(renamed->read_value_without_data(0).name, 99, little_endian_order, 0));
         QVERIFY(renamed->rename_value(0, QStringLiteral("plain")));
         QCOMPARE(file.stored("Renamed", "plain").size(), 4);
         QCOMPARE(renamed->value_count(), 1);

@@ -66,7 +66,7 @@ struct Opened {
 
     static int row(RegKey* key, const QString& name) {
         for (int i = 0; i < key->value_count(); i++) {
-            if (key->read_value_name(i).name == name)
+            if (key->read_value_without_data(i).name == name)
                 return i;
         }
         return -1;

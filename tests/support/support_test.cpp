@@ -157,7 +157,7 @@ TEST(Support, cells_that_nothing_leads_to_are_counted_by_kind) {
     EXPECT_EQ(leaks.others.size(), 2U);  // the list and the text
 }
 
-TEST(Support, the_reader_survives_every_single_changed_byte_of_a_small_hive) {
+TEST(Support, the_reader_survives_single_changed_bytes_of_a_small_hive) {
     HiveLayout layout;
     layout.root.add("Alpha").set("Text", 1, text_data("hello"));
     layout.root.add("Beta").add("Gamma");

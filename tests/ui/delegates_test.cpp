@@ -6,6 +6,7 @@
 #include "failure_report.h"
 #include "reg_value.h"
 #include "ui_test.h"
+#include "value_text.h"
 
 #include <QElapsedTimer>
 #include <QLineEdit>
@@ -118,6 +119,7 @@ private slots:
     void what_a_cell_shows_is_the_beginning_of_the_text_data();
     void what_a_cell_shows_is_the_beginning_of_the_text();
     void control_characters_are_seen();
+    void no_text_is_read_in_another_order_than_it_has();
     void a_text_that_is_cut_ends_in_an_ellipsis_data();
     void a_text_that_is_cut_ends_in_an_ellipsis();
     void each_cell_has_its_own_icon();
@@ -402,6 +404,14 @@ void DelegatesTest::control_characters_are_seen() {
     QCOMPARE(option.text, seen);
     // What is copied and spoken is the text itself.
     QCOMPARE(ValueDelegate(nullptr).displayText(text, QLocale()), text);
+}
+
+// "invoice" and an override would read "invoiceexe.pdf".
+void DelegatesTest::no_text_is_read_in_another_order_than_it_has() {
+    const QString stored =
+        QStringLiteral("invoice\u202efdp.exe\u202a\u202b\u202c\u202d|\u2066\u2067\u2068\u2069|\u2065");
+    const QString seen = QStringLiteral("invoice\ufffdfdp.exe\ufffd\ufffd\ufffd\ufffd|\ufffd\ufffd\ufffd\ufffd|\u2065");
+    QCOMPARE(with_visible_controls(stored), seen);
 }
 
 void DelegatesTest::a_text_that_is_cut_ends_in_an_ellipsis_data() {

@@ -537,6 +537,22 @@ void EditorsTest::what_stands_beside_an_edited_line_stays_data() {
         type_at(0, "c")(edit);
         type_at(4, "d")(edit);
     }) << QStringList{QStringLiteral("ca"), QString(), alike[1], QStringLiteral("da"), QString()};
+    const QStringList middle{QStringLiteral("x"), QStringLiteral("p\rq"), QStringLiteral("c")};
+    const QString middle_shown = QStringLiteral("x\np\nq\nc");
+    QTest::newRow("both neighbours taken out") << middle << middle_shown << Edit([=](QTextEdit& edit) {
+        delete_lines(0, 1)(edit);
+        edit.moveCursor(QTextCursor::End);
+        QTest::keyClick(&edit, Qt::Key_Backspace);
+        QTest::keyClick(&edit, Qt::Key_Backspace);
+    }) << QStringList{middle[1]};
+    QTest::newRow("both neighbours edited and a line made ahead")
+        << middle << middle_shown << Edit([=](QTextEdit& edit) {
+               type_at(0, "y")(edit);
+               type_at(1, "\n")(edit);
+               type_at(1, "new")(edit);
+               type_at(4, "z")(edit);
+           })
+        << QStringList{QStringLiteral("yx"), QStringLiteral("new"), middle[1], QStringLiteral("zc")};
     QTest::newRow("the lines of a string ahead taken out")
         << QStringList{QStringLiteral("a\rb"), QStringLiteral("a"), QStringLiteral("b")} << "a\nb\na\nb"
         << delete_lines(0, 2) << lines({"a", "b"});

@@ -210,7 +210,7 @@ void EntryTest::a_write_that_nothing_takes_fails_and_does_not_end_the_program() 
     const QByteArray path = QFile::encodeName(directory.filePath(QStringLiteral("file")));
     const pid_t child = fork();
     if (child == 0) {
-        prepare_streams();
+        prepare_process();
         const rlimit limit = {16, 16};
         const int file = open(path.constData(), O_CREAT | O_WRONLY, 0600);
         const bool limited = setrlimit(RLIMIT_FSIZE, &limit) == 0 && pwrite(file, "x", 1, 15) == 1;

@@ -219,6 +219,20 @@ private slots:
         }
     }
 
+    // As an assistive program does it.
+    void a_row_that_is_selected_becomes_current() {
+        const Scene scene;
+        Stage stage(scene);
+        stage.select_value(alpha + QStringLiteral("\\Deep"), QStringLiteral("b"));
+        const QModelIndex value = stage.value(QStringLiteral("A"));
+        stage.values->selectionModel()->select(value, QItemSelectionModel::ClearAndSelect);
+        QTRY_COMPARE(stage.values->currentIndex(), value);
+        const QModelIndex key = stage.key(alpha + QStringLiteral("\\Zeta"));
+        stage.keys->selectionModel()->select(key, QItemSelectionModel::ClearAndSelect);
+        QTRY_COMPARE(stage.keys->currentIndex(), key);
+        QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));
+    }
+
     // Letters that take no room leave an empty cell, which must say that there is more.
     void a_text_that_a_cell_cuts_is_whole_in_its_tip_whatever_room_its_letters_take() {
         testkit::HiveLayout layout;

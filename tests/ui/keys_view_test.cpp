@@ -41,6 +41,7 @@ private slots:
     void deletion_asks_data();
     void deletion_asks();
     void what_is_deleted_was_asked_about();
+    void a_key_below_that_became_current_goes_with_its_branch();
     void closing_the_question_deletes_nothing();
     void a_branch_is_deleted_with_all_below();
     void a_refused_deletion_is_told_and_changes_nothing();
@@ -205,6 +206,24 @@ void KeysViewTest::what_is_deleted_was_asked_about() {
     QVERIFY(hand.is_done());
     QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Deep Zeta"));
     QCOMPARE(stage.status(), alpha + QStringLiteral("\\Zeta"));
+}
+
+void KeysViewTest::a_key_below_that_became_current_goes_with_its_branch() {
+    const Scene scene;
+    Stage stage(scene);
+    stage.select_key(alpha + QStringLiteral("\\Deep"));
+    stage.keys->setFocus();
+    DialogHand hand;
+    hand.then([&](QWidget* question) {
+        stage.select_key(alpha + QStringLiteral("\\Deep\\Deeper"));
+        QTest::mouseClick(qobject_cast<QMessageBox*>(question)->button(QMessageBox::Yes), Qt::LeftButton);
+    });
+    shared_actions().delete_action->trigger();
+    QVERIFY(hand.is_done());
+    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Leaf Zeta"));
+    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Leaf"));
+    // The values are those of the key that is current now, and not of one that has gone.
+    QCOMPARE(stage.value_names(), QStringList{QStringLiteral("(Default)")});
 }
 
 void KeysViewTest::closing_the_question_deletes_nothing() {

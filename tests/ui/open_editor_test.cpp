@@ -587,12 +587,12 @@ void OpenEditorTest::a_hit_is_selected_where_its_key_stands_now() {
     const Scene scene;
     Stage stage(scene);
     const QModelIndex old = stage.key(alpha + QStringLiteral("\\Zeta"));
-    QCOMPARE(KeysView::in_place(old), old);
+    QCOMPARE(KeysView::index_now(old), old);
     QVERIFY(stage.model->setData(stage.key(leaf), QStringLiteral("zzz"), Qt::EditRole));
     const QModelIndex now = stage.key(alpha + QStringLiteral("\\Zeta"));
     QVERIFY(now != old);
-    QCOMPARE(KeysView::in_place(old), now);
-    QCOMPARE(KeysView::in_place(QModelIndex()), QModelIndex());
+    QCOMPARE(KeysView::index_now(old), now);
+    QCOMPARE(KeysView::index_now(QModelIndex()), QModelIndex());
 }
 
 UI_TEST_MAIN(OpenEditorTest)

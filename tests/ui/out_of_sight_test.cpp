@@ -239,6 +239,19 @@ private slots:
         QCOMPARE(all, QStringList{QStringLiteral("New")});
     }
 
+    // A row may stand where the window system says that the menu is asked for.
+    void the_menu_key_is_about_no_value_where_none_is_current() {
+        const Scene scene(many_rows());
+        Stage stage(scene);
+        const CurrentRow row(stage, true);
+        stage.values->setColumnWidth(0, stage.values->width());
+        QVERIFY(stage.values->indexAt(stage.values->viewport()->rect().center()).isValid());
+        stage.values->setCurrentIndex(QModelIndex());
+        QStringList all;
+        QVERIFY(with_menu([&] { press_menu_key(stage); }, [&](QMenu& menu) { all = texts_of(menu); }));
+        QCOMPARE(all, QStringList{QStringLiteral("New")});
+    }
+
     // The tree's own scrolling goes to its edge, and such a name begins beyond the other.
     void the_name_of_a_deep_key_is_typed_in_sight_data() {
         QTest::addColumn<Qt::LayoutDirection>("direction");

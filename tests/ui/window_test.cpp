@@ -61,6 +61,8 @@ private slots:
     void the_splitter_fills_the_window_data();
     void the_splitter_fills_the_window();
     void a_long_path_does_not_widen_the_window();
+    void both_ends_of_a_long_path_are_seen();
+    void neither_view_can_be_dragged_shut();
     void columns_start_wide_enough();
     void a_damaged_key_is_told_once_and_its_siblings_stay();
     void an_exception_in_a_slot_is_told_and_the_program_goes_on();
@@ -284,7 +286,7 @@ void WindowTest::a_name_like_markup_stands_in_the_status_as_it_is() {
     stage.select_key(QStringLiteral("MACHINE\\SYSTEM\\Alpha\\Leaf"));
     QVERIFY(stage.model->setData(stage.keys->currentIndex(), QStringLiteral("<b>L</b>&R"), Qt::EditRole));
     stage.window.update_statusbar();
-    const auto* label = stage.window.statusBar()->findChild<QLabel*>();
+    auto* label = stage.window.statusBar()->findChild<QLabel*>();
     QCOMPARE(label->text(), QStringLiteral("MACHINE\\SYSTEM\\Alpha\\<b>L</b>&R"));
     QCOMPARE(label->textFormat(), Qt::PlainText);
     QTextDocument tip;
@@ -364,6 +366,39 @@ void WindowTest::a_long_path_does_not_widen_the_window() {
     QCOMPARE(stage.window.width(), 640);
     stage.window.resize(500, 400);
     QTRY_COMPARE(stage.window.width(), 500);
+}
+
+void WindowTest::both_ends_of_a_long_path_are_seen() {
+    const Scene scene;
+    Stage stage(scene);
+    auto* label = stage.window.statusBar()->findChild<QLabel*>();
+    const auto painted = [&](const char* first, const char* last) {
+        const QString path = QLatin1String(first) + QString(300, QLatin1Char('w')) + QLatin1String(last);
+        label->setText(path);
+        QCoreApplication::sendPostedEvents();
+        QCoreApplication::processEvents();
+        return label->grab().toImage();
+    };
+    const QImage path = painted("A", "A");
+    QCOMPARE(painted("A", "A"), path);
+    QVERIFY(painted("A", "M") != path);
+    QVERIFY(painted("M", "A") != path);
+}
+
+void WindowTest::neither_view_can_be_dragged_shut() {
+    const Scene scene;
+    Stage stage(scene);
+    QWidget* handle = stage.window.findChild<QSplitter*>()->handle(1);
+    const QPoint grip = handle->rect().center();
+    for (const int to : {-1000, 1000}) {
+        QTest::mousePress(handle, Qt::LeftButton, {}, grip);
+        QTest::mouseMove(handle, grip + QPoint(to, 0));
+        QTest::mouseRelease(handle, Qt::LeftButton, {}, grip + QPoint(to, 0));
+        // It has moved as far as it goes.
+        QVERIFY(to < 0 ? stage.keys->width() < 200 : stage.values->width() < 200);
+        QVERIFY(stage.keys->width() > 20);
+        QVERIFY(stage.values->width() > 20);
+    }
 }
 
 void WindowTest::columns_start_wide_enough() {
@@ -525,7 +560,7 @@ void WindowTest::a_name_of_many_lines_takes_one() {
     const int height = stage.window.statusBar()->height();
     stage.keys->setCurrentIndex(stage.model->index(0, 0, key));
     QCOMPARE(stage.status(), QStringLiteral("MACHINE\\SYSTEM\\Key\\b") + QString(200, QChar(0x21b5)));
-    const auto* label = stage.window.statusBar()->findChild<QLabel*>();
+    auto* label = stage.window.statusBar()->findChild<QLabel*>();
     QVERIFY(label->toolTip().contains(QLatin1String("<br")));
     QVERIFY(label->accessibleName().endsWith(QString(200, QLatin1Char('\n'))));
     // A font that has the signs may be taller.
