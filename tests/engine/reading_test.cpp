@@ -265,6 +265,24 @@ TEST_F(Reading, an_A_call_does_not_read_big_data) {
     EXPECT_EQ(RQueryValueExA(key.get(), "Big", nullptr, data.data(), &size), R_CAN_NOT_COMPLETE);
 }
 
+TEST(Values, text_that_an_A_call_cannot_read_gives_1003) {
+    LaidHive hive = lay_out(tree());
+    const ValuePlaces text = hive.at("Alpha").values[0];
+    hive.mark_free(text.data);
+    Scene scene(hive.bytes);
+    const Handle key = scene.OpenKey("Alpha");
+    for (const uint32_t room : {1U, 5U, 100U}) {
+        Bytes data(100, 0xEE);
+        uint32_t size = room;
+        EXPECT_EQ(RQueryValueExA(key.get(), "Text", nullptr, data.data(), &size), R_CAN_NOT_COMPLETE);
+        EXPECT_EQ(size, room);
+        EXPECT_EQ(data, Bytes(100, 0xEE));
+        // Its length stands in its record.
+        EXPECT_EQ(RQueryValueExA(key.get(), "Text", nullptr, nullptr, &size), 0);
+        EXPECT_EQ(size, 12U);
+    }
+}
+
 TEST_F(Reading, an_index_at_or_past_the_end_gives_259) {
     for (uint32_t index : {7U, 8U, none}) {
         EXPECT_EQ(REnumValueA(key.get(), index, nullptr, nullptr, nullptr, nullptr, nullptr), R_NO_MORE_ITEMS);
