@@ -11,16 +11,6 @@ QItemSelectionModel::SelectionFlags keeping_highlight(QItemSelectionModel::Selec
     return takes_highlight ? QItemSelectionModel::NoUpdate : command;
 }
 
-void follow_highlight(QAbstractItemView& view) {
-    const auto follow = [&view] {
-        const QModelIndexList rows =
-            view.selectionModel() ? view.selectionModel()->selectedIndexes() : QModelIndexList();
-        if (rows.size() == 1 && rows.first() != view.currentIndex())
-            view.setCurrentIndex(rows.first());
-    };
-    QMetaObject::invokeMethod(&view, follow, Qt::QueuedConnection);
-}
-
 bool is_menu_key(const QEvent& event) {
     return event.type() == QEvent::ContextMenu &&
            static_cast<const QContextMenuEvent&>(event).reason() == QContextMenuEvent::Keyboard;

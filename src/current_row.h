@@ -14,10 +14,6 @@ class QEvent;
 QItemSelectionModel::SelectionFlags keeping_highlight(QItemSelectionModel::SelectionFlags command,
                                                       const QModelIndex& index, const QEvent* event);
 
-// Makes the row that is highlighted current: an assistive program selects one and leaves another current. Called when
-// the selection has changed; acts later, since where both change the selection comes first.
-void follow_highlight(QAbstractItemView& view);
-
 // Whether the keyboard asks for a context menu. The place that comes with it is where the current row is laid out, or
 // nowhere when it is in a closed branch: not where it is seen.
 bool is_menu_key(const QEvent& event);

@@ -21,6 +21,17 @@
 #include <deque>
 #include <utility>
 
+namespace {
+
+bool stands_below(const QModelIndex& key, const QModelIndex& top) {
+    QModelIndex step = key.parent();
+    while (step.isValid() && step != top)
+        step = step.parent();
+    return step.isValid();
+}
+
+}  // namespace
+
 KeysView::KeysView(QWidget* parent) : QTreeView(parent) {
     setContextMenuPolicy(Qt::CustomContextMenu);
     setEditTriggers(QAbstractItemView::EditKeyPressed);
@@ -35,6 +46,9 @@ KeysView::KeysView(QWidget* parent) : QTreeView(parent) {
 
 void KeysView::setModel(QAbstractItemModel* model) {
     QTreeView::setModel(model);
+    // Queued: where the current row changes too, the selection comes first.
+    connect(selectionModel(), &QItemSelectionModel::selectionChanged, this, &KeysView::follow_highlight,
+            Qt::QueuedConnection);
     // A long name widens the column and brings a scroll bar instead of being cut.
     setTextElideMode(Qt::ElideNone);
     if (header()->count() > 0)
@@ -93,9 +107,11 @@ QItemSelectionModel::SelectionFlags KeysView::selectionCommand(const QModelIndex
     return keeping_highlight(QTreeView::selectionCommand(index, event), index, event);
 }
 
-void KeysView::selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) {
-    QTreeView::selectionChanged(selected, deselected);
-    follow_highlight(*this);
+// An assistive program selects a row and leaves another current, which the commands are about.
+void KeysView::follow_highlight() {
+    const QModelIndexList rows = selectionModel()->selectedIndexes();
+    if (rows.size() == 1 && rows.first() != currentIndex())
+        setCurrentIndex(rows.first());
 }
 
 void KeysView::show_keys_context_menu(QPoint point) {
@@ -147,8 +163,9 @@ void KeysView::delete_key() {
     const QModelIndex current = index_now(asked);
     if (!current.isValid())
         return;
-    // Not one below it: those go first, and would pass the place on to a key that is going as well.
-    setCurrentIndex(current);
+    // Keys below it go first, and one that is current would pass the place on to another that is going as well.
+    if (stands_below(currentIndex(), current))
+        setCurrentIndex(current);
     const QPersistentModelIndex parent = current.parent();
     const int row = current.row();
     const int rows = model()->rowCount(parent);

@@ -42,12 +42,12 @@ public slots:
 protected:
     bool event(QEvent* event) override;
     QItemSelectionModel::SelectionFlags selectionCommand(const QModelIndex& index, const QEvent* event) const override;
-    void selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) override;
     void keyPressEvent(QKeyEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
 
 private:
+    void follow_highlight();
     bool take_press_from_naming(const QMouseEvent& press);
     void make_key(RegModel& keys);
     void delete_key();

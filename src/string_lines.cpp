@@ -48,8 +48,8 @@ void StringLines::fill(QTextEdit& edit) const {
 QStringList StringLines::strings_in(const QTextDocument& document) const {
     const bool had_line_separators = all_lines().join(QString()).contains(QChar::LineSeparator);
     QStringList strings;
-    QStringList changed;  // lines since the last string that stands
-    int next = 0;         // behind that string
+    Lines changed;  // since the last string that stands
+    int next = 0;   // behind that string
     for (QTextBlock block = document.begin(); block.isValid();) {
         const int shown_for = block.userState();  // -1 for a line that the user has made
         QStringList run;
@@ -59,10 +59,11 @@ QStringList StringLines::strings_in(const QTextDocument& document) const {
         } while (block.isValid() && block.userState() == shown_for && shown_for >= 0);
         if (shown_for >= next && run == lines_[shown_for]) {
             strings += strings_between(next, shown_for, changed) + QStringList{strings_[shown_for]};
-            changed.clear();
+            changed = {};
             next = shown_for + 1;
         } else {
-            changed += run;
+            changed.texts += run;
+            changed.shown_for += QList<int>(run.size(), shown_for);
         }
     }
     return strings + strings_between(next, lines_.size(), changed);
@@ -70,40 +71,43 @@ QStringList StringLines::strings_in(const QTextDocument& document) const {
 
 // Of the strings from first up to end those whose lines stand at the head or the tail of some lines, and what is
 // between them. Return at the beginning of a line makes of the line, not of the new one, another block.
-QStringList StringLines::strings_between(qsizetype first, qsizetype end, const QStringList& lines) const {
+QStringList StringLines::strings_between(qsizetype first, qsizetype end, const Lines& lines) const {
     QStringList head;
     qsizetype from = 0;
-    for (; first < end && stands_at(from, lines_[first], lines); first++) {
+    for (; first < end && stands_at(from, lines_[first], lines.texts); first++) {
         head.append(strings_[first]);
         from += lines_[first].size();
     }
     QStringList tail;
-    qsizetype to = lines.size();
+    qsizetype to = lines.texts.size();
     for (; first < end; end--) {
         const qsizetype place = to - lines_[end - 1].size();
-        if (place < from || !stands_at(place, lines_[end - 1], lines))
+        if (place < from || !stands_at(place, lines_[end - 1], lines.texts))
             break;
         tail.prepend(strings_[end - 1]);
         to = place;
     }
-    return head + strings_among(first, end, lines.mid(from, to - from)) + tail;
+    const Lines between = {lines.texts.mid(from, to - from), lines.shown_for.mid(from, to - from)};
+    return head + strings_among(first, end, between) + tail;
 }
 
-// A string for each line, but for lines that stand together as one of the strings from first up to end was shown.
-QStringList StringLines::strings_among(qsizetype first, qsizetype end, const QStringList& lines) const {
+// A string for each line, but for lines that stand together as one of the strings from first up to end was shown, at
+// least one of them being what was shown for it: the same lines typed anew are lines.
+QStringList StringLines::strings_among(qsizetype first, qsizetype end, const Lines& lines) const {
     QHash<QString, QList<qsizetype>> by_first_line;  // those of more than one line: any other is its line
     for (qsizetype i = first; i < end; i++) {
         if (lines_[i].size() > 1)
             by_first_line[lines_[i].first()].append(i);
     }
     QStringList strings;
-    for (qsizetype place = 0; place < lines.size();) {
-        const QList<qsizetype> alike = by_first_line.value(lines[place]);
+    for (qsizetype place = 0; place < lines.texts.size();) {
+        const QList<qsizetype> alike = by_first_line.value(lines.texts[place]);
         const auto found = std::find_if(alike.cbegin(), alike.cend(), [&](qsizetype string) {
-            return string >= first && stands_at(place, lines_[string], lines);
+            return string >= first && stands_at(place, lines_[string], lines.texts) &&
+                   lines.shown_for.mid(place, lines_[string].size()).contains(static_cast<int>(string));
         });
         if (found == alike.cend()) {
-            strings.append(lines[place++]);
+            strings.append(lines.texts[place++]);
             continue;
         }
         strings.append(strings_[*found]);

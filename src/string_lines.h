@@ -26,8 +26,14 @@ public:
     QStringList strings_in(const QTextDocument& document) const;
 
 private:
-    QStringList strings_between(qsizetype first, qsizetype end, const QStringList& lines) const;
-    QStringList strings_among(qsizetype first, qsizetype end, const QStringList& lines) const;
+    // Lines of the text, and for each the string that it was shown for, -1 where the user has made it.
+    struct Lines {
+        QStringList texts;
+        QList<int> shown_for;
+    };
+
+    QStringList strings_between(qsizetype first, qsizetype end, const Lines& lines) const;
+    QStringList strings_among(qsizetype first, qsizetype end, const Lines& lines) const;
     QStringList all_lines() const;
 
     QStringList strings_;

@@ -212,11 +212,6 @@ QItemSelectionModel::SelectionFlags ValuesView::selectionCommand(const QModelInd
     return keeping_highlight(QTableView::selectionCommand(index, event), index, event);
 }
 
-void ValuesView::selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) {
-    QTableView::selectionChanged(selected, deselected);
-    follow_highlight(*this);
-}
-
 void ValuesView::show_values_context_menu(QPoint point) {
     // A refused name is told before the menu is in the way of the box.
     if (!end_editing_before_change(*this))

@@ -553,6 +553,16 @@ void EditorsTest::what_stands_beside_an_edited_line_stays_data() {
                type_at(4, "z")(edit);
            })
         << QStringList{QStringLiteral("yx"), QStringLiteral("new"), middle[1], QStringLiteral("zc")};
+    QTest::newRow("all typed anew") << middle << middle_shown << Edit([](QTextEdit& edit) {
+        edit.selectAll();
+        for (const int key :
+             {Qt::Key_A, Qt::Key_Return, Qt::Key_P, Qt::Key_Return, Qt::Key_Q, Qt::Key_Return, Qt::Key_B}) {
+            if (key == Qt::Key_Return)
+                QTest::keyClick(&edit, Qt::Key_Return);
+            else
+                QTest::keyClick(&edit, static_cast<char>(key + 'a' - 'A'));
+        }
+    }) << lines({"a", "p", "q", "b"});
     QTest::newRow("the lines of a string ahead taken out")
         << QStringList{QStringLiteral("a\rb"), QStringLiteral("a"), QStringLiteral("b")} << "a\nb\na\nb"
         << delete_lines(0, 2) << lines({"a", "b"});

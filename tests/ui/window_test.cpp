@@ -62,6 +62,7 @@ private slots:
     void the_splitter_fills_the_window();
     void a_long_path_does_not_widen_the_window();
     void both_ends_of_a_long_path_are_seen();
+    void a_path_that_fits_is_painted_as_it_is();
     void neither_view_can_be_dragged_shut();
     void columns_start_wide_enough();
     void a_damaged_key_is_told_once_and_its_siblings_stay();
@@ -383,6 +384,23 @@ void WindowTest::both_ends_of_a_long_path_are_seen() {
     QCOMPARE(painted("A", "A"), path);
     QVERIFY(painted("A", "M") != path);
     QVERIFY(painted("M", "A") != path);
+}
+
+// A tab is wider than a blank, and no reason to cut a path that fits.
+void WindowTest::a_path_that_fits_is_painted_as_it_is() {
+    const Scene scene;
+    Stage stage(scene);
+    auto* label = stage.window.statusBar()->findChild<QLabel*>();
+    for (const QString& path : {QStringLiteral("a\tb"), QStringLiteral("a&b "), QStringLiteral("MACHINE\\SYSTEM")}) {
+        label->setText(path);
+        QCoreApplication::sendPostedEvents();
+        QCoreApplication::processEvents();
+        QLabel plain(path, label->parentWidget());
+        plain.setTextFormat(Qt::PlainText);
+        plain.setAlignment(label->alignment());
+        plain.resize(label->size());
+        QCOMPARE(label->grab().toImage(), plain.grab().toImage());
+    }
 }
 
 void WindowTest::neither_view_can_be_dragged_shut() {
