@@ -48,8 +48,8 @@ struct RegValue {
     RegValue(const QString& name, const QString& text, quint32 type);
     // Bytes of any other type.
     RegValue(const QString& name, const QByteArray& bytes, quint32 type);
-    // A number of 32 bits, as the user sees it; little_endian_order makes it REG_DWORD, any
-    // other REG_DWORD_BIG_ENDIAN.
+    // A number of 32 bits, as the user sees it; little_endian_order makes it REG_DWORD, any other order
+    // REG_DWORD_BIG_ENDIAN.
     RegValue(const QString& name, uint number, int order);
     // A number of 64 bits: REG_QWORD.
     RegValue(const QString& name, qulonglong number);

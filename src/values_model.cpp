@@ -33,8 +33,8 @@ qsizetype memory_of(const QVariant& data) {
     return bytes;
 }
 
-// Whether an editor hands back what it was given. A list without strings comes back
-// as empty ones, which would be stored as none.
+// Whether an editor hands back what it was given. A list without strings comes back as empty ones, which would be
+// stored as none.
 bool is_same_data(const QVariant& old, const QVariant& given) {
     if (old.typeId() == QMetaType::QStringList && old.toStringList().isEmpty())
         return given.toStringList().join(QString()).isEmpty();

@@ -150,6 +150,7 @@ bool ValuesProxyModel::setData(const QModelIndex& index, const QVariant& value, 
     if (is_synthetic(index.row()))
         return make_default(index, value);
     const bool is_rename = index.column() == ValuesModel::NameColumn;
+    // As flags() says of it.
     if (is_rename && source_row(index.row()) == unnamed_)
         return false;
     const int rows = rowCount();

@@ -72,7 +72,7 @@ private:
     std::vector<int> mapping_;  // source row by position; empty until the first sort
     bool synthetic_default_ = false;
     int unnamed_ = -1;  // source row of the unnamed value
-    QString
-        default_name_;  // reads as ValuesModel::default_name() in every language; a test of the translations sees to it
+    // Reads as ValuesModel::default_name() in every language; a test of the translations sees to it.
+    QString default_name_;
     bool is_source_quiet_ = false;  // what the source says of its rows is not passed on
 };

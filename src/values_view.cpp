@@ -196,10 +196,12 @@ void ValuesView::show_current() {
 bool ValuesView::event(QEvent* event) {
     if (!is_menu_key(*event))
         return QTableView::event(event);
+    if (!end_editing_before_change(*this))
+        return true;
     if (!currentIndex().isValid()) {
         // The place that comes with it can be over a row, which nobody has pointed at.
         show_new_menu(viewport()->rect().center());
-    } else if (end_editing_before_change(*this)) {
+    } else {
         meet_failures(this, FailureReport::instance().shown_key(), [this] {
             show_current();
             ask_for_menu_over_current(*this);

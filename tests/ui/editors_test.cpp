@@ -486,15 +486,18 @@ void EditorsTest::what_stands_beside_an_edited_line_stays_data() {
     const auto go_to = [](QTextEdit& edit, int line) {
         edit.setTextCursor(QTextCursor(edit.document()->findBlockByNumber(line)));
     };
-    const auto type_at = [go_to](int line, const char* text) {
+    const auto type = [](QTextEdit& edit, const char* text) {
+        for (const char* c = text; *c != 0; c++) {
+            if (*c == '\n')
+                QTest::keyClick(&edit, Qt::Key_Return);
+            else
+                QTest::keyClick(&edit, *c);
+        }
+    };
+    const auto type_at = [=](int line, const char* text) {
         return Edit([=](QTextEdit& edit) {
             go_to(edit, line);
-            for (const char* c = text; *c != 0; c++) {
-                if (*c == '\n')
-                    QTest::keyClick(&edit, Qt::Key_Return);
-                else
-                    QTest::keyClick(&edit, *c);
-            }
+            type(edit, text);
         });
     };
     const auto delete_lines = [go_to](int first, int count) {
@@ -553,15 +556,9 @@ void EditorsTest::what_stands_beside_an_edited_line_stays_data() {
                type_at(4, "z")(edit);
            })
         << QStringList{QStringLiteral("yx"), QStringLiteral("new"), middle[1], QStringLiteral("zc")};
-    QTest::newRow("all typed anew") << middle << middle_shown << Edit([](QTextEdit& edit) {
+    QTest::newRow("all typed anew") << middle << middle_shown << Edit([=](QTextEdit& edit) {
         edit.selectAll();
-        for (const int key :
-             {Qt::Key_A, Qt::Key_Return, Qt::Key_P, Qt::Key_Return, Qt::Key_Q, Qt::Key_Return, Qt::Key_B}) {
-            if (key == Qt::Key_Return)
-                QTest::keyClick(&edit, Qt::Key_Return);
-            else
-                QTest::keyClick(&edit, static_cast<char>(key + 'a' - 'A'));
-        }
+        type(edit, "a\np\nq\nb");
     }) << lines({"a", "p", "q", "b"});
     QTest::newRow("the lines of a string ahead taken out")
         << QStringList{QStringLiteral("a\rb"), QStringLiteral("a"), QStringLiteral("b")} << "a\nb\na\nb"

@@ -40,8 +40,8 @@ private slots:
     void a_new_key_needs_no_focus();
     void deletion_asks_data();
     void deletion_asks();
+    void what_is_deleted_was_asked_about_data();
     void what_is_deleted_was_asked_about();
-    void a_key_below_that_became_current_goes_with_its_branch();
     void closing_the_question_deletes_nothing();
     void a_branch_is_deleted_with_all_below();
     void a_refused_deletion_is_told_and_changes_nothing();
@@ -192,38 +192,42 @@ void KeysViewTest::deletion_asks() {
              answer == QMessageBox::Yes ? alpha + QStringLiteral("\\Zeta") : alpha + QStringLiteral("\\Leaf"));
 }
 
-void KeysViewTest::what_is_deleted_was_asked_about() {
-    const Scene scene;
-    Stage stage(scene);
-    stage.select_key(alpha + QStringLiteral("\\Leaf"));
-    stage.keys->setFocus();
-    DialogHand hand;
-    hand.then([&](QWidget* question) {
-        stage.select_key(alpha + QStringLiteral("\\Deep"));
-        QTest::mouseClick(qobject_cast<QMessageBox*>(question)->button(QMessageBox::Yes), Qt::LeftButton);
-    });
-    shared_actions().delete_action->trigger();
-    QVERIFY(hand.is_done());
-    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Deep Zeta"));
-    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Deep"));
+void KeysViewTest::what_is_deleted_was_asked_about_data() {
+    QTest::addColumn<QString>("asked");
+    QTest::addColumn<QString>("meanwhile");
+    QTest::addColumn<QString>("left");
+    QTest::addColumn<QString>("current");
+    QTest::addColumn<QStringList>("values");  // of the key that is current then, and not of one that has gone
+    QTest::newRow("a sibling became current")
+        << "Leaf"
+        << "Deep"
+        << "Deep Zeta"
+        << "Deep" << QStringList{QStringLiteral("(Default)"), QStringLiteral("A"), QStringLiteral("b")};
+    QTest::newRow("a key below became current") << "Deep"
+                                                << "Deep\\Deeper"
+                                                << "Leaf Zeta"
+                                                << "Leaf" << QStringList{QStringLiteral("(Default)")};
 }
 
-void KeysViewTest::a_key_below_that_became_current_goes_with_its_branch() {
+void KeysViewTest::what_is_deleted_was_asked_about() {
+    QFETCH(const QString, asked);
+    QFETCH(const QString, meanwhile);
+    const auto in_alpha = [](const QString& name) { return alpha + QLatin1Char('\\') + name; };
     const Scene scene;
     Stage stage(scene);
-    stage.select_key(alpha + QStringLiteral("\\Deep"));
+    stage.select_key(in_alpha(asked));
     stage.keys->setFocus();
     DialogHand hand;
     hand.then([&](QWidget* question) {
-        stage.select_key(alpha + QStringLiteral("\\Deep\\Deeper"));
+        stage.select_key(in_alpha(meanwhile));
         QTest::mouseClick(qobject_cast<QMessageBox*>(question)->button(QMessageBox::Yes), Qt::LeftButton);
     });
     shared_actions().delete_action->trigger();
     QVERIFY(hand.is_done());
-    QCOMPARE(subkeys_in_file(scene, "Alpha"), QStringLiteral("Leaf Zeta"));
-    QCOMPARE(stage.status(), alpha + QStringLiteral("\\Leaf"));
-    // The values are those of the key that is current now, and not of one that has gone.
-    QCOMPARE(stage.value_names(), QStringList{QStringLiteral("(Default)")});
+    QTEST(subkeys_in_file(scene, "Alpha"), "left");
+    QFETCH(const QString, current);
+    QCOMPARE(stage.status(), in_alpha(current));
+    QTEST(stage.value_names(), "values");
 }
 
 void KeysViewTest::closing_the_question_deletes_nothing() {
